@@ -1,0 +1,33 @@
+# What every target of ours is built with, on one interface target.
+
+option(OVPHOTO_TESTS "Build the tests" ON)
+option(OVPHOTO_BENCH "Build the benchmarks" OFF)
+set(OVPHOTO_SANITIZE "" CACHE STRING "Sanitizers, such as address,undefined")
+
+if(NOT CMAKE_BUILD_TYPE)
+  set(CMAKE_BUILD_TYPE Release CACHE STRING "" FORCE)
+endif()
+
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
+set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
+set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_CXX_VISIBILITY_PRESET hidden)
+set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
+
+find_program(CCACHE_PROGRAM ccache)
+if(CCACHE_PROGRAM)
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE_PROGRAM})
+endif()
+
+add_library(ovphoto_flags INTERFACE)
+target_compile_features(ovphoto_flags INTERFACE cxx_std_20)
+target_include_directories(ovphoto_flags INTERFACE ${PROJECT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/include)
+# Results must not depend on the compiler: no contraction of products and sums, and never fast-math.
+target_compile_options(ovphoto_flags INTERFACE -ffp-contract=off -Wall -Wextra -Wshadow -Wconversion -Werror)
+if(OVPHOTO_SANITIZE)
+  target_compile_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE} -fno-sanitize-recover=all
+                                                 -fno-omit-frame-pointer)
+  target_link_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE})
+endif()

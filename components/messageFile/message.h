@@ -1,0 +1,82 @@
+#pragma once
+
+#include <cstdarg>
+#include <memory>
+#include <string>
+
+#include "host/base/exBase.h"
+
+namespace Ov {
+
+/// The catalogue of numbered message texts. Texts live in a companion file beside the module, so that a language
+/// pack replaces them without touching the module.
+///
+/// Formatting language of the texts:
+///   "%%", "%!", "%.", "% "   the second character alone
+///   "%1" to "%99"            the argument of that number, a wide string
+///   "%1!5.2f!"               the same, printed with flags, width, precision and letter of printf; letters
+///                            d i u o x c C X (32 bits; with h, 16 bits), e f g E G (double), s (flags unused)
+///   A text without markers stands as it is, escapes included. Numbers run from 1 to the highest without gaps or
+///   repeats; anything else gives "MALFORMED FORMATTING STRING: " and the text.
+///
+/// Errors:   RnMessageFileEx before a file name is set or when the file cannot be opened; a number without a text
+///           gives the empty text.
+/// Threads:  one at a time until the first lookup has opened the file.
+class RnMessageFile {
+public:
+    RnMessageFile();
+    RnMessageFile(const RnMessageFile&) = delete;
+    RnMessageFile& operator=(const RnMessageFile&) = delete;
+    ~RnMessageFile();
+
+    /// Sets the companion file; the next lookup opens it, or the one of the language set in the host
+    /// (<folder>/<language>/<file>) where that exists. A file opened before is closed.
+    void setFileName(const wchar_t* path);
+    const std::wstring& fileName() const { return _fileName; }
+
+    /// The raw text of a message.
+    std::wstring getText(unsigned id);
+    /// The text with its arguments put in. They must be what the text's markers say.
+    std::wstring format(unsigned id, ...);
+    std::wstring formatV(unsigned id, std::va_list args);
+
+private:
+    class Store;  // the open companion; one implementation a platform
+
+    Store& store();
+
+    std::wstring _fileName;
+    std::unique_ptr<Store> _store;
+};
+
+/// The formatting language on its own.
+std::wstring formatMessage(const wchar_t* text, ...);
+std::wstring formatMessageV(const wchar_t* text, std::va_list args);
+
+/// A message cannot be looked up. Also caught as std::runtime_error.
+class RnMessageFileEx : public ExBase, public std::runtime_error {
+public:
+    RnMessageFileEx(const std::string& reason, int line);
+    ~RnMessageFileEx() override;
+    std::string getDetailedReason() const override;
+
+    class ExNoFilename;
+    class ExNoCatalogue;
+};
+
+class RnMessageFileEx::ExNoFilename : public RnMessageFileEx {
+public:
+    ExNoFilename();
+    ~ExNoFilename() override;
+};
+
+class RnMessageFileEx::ExNoCatalogue : public RnMessageFileEx {
+public:
+    explicit ExNoCatalogue(const std::wstring& fileName);
+    ~ExNoCatalogue() override;
+};
+
+/// The library's one catalogue.
+RnMessageFile& messageFile();
+
+}  // namespace Ov

@@ -1,0 +1,78 @@
+#pragma once
+
+#include <iosfwd>
+#include <string>
+#include <string_view>
+
+#include "host/componentManager/bufferedIO.h"
+#include "host/componentManager/castImpl.h"
+
+namespace Ov {
+
+/// Device over bytes in memory: reads and writes at one position, and grows as it is written.
+class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
+public:
+    RnMemoryBuffer() = default;
+    explicit RnMemoryBuffer(std::string_view bytes);
+
+    int readBytes(void* buffer, int count) override;
+    void endLine() override;
+    void writeSeparator() override;
+    int writeChars(const wchar_t* text, int count) override;
+    void skipSeparator(int count) override;
+    int get(wchar_t& c) override;
+    void unget(wchar_t c) override;
+    long seek(long offset, int whence) override;
+    int writeBytes(const void* data, int count) override;
+    int lineFeeds() override;
+
+    const std::string& bytes() const { return _bytes; }
+
+protected:
+    /// Appends more input to what is held; false at the end of it. Memory has no more than it holds.
+    virtual bool readMore() { return false; }
+    void append(const char* data, std::size_t count);
+
+private:
+    std::size_t position() const { return static_cast<std::size_t>(_next - _bytes.data()); }
+    void setPosition(std::size_t position);
+
+    std::string _bytes;
+};
+
+/// Input device over a standard stream, which must outlive it. It reads ahead in blocks, and keeps what it has
+/// read so that `seek` works on any stream.
+class OVHOST_API RnInBuffer : public RnMemoryBuffer {
+public:
+    explicit RnInBuffer(std::istream* source);
+
+protected:
+    bool readMore() override;
+
+private:
+    std::istream* _source;
+};
+
+/// Output device over a standard stream, which must outlive it. Writes at once; reads nothing.
+class OVHOST_API RnOutBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
+public:
+    explicit RnOutBuffer(std::ostream* sink) : _sink(sink) {}
+
+    int readBytes(void* buffer, int count) override;
+    void endLine() override;
+    void writeSeparator() override;
+    int writeChars(const wchar_t* text, int count) override;
+    void skipSeparator(int count) override;
+    int get(wchar_t& c) override;
+    void unget(wchar_t c) override;
+    long seek(long offset, int whence) override;
+    int writeBytes(const void* data, int count) override;
+    int lineFeeds() override;
+
+private:
+    std::ostream* _sink;
+    long _written = 0;
+    int _lineFeeds = 0;
+};
+
+}  // namespace Ov

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "host/componentManager/castable.h"
+
+namespace Ov {
+
+/// The host's services to whoever runs in it: a place to report messages, and a finder of files.
+class OVHOST_API RnProcessController : public RnCastable {
+public:
+    static constexpr RnUid iid{0xeb719621, 0xc02011d1, 0xaa7a00c0, 0x4fb1532a};
+
+    /// Shows a message to the user. Level 0 is an ordinary message.
+    virtual void report(int level, const wchar_t* text) = 0;
+    /// Finds a file by name, blanks around the name ignored: as an absolute path, in the folder `basePath` (null:
+    /// none), then in the folders of the path list `listName`. `result` is its path, or empty.
+    virtual void findFile(std::wstring& result, const wchar_t* name, const wchar_t* basePath,
+                          const wchar_t* listName) = 0;
+};
+
+/// The controllers of the process and of the calling thread, here one object, to be cast to RnProcessController.
+OVHOST_API RnCastable* RnGetProcessController();
+OVHOST_API RnCastable* RnGetThreadProcessController();
+
+/// Host side: who receives the messages (null: standard error), the folders of a path list, and an object that
+/// stands in for the controller (null is passed on as null; `resetProcessController` brings the host's own back).
+/// The reporter and the lists belong to the process; set them while nothing is being imported.
+using MessageReporter = std::function<void(int level, const wchar_t* text)>;
+OVHOST_API MessageReporter setMessageReporter(MessageReporter reporter);  // returns the previous one
+OVHOST_API void setPathList(const std::wstring& listName, std::vector<std::wstring> folders);
+OVHOST_API void setProcessController(RnCastable* controller);
+OVHOST_API void resetProcessController();
+
+}  // namespace Ov

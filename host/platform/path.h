@@ -1,0 +1,23 @@
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <string_view>
+
+#include "host/base/hostApi.h"
+
+namespace Ov {
+
+// Paths and texts are UTF-8 outside and wide inside. Both directions are total and undo each other: a byte that
+// is no UTF-8 stands as 0xDC00 plus its value.
+OVHOST_API std::string toUtf8(std::wstring_view text);
+OVHOST_API std::wstring fromUtf8(std::string_view text);
+
+OVHOST_API std::filesystem::path nativePath(std::wstring_view path);
+OVHOST_API std::wstring widePath(const std::filesystem::path& path);
+
+/// The name of a file without folder and extension, and its folder ("." when the path has none).
+OVHOST_API std::wstring pathStem(std::wstring_view path);
+OVHOST_API std::wstring pathFolder(std::wstring_view path);
+
+}  // namespace Ov
