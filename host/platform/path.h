@@ -8,8 +8,9 @@
 
 namespace Ov {
 
-// Paths and texts are UTF-8 outside and wide inside. Both directions are total and undo each other: a byte that
-// is no UTF-8 stands as 0xDC00 plus its value.
+// Paths and texts are UTF-8 outside and wide inside, whatever the locale. Any bytes survive the way in and out: a
+// byte that is no UTF-8 stands as 0xDC00 plus its value. So does any Unicode text the way out and in; a wide
+// character that is neither Unicode nor such a byte goes out as U+FFFD.
 OVHOST_API std::string toUtf8(std::wstring_view text);
 OVHOST_API std::wstring fromUtf8(std::string_view text);
 
