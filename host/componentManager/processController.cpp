@@ -1,0 +1,147 @@
+#include "host/componentManager/processController.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <map>
+
+#include "host/componentManager/castImpl.h"
+#include "host/platform/path.h"
+
+namespace Ov {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+std::wstring withoutBlanks(const std::wstring& text) {
+    const std::size_t first = text.find_first_not_of(L" \t");
+    if (first == std::wstring::npos) return {};
+    return text.substr(first, text.find_last_not_of(L" \t") + 1 - first);
+}
+
+void addUnlessEqual(std::vector<fs::path>& names, const std::wstring& name) {
+    const fs::path native = nativePath(name);
+    if (std::find(names.begin(), names.end(), native) == names.end()) names.push_back(native);
+}
+
+/// The characters of `name` as the bytes of a UTF-8 text; the name itself where they are no bytes.
+std::wstring fromBytes(const std::wstring& name) {
+    std::string bytes;
+    for (const wchar_t c : name) {
+        if (static_cast<char32_t>(c) > 0xFF) return name;
+        bytes += static_cast<char>(c);
+    }
+    return fromUtf8(bytes);
+}
+
+/// The names that `name` may stand for: files come from systems with the other slash, and a reader that takes a
+/// byte for a character leaves UTF-8 undone.
+std::vector<fs::path> spellings(const std::wstring& name) {
+    std::vector<fs::path> names;
+    for (std::wstring spelling : {name, fromBytes(name)}) {
+        addUnlessEqual(names, spelling);
+        std::replace(spelling.begin(), spelling.end(), L'\\', L'/');
+        addUnlessEqual(names, spelling);
+    }
+    return names;
+}
+
+bool isThere(const fs::path& path) {
+    std::error_code ignored;
+    return fs::exists(path, ignored);
+}
+
+/// The first of `names` that is there, in `folder` or, without one, by itself as an absolute path; else empty.
+fs::path findIn(const fs::path& folder, const std::vector<fs::path>& names) {
+    for (const fs::path& name : names) {
+        if (name.is_absolute() == folder.empty() && isThere(folder / name)) return folder / name;
+    }
+    return {};
+}
+
+void reportToStandardError(const wchar_t* text) {
+    const std::string line = toUtf8(text) + '\n';
+    std::fwrite(line.data(), 1, line.size(), stderr);
+}
+
+class HostController final : public RnCastImpl<RnProcessController, RnProcessController> {
+public:
+    void report(int level, const wchar_t* text) override;
+    void findFile(std::wstring& result, const wchar_t* name, const wchar_t* basePath,
+                  const wchar_t* listName) override;
+
+    MessageReporter reporter;
+    std::map<std::wstring, std::vector<std::wstring>> pathLists;
+
+private:
+    std::vector<fs::path> searchFolders(const wchar_t* basePath, const wchar_t* listName) const;
+};
+
+void HostController::report(int level, const wchar_t* text) {
+    if (!text) text = L"";
+    if (reporter) {
+        reporter(level, text);
+    } else {
+        reportToStandardError(text);
+    }
+}
+
+void HostController::findFile(std::wstring& result, const wchar_t* name, const wchar_t* basePath,
+                              const wchar_t* listName) {
+    const std::wstring wanted = withoutBlanks(name ? name : L"");
+    const std::vector<fs::path> folders = searchFolders(basePath, listName);
+    result.clear();
+    if (wanted.empty()) return;
+
+    const std::vector<fs::path> names = spellings(wanted);
+    for (const fs::path& folder : folders) {
+        const fs::path found = findIn(folder, names);
+        if (!found.empty()) {
+            result = widePath(found);
+            return;
+        }
+    }
+}
+
+/// The first, empty, stands for absolute names.
+std::vector<fs::path> HostController::searchFolders(const wchar_t* basePath, const wchar_t* listName) const {
+    std::vector<fs::path> folders(1);
+    const auto add = [&](const std::wstring& folder) {
+        if (!folder.empty()) folders.push_back(nativePath(folder));
+    };
+    add(basePath ? basePath : L"");
+    const auto list = pathLists.find(listName ? listName : L"");
+    if (list != pathLists.end()) std::for_each(list->second.begin(), list->second.end(), add);
+    return folders;
+}
+
+/// Never destroyed: a module may report until the process ends.
+HostController& hostController() {
+    static auto* const controller = new HostController;
+    return *controller;
+}
+
+RnRef<RnCastable>& currentController() {
+    static auto* const current = new RnRef<RnCastable>(RnRef<RnCastable>::share(&hostController()));
+    return *current;
+}
+
+}  // namespace
+
+RnCastable* RnGetProcessController() { return currentController().get(); }
+
+RnCastable* RnGetThreadProcessController() { return currentController().get(); }
+
+MessageReporter setMessageReporter(MessageReporter reporter) {
+    return std::exchange(hostController().reporter, std::move(reporter));
+}
+
+void setPathList(const std::wstring& listName, std::vector<std::wstring> folders) {
+    hostController().pathLists[listName] = std::move(folders);
+}
+
+void setProcessController(RnCastable* controller) { currentController() = RnRef<RnCastable>::share(controller); }
+
+void resetProcessController() { setProcessController(&hostController()); }
+
+}  // namespace Ov

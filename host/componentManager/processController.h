@@ -16,7 +16,8 @@ public:
     /// Shows a message to the user. Level 0 is an ordinary message.
     virtual void report(int level, const wchar_t* text) = 0;
     /// Finds a file by name, blanks around the name ignored: as an absolute path, in the folder `basePath` (null:
-    /// none), then in the folders of the path list `listName`. `result` is its path, or empty.
+    /// none), then in the folders of the path list `listName`. `result` is its path, or empty. A folder counts as
+    /// found. In each place the name is tried as it stands, with "/" for "\", and, when it is all bytes, as UTF-8.
     virtual void findFile(std::wstring& result, const wchar_t* name, const wchar_t* basePath,
                           const wchar_t* listName) = 0;
 };
@@ -25,9 +26,9 @@ public:
 OVHOST_API RnCastable* RnGetProcessController();
 OVHOST_API RnCastable* RnGetThreadProcessController();
 
-/// Host side: who receives the messages (null: standard error), the folders of a path list, and an object that
-/// stands in for the controller (null is passed on as null; `resetProcessController` brings the host's own back).
-/// The reporter and the lists belong to the process; set them while nothing is being imported.
+/// Host side: who receives the messages (null: standard error, a line each), the folders of a path list, and an
+/// object that stands in for the controller, which is kept (null is passed on as null; `resetProcessController`
+/// brings the host's own back). All belong to the process; set them while nothing is being imported.
 using MessageReporter = std::function<void(int level, const wchar_t* text)>;
 OVHOST_API MessageReporter setMessageReporter(MessageReporter reporter);  // returns the previous one
 OVHOST_API void setPathList(const std::wstring& listName, std::vector<std::wstring> folders);
