@@ -18,7 +18,10 @@ public:
     ~ExModule() override;
 };
 
-/// The host's register of modules and of the classes that they build.
+/// The host's register of modules and of the classes that they build. Of builders with the same class id the one
+/// that was registered first counts.
+///
+/// Threads:  any number may create and find at once, while nobody registers, loads or unloads.
 class OVHOST_API RnComponentManager : public RnCastable {
 public:
     static constexpr RnUid iid{0xad148684, 0x719a11d1, 0xa3bb0060, 0x9707609d};
@@ -26,12 +29,14 @@ public:
     /// A new object of a registered class; null when no builder has the class id or there is no memory.
     virtual RnRef<RnCastable> createObject(const RnUid& classId) = 0;
 
-    /// Loads the module at `path`, calls its entry point and registers what it answers. Raises ExModule. The
-    /// module stays loaded until it is unloaded or the process ends; loading it again gives the same module.
+    /// Loads the module at `path`, calls its entry point and registers what it answers. Raises ExModule, and then
+    /// nothing is loaded. The module stays loaded until it is unloaded or the process ends; loading the same file
+    /// again, by whatever path, gives the same module.
     virtual const Module& loadModule(const wchar_t* path) = 0;
-    /// Takes the module's builders out of the register and unloads it. No object of it may be left.
+    /// Takes the module's builders out of the register and unloads it; a module that is not loaded is ignored. No
+    /// object of it may be left.
     virtual void unloadModule(const wchar_t* path) = 0;
-    /// Registers and unregisters the builders of a registry that lives in this process.
+    /// Registers and unregisters the builders of a registry that lives in this process; a registry counts once.
     virtual void addRegistry(RnComponentRegistry& registry) = 0;
     virtual void removeRegistry(RnComponentRegistry& registry) = 0;
 

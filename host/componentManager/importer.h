@@ -15,7 +15,8 @@ public:
     virtual const wchar_t* getImportCategory() const = 0;
     /// Visits those builders in order of their names.
     virtual RnEnum::Action enumerateObjects(RnEnumerator<RnCPtr<RnImportBuilder>>& visitor) = 0;
-    /// The file types offered to the user: "Name (*.ext)|*.ext" entries, separated by "|".
+    /// The file types offered to the user: "Name (*.ext)|*.ext" entries, separated by "|"; the first, "All (...)",
+    /// has every extension of the family. Empty when no builder is there.
     virtual const wchar_t* getFileTypes() = 0;
     /// Import a file. The builder is the first whose content test accepts it; null when none does, and then
     /// `recognised` is false. A file that cannot be read or is refused raises RnStreamEx::ExReadError.
