@@ -1,0 +1,136 @@
+#include <algorithm>
+#include <cwchar>
+#include <optional>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+#include "components/messageFile/message.h"
+#include "host/base/textFormat.h"
+
+namespace Ov {
+
+namespace {
+
+/// Literal text and the marker behind it. In the last piece, and behind the character of an escape, there is none.
+struct Piece {
+    std::wstring_view text;
+    std::size_t number = 0;  // the marker's, from 1; 0: no marker
+    FormatSpec spec;
+};
+
+using Argument = std::variant<std::int32_t, double, const wchar_t*>;
+
+bool isOneOf(wchar_t c, std::wstring_view set) { return set.find(c) != set.npos; }
+bool isDigit(wchar_t c) { return c >= L'0' && c <= L'9'; }
+bool isInteger(const FormatSpec& spec) { return isOneOf(spec.letter, L"CXcdioux"); }
+bool isDouble(const FormatSpec& spec) { return isOneOf(spec.letter, L"EGefg"); }
+
+/// Reads the conversion between two exclamation marks.
+bool readConversion(std::wstring_view text, FormatSpec& spec) {
+    const wchar_t* const end = text.data() + text.size();
+    if (parseFormatSpec(text.data(), end, spec) != end) return false;
+    if (spec.widthIsArgument || spec.precisionIsArgument) return false;
+    if (isInteger(spec)) return isOneOf(spec.modifier, std::wstring_view(L"\0hl", 3));
+    return spec.modifier == 0 && (isDouble(spec) || spec.letter == L's');
+}
+
+/// Reads the marker whose number starts at the front of `text` and removes it there.
+bool readMarker(std::wstring_view& text, Piece& piece) {
+    const std::size_t digits = text.size() > 1 && isDigit(text[1]) ? 2 : 1;
+    for (std::size_t i = 0; i < digits; ++i)
+        piece.number = piece.number * 10 + static_cast<std::size_t>(text[i] - L'0');
+    text.remove_prefix(digits);
+    piece.spec.letter = L's';
+    if (!text.starts_with(L'!')) return true;
+    const std::size_t closing = text.find(L'!', 1);
+    if (closing == text.npos) return true;  // the mark is text
+    const std::wstring_view conversion = text.substr(1, closing - 1);
+    text.remove_prefix(closing + 1);
+    return readConversion(conversion, piece.spec);
+}
+
+/// Cuts a message at its markers and escapes; nothing when it is malformed.
+std::optional<std::vector<Piece>> cutText(std::wstring_view text) {
+    std::vector<Piece> pieces;
+    while (!text.empty()) {
+        Piece& piece = pieces.emplace_back();
+        const std::size_t percent = text.find(L'%');
+        piece.text = text.substr(0, percent);
+        text.remove_prefix(piece.text.size());
+        if (text.empty()) break;
+        text.remove_prefix(1);
+        if (text.empty()) return std::nullopt;
+        if (isOneOf(text.front(), L" !%.")) {
+            pieces.push_back({text.substr(0, 1), 0, {}});
+            text.remove_prefix(1);
+        } else if (!isDigit(text.front()) || text.front() == L'0' || !readMarker(text, piece)) {
+            return std::nullopt;
+        }
+    }
+    return pieces;
+}
+
+/// The markers in the order of their arguments; nothing unless each of 1 to the highest stands there once.
+std::optional<std::vector<const FormatSpec*>> orderMarkers(const std::vector<Piece>& pieces) {
+    std::vector<const FormatSpec*> order(pieces.size(), nullptr);
+    std::size_t count = 0;
+    for (const Piece& piece : pieces) {
+        if (piece.number == 0) continue;
+        if (piece.number > order.size() || order[piece.number - 1]) return std::nullopt;
+        order[piece.number - 1] = &piece.spec;
+        ++count;
+    }
+    order.resize(count);
+    if (std::find(order.begin(), order.end(), nullptr) != order.end()) return std::nullopt;
+    return order;
+}
+
+std::vector<Argument> fetchArguments(const std::vector<const FormatSpec*>& markers, std::va_list args) {
+    std::vector<Argument> arguments;
+    for (const FormatSpec* spec : markers) {
+        if (isInteger(*spec))
+            arguments.emplace_back(std::int32_t{va_arg(args, int)});
+        else if (isDouble(*spec))
+            arguments.emplace_back(va_arg(args, double));
+        else
+            arguments.emplace_back(static_cast<const wchar_t*>(va_arg(args, const wchar_t*)));
+    }
+    return arguments;
+}
+
+void appendArgument(std::wstring& out, const FormatSpec& spec, const Argument& argument) {
+    if (const auto* integer = std::get_if<std::int32_t>(&argument))
+        appendInteger(out, spec, *integer);
+    else if (const auto* number = std::get_if<double>(&argument))
+        appendDouble(out, spec, *number);
+    else if (const wchar_t* text = std::get<const wchar_t*>(argument))
+        out += text;
+}
+
+}  // namespace
+
+std::wstring formatMessageV(const wchar_t* text, std::va_list args) {
+    const auto pieces = cutText(text);
+    const auto markers = pieces ? orderMarkers(*pieces) : std::nullopt;
+    if (!markers) return std::wstring(L"MALFORMED FORMATTING STRING: ") + text;
+    if (markers->empty()) return text;
+
+    const std::vector<Argument> arguments = fetchArguments(*markers, args);
+    std::wstring result;
+    for (const Piece& piece : *pieces) {
+        result += piece.text;
+        if (piece.number > 0) appendArgument(result, piece.spec, arguments[piece.number - 1]);
+    }
+    return result;
+}
+
+std::wstring formatMessage(const wchar_t* text, ...) {
+    std::va_list args;
+    va_start(args, text);
+    std::wstring result = formatMessageV(text, args);
+    va_end(args);
+    return result;
+}
+
+}  // namespace Ov

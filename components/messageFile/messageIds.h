@@ -130,10 +130,10 @@
     message(tbtTokenNumber,            12993, "s"  )  /* the token */ \
     message(tbtTokenZeroFill,          12994, "s"  )  /* the token */ \
     message(tbtTokenEnd,               12995, "s"  )  /* the token */ \
-    message(tbtTokenEndOfFile,         12996, "s"  )  /* the empty token */ \
+    message(tbtTokenEndOfFile,         12996, "") \
     message(tbtTokenOther,             12997, "s"  )  /* the token */ \
-    message(tbtSyntaxError,            12998, "dss")  /* line feeds before, detail, token's description or null */ \
-    message(tbtValueError,             12999, "ds" )  /* line feeds before, detail */ \
+    message(tbtSyntaxError,            12998, "dss")  /* line feeds, detail, token's description or null */ \
+    message(tbtValueError,             12999, "ds" )  /* line feeds, detail */ \
     message(tbtResourceError,          13000, "d"  )  /* number of the message */ \
     message(tbtKindCodeMissing,        13002, "") \
     message(tbtKind4Value,             13003, "") \
