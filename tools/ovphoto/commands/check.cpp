@@ -1,0 +1,127 @@
+#include <CLI/CLI.hpp>
+#include <iostream>
+#include <memory>
+
+#include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/expandPaths.h"
+#include "tools/ovphoto/json.h"
+#include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/webWarnings.h"
+
+namespace OvTool {
+
+namespace {
+
+struct CheckOptions {
+    std::vector<std::string> paths;
+    std::string as;
+    bool json = false;
+};
+
+struct Totals {
+    int well = 0;
+    int withWarnings = 0;  // of those that are well
+    int refused = 0;
+    int skipped = 0;  // in folders, of no known format
+};
+
+/// A line on the terminal that tells how far the work is; nothing when standard error is no terminal.
+class Progress {
+public:
+    explicit Progress(std::size_t total) : _total(total), _shown(standardErrorIsTerminal()) {}
+    ~Progress() { clear(); }
+    Progress(const Progress&) = delete;
+    Progress& operator=(const Progress&) = delete;
+
+    void next() {
+        ++_done;
+        if (_shown) std::cerr << "\r" << _done << " of " << _total << std::flush;
+    }
+    void clear() const {
+        if (_shown) std::cerr << "\r\x1b[K" << std::flush;
+    }
+
+private:
+    std::size_t _total;
+    std::size_t _done = 0;
+    bool _shown;
+};
+
+void printJson(const ReadResult& result, const std::vector<std::string>& warnings) {
+    printLine(Json{{"file", result.file},
+                   {"ok", static_cast<bool>(result.web)},
+                   {"format", result.format.empty() ? Json() : Json(result.format)},
+                   {"messages", result.reasons()},
+                   {"warnings", warnings}});
+}
+
+/// Prints the texts, equal ones in a row once with their count.
+void printTexts(const char* label, const std::vector<std::string>& texts) {
+    for (std::size_t i = 0; i < texts.size();) {
+        std::size_t end = i + 1;
+        while (end < texts.size() && texts[end] == texts[i]) ++end;
+        std::cout << "    " << label << texts[i];
+        if (end - i > 1) std::cout << " (" << end - i << " times)";
+        std::cout << '\n';
+        i = end;
+    }
+}
+
+void printText(const ReadResult& result, const std::vector<std::string>& warnings) {
+    std::string format = result.format.empty() ? "-" : result.format;
+    format.resize(5, ' ');
+    const char* verdict = !result.web ? "refused  " : warnings.empty() ? "ok       " : "warning  ";
+    std::cout << verdict << format << "  " << result.file << '\n';
+    printTexts("", result.reasons());
+    printTexts("warning: ", warnings);
+}
+
+void printSummary(const Totals& totals) {
+    const int files = totals.well + totals.refused;
+    std::cout << files << (files == 1 ? " file: " : " files: ") << totals.well << " ok";
+    if (totals.withWarnings > 0) std::cout << " (" << totals.withWarnings << " with warnings)";
+    std::cout << ", " << totals.refused << " refused";
+    if (totals.skipped > 0) std::cout << "; " << totals.skipped << " more of no known format";
+    std::cout << '\n';
+}
+
+void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, Totals& totals,
+               const Progress& progress) {
+    const ReadResult result = session.read(file.path, options.as);
+    const bool foreign = file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
+    if (foreign) {
+        ++totals.skipped;
+        return;
+    }
+    const std::vector<std::string> warnings = result.web ? webWarnings(result) : std::vector<std::string>();
+    ++(result.web ? totals.well : totals.refused);
+    if (!warnings.empty()) ++totals.withWarnings;
+    progress.clear();
+    options.json ? printJson(result, warnings) : printText(result, warnings);
+}
+
+int runCheck(const CheckOptions& options, const HostSession& session) {
+    const std::vector<FoundFile> files = expandPaths(options.paths);
+    Totals totals;
+    Progress progress(files.size());
+    for (const FoundFile& file : files) {
+        if (!std::cout) break;
+        progress.next();
+        checkFile(file, options, session, totals, progress);
+    }
+    progress.clear();
+    if (!options.json) printSummary(totals);
+    return totals.refused == 0 ? exitWell : exitFailed;
+}
+
+}  // namespace
+
+Action declareCheck(CLI::App& app) {
+    auto options = std::make_shared<CheckOptions>();
+    app.add_option("PATH", options->paths, "Photometric files, or folders to search for them")->required();
+    addAsOption(app, options->as);
+    addJsonFlag(app, options->json);
+    return [options](const HostSession& session) { return runCheck(*options, session); };
+}
+
+}  // namespace OvTool

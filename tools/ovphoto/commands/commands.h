@@ -1,0 +1,51 @@
+#pragma once
+
+#include <functional>
+#include <span>
+#include <string>
+
+#include "tools/ovphoto/hostSession.h"
+
+namespace CLI {
+class App;
+}
+
+// The tool's commands, one file each, and what they share.
+
+namespace OvTool {
+
+enum ExitStatus : int {
+    exitWell = 0,
+    exitFailed = 1,  // a file was refused or could not be read or written
+    exitUsage = 2,
+};
+
+/// Runs a command whose arguments have been parsed; the result is the exit status.
+using Action = std::function<int(HostSession&)>;
+
+struct Command {
+    const char* name;
+    const char* summary;
+    /// Declares the command's arguments on `app`.
+    Action (*declare)(CLI::App& app);
+};
+
+/// All commands, in the order in which the help shows them.
+std::span<const Command> commands();
+
+Action declareFormats(CLI::App& app);
+Action declareInfo(CLI::App& app);
+Action declareIntensity(CLI::App& app);
+Action declareConvert(CLI::App& app);
+Action declareCheck(CLI::App& app);
+
+/// Options that several commands have: --json, and --as FORMAT (kept in capitals: "IES").
+void addJsonFlag(CLI::App& app, bool& json);
+void addAsOption(CLI::App& app, std::string& as);
+
+/// Shows on standard error, as `FILE: text`, what was reported while the file was read and why it was refused.
+void showReasons(const ReadResult& result);
+/// Prints a refused file's line of JSON.
+void printRefusal(const ReadResult& result);
+
+}  // namespace OvTool

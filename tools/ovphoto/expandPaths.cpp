@@ -1,0 +1,59 @@
+#include "tools/ovphoto/expandPaths.h"
+
+#include <algorithm>
+#include <filesystem>
+
+#include "host/platform/path.h"
+
+namespace OvTool {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+std::string toText(const fs::path& path) { return Ov::toUtf8(Ov::widePath(path)); }
+
+void addFolder(const fs::path& folder, std::vector<FoundFile>& files) {
+    std::error_code error;
+    std::vector<fs::directory_entry> entries;
+    for (fs::directory_iterator entry(folder, error), end; !error && entry != end; entry.increment(error)) {
+        entries.push_back(*entry);
+    }
+    if (error) files.push_back({toText(folder), false});
+    std::sort(entries.begin(), entries.end());
+    for (const fs::directory_entry& entry : entries) {
+        std::error_code ignored;
+        // Links to folders are not followed: they may lead in circles.
+        if (entry.is_directory(ignored) && !entry.is_symlink(ignored)) {
+            addFolder(entry.path(), files);
+        } else if (!entry.is_directory(ignored)) {
+            files.push_back({toText(entry.path()), true});
+        }
+    }
+}
+
+}  // namespace
+
+std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths) {
+    std::vector<FoundFile> files;
+    for (const std::string& path : paths) {
+        std::error_code error;
+        const fs::path native = Ov::nativePath(Ov::fromUtf8(path));
+        if (fs::is_directory(native, error)) {
+            addFolder(native, files);
+        } else {
+            files.push_back({path, false});
+        }
+    }
+    return files;
+}
+
+bool hasPhotometricExtension(const std::string& path) {
+    std::string extension = fs::path(path).extension().string();
+    for (char& c : extension) {
+        if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+    }
+    return extension == ".ies" || extension == ".cib" || extension == ".nmb" || extension == ".tbt";
+}
+
+}  // namespace OvTool

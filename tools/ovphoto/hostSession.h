@@ -1,0 +1,63 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "host/componentManager/componentManager.h"
+#include "ovphoto/intensityDist.h"
+
+namespace OvTool {
+
+/// What became of a file that was read. Texts are UTF-8, but for file names, which may hold any bytes.
+struct ReadResult {
+    std::string file;                   // as the user gave it
+    std::string format;                 // name of the reader's format ("IES"); empty when none was found
+    Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
+    std::vector<std::string> messages;  // texts that the reader reported, in order
+    std::string error;                  // what the tool itself has to say; empty when there is a web
+
+    /// Why the file was refused, or what was reported though it was not: the reader's texts, then the tool's own.
+    std::vector<std::string> reasons() const;
+};
+
+/// The tool as a host: the module is loaded, and files are read through whatever builders it brings.
+class HostSession {
+public:
+    /// Loads the module at `modulePath`, or, when that is empty, the one beside the tool or in ../lib from there.
+    /// Raises ExModule.
+    explicit HostSession(const std::string& modulePath);
+
+    Ov::RnComponentManager& manager() const { return *_manager; }
+
+    /// The builders that import photometric webs, in order of their names.
+    std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImporters() const;
+    /// Those that accept the content of the input, the one to take first.
+    std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImportersFor(Ov::RnBufferedIO& io) const;
+
+    /// Reads a file, with the reader of the format `as` ("IES") or, when that is empty, of the one whose content
+    /// test accepts it. Never throws for what a file holds or because it cannot be read.
+    ReadResult read(const std::string& file, const std::string& as) const;
+
+    /// A web distribution of the web that gives off `lumens`.
+    Ov::RnRef<Ov::RnWebIntensityDist> distribute(Ov::RnPhotoWebData& web, float lumens) const;
+
+private:
+    void import(ReadResult& result, const std::string& as) const;
+
+    Ov::RnRef<Ov::RnComponentManager> _manager;
+};
+
+/// "IES" for the builder named "IES Web".
+std::string formatName(const Ov::RnBuilderDescription& builder);
+/// The first extension that the builder imports, or empty.
+std::string extensionOf(Ov::RnComponentBuilder& builder);
+
+/// Opens a file for reading. When that fails it gives null and says in `error` why.
+Ov::RnRef<Ov::RnBufferedIO> openFile(const std::string& file, std::string& error);
+
+/// What the exception in flight says; to be called in a handler.
+std::string currentExceptionText();
+
+inline constexpr const char* unknownFormat = "not a photometric file of a known format";
+
+}  // namespace OvTool

@@ -1,0 +1,61 @@
+#include <CLI/CLI.hpp>
+#include <iostream>
+#include <utility>
+#include <vector>
+
+#include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/platform.h"
+
+namespace {
+
+using namespace OvTool;
+
+/// Runs the command that was given; whatever it throws ends here as a message.
+int runCommand(const Action& action, const std::string& module) {
+    try {
+        HostSession session(module);
+        return action(session);
+    } catch (...) {
+        std::cerr << "ovphoto: " << currentExceptionText() << '\n';
+        return exitFailed;
+    }
+}
+
+int parseAndRun(CLI::App& app, int argc, char** argv) {
+    std::string module;
+    app.add_option("--module", module, "Load this module instead of the one beside the tool")->type_name("PATH");
+    app.set_version_flag("--version", "ovphoto " OVPHOTO_VERSION, "Print the version and exit");
+    app.require_subcommand(1);
+    app.fallthrough();
+    app.allow_windows_style_options(false);
+
+    std::vector<std::pair<const CLI::App*, Action>> actions;
+    for (const Command& command : commands()) {
+        CLI::App* sub = app.add_subcommand(command.name, command.summary);
+        actions.emplace_back(sub, command.declare(*sub));
+    }
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::ParseError& error) {
+        return app.exit(error) == 0 ? exitWell : exitUsage;
+    }
+    for (const auto& [sub, action] : actions) {
+        if (sub->parsed()) return runCommand(action, module);
+    }
+    return exitUsage;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    prepareStandardStreams();
+    std::ios::sync_with_stdio(false);
+    CLI::App app{"Reads, checks and converts photometric files of luminaires."};
+    app.footer(
+        "Exit status: 0 all well, 1 a file was refused or could not be read or written, 2 wrong usage.\n"
+        "Angles are in degrees: theta from the axis, psi around it.");
+    const int status = parseAndRun(app, argc, argv);
+    if (std::cout.flush()) return status;
+    std::cerr << "ovphoto: standard output cannot be written\n";
+    return status == exitWell ? exitFailed : status;
+}

@@ -1,0 +1,63 @@
+#include "tools/ovphoto/numbers.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <numbers>
+
+namespace OvTool {
+
+namespace {
+
+std::string formatDouble(double value, std::chars_format format, int precision) {
+    char text[64];
+    const auto result = std::to_chars(std::begin(text), std::end(text), value, format, precision);
+    return {text, result.ptr};
+}
+
+void dropTrailingZeros(std::string& text) {
+    if (text.find('.') == std::string::npos) return;
+    while (text.back() == '0') text.pop_back();
+    if (text.back() == '.') text.pop_back();
+}
+
+}  // namespace
+
+float toRadians(float degrees) { return static_cast<float>(degrees * std::numbers::pi / 180); }
+
+float toDegrees(float radians) {
+    const double degrees = radians * 180 / std::numbers::pi;
+    if (!std::isfinite(degrees)) return static_cast<float>(degrees);
+    for (int digits = 1; digits <= 9; ++digits) {
+        const auto candidate = parseFloat(formatDouble(degrees, std::chars_format::general, digits));
+        if (candidate && toRadians(*candidate) == radians) return *candidate;
+    }
+    return static_cast<float>(degrees);
+}
+
+std::optional<float> parseFloat(std::string_view text) {
+    float value;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);
+    if (error != std::errc() || end != text.data() + text.size() || !std::isfinite(value)) return {};
+    return value;
+}
+
+std::string shortNumber(double value) {
+    const double size = std::abs(value);
+    if (!(size < 1e9) || (size > 0 && size < 1e-4)) return formatDouble(value, std::chars_format::general, 5);
+    const int before = size >= 1 ? static_cast<int>(std::log10(size)) + 1 : 0;
+    std::string text = formatDouble(value, std::chars_format::fixed, std::clamp(5 - before, 0, 5));
+    dropTrailingZeros(text);
+    return text;
+}
+
+std::string exactNumber(float value) {
+    char text[64];
+    return {text, std::to_chars(std::begin(text), std::end(text), value).ptr};
+}
+
+std::string padLeft(const std::string& text, std::size_t width) {
+    return text.size() < width ? std::string(width - text.size(), ' ') + text : text;
+}
+
+}  // namespace OvTool

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+// Numbers between people and floats. None of this depends on the locale.
+
+namespace OvTool {
+
+/// The angle as files' readers convert it: float of degrees times pi / 180 in double.
+float toRadians(float degrees);
+/// The degrees with the fewest digits from which `toRadians` gives this angle back (30, not 30.000002); the
+/// nearest degrees when there are none.
+float toDegrees(float radians);
+
+/// A finite decimal number that fits a float and is the whole text.
+std::optional<float> parseFloat(std::string_view text);
+
+/// For people: about five significant digits, without trailing zeros.
+std::string shortNumber(double value);
+/// As many digits as the float needs to read back the same.
+std::string exactNumber(float value);
+
+/// The text right-aligned in a field of `width` characters.
+std::string padLeft(const std::string& text, std::size_t width);
+
+}  // namespace OvTool

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace OvTool {
+
+/// Writes a file whole or not at all: to a new file beside it, which is then renamed. A link is followed and the
+/// permissions of a file that exists are kept. Empty, or why it failed; then nothing has changed.
+std::string writeFile(const std::string& file, std::string_view bytes);
+
+}  // namespace OvTool
