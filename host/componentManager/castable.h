@@ -49,6 +49,12 @@ public:
 /// translators in turn (none are registered by default). Null, or an object with one reference.
 OVHOST_API RnCastable* RnTranslateInterface(RnCastable* object, const RnUid& iid);
 
+/// Host side: adds and removes a translator, which answers as RnTranslateInterface does. Do so while nothing is
+/// being cast.
+using RnTranslator = RnCastable* (*)(RnCastable* object, const RnUid& iid);
+OVHOST_API void RnAddTranslator(RnTranslator translator);
+OVHOST_API void RnRemoveTranslator(RnTranslator translator);
+
 /// The interface `I` of an object: its own, else a translation, else null.
 template <class I>
 RnRef<I> rnQuery(RnCastable* object) {

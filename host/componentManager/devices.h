@@ -9,11 +9,15 @@
 
 namespace Ov {
 
+// Devices are counted objects: make them with rnCreate.
+
 /// Device over bytes in memory: reads and writes at one position, and grows as it is written.
 class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
 public:
-    RnMemoryBuffer() = default;
+    RnMemoryBuffer() : RnMemoryBuffer(std::string_view()) {}
     explicit RnMemoryBuffer(std::string_view bytes);
+    RnMemoryBuffer(const RnMemoryBuffer&) = delete;
+    RnMemoryBuffer& operator=(const RnMemoryBuffer&) = delete;
 
     int readBytes(void* buffer, int count) override;
     void endLine() override;
@@ -32,28 +36,36 @@ protected:
     /// Appends more input to what is held; false at the end of it. Memory has no more than it holds.
     virtual bool readMore() { return false; }
     void append(const char* data, std::size_t count);
+    /// Room for `count` bytes at the position, which moves behind them.
+    virtual char* prepareWrite(std::size_t count) { return makeRoom(count); }
 
 private:
     std::size_t position() const { return static_cast<std::size_t>(_next - _bytes.data()); }
     void setPosition(std::size_t position);
+    char* makeRoom(std::size_t count);
+    bool fill() { return _next != _limit || readMore(); }
 
     std::string _bytes;
+    // The line feeds before a position of an earlier call, from where the next one counts on.
+    std::size_t _countedTo = 0;
+    int _lineFeeds = 0;
 };
 
 /// Input device over a standard stream, which must outlive it. It reads ahead in blocks, and keeps what it has
-/// read so that `seek` works on any stream.
+/// read so that `seek` works on any stream. Writing raises ExWriteError.
 class OVHOST_API RnInBuffer : public RnMemoryBuffer {
 public:
     explicit RnInBuffer(std::istream* source);
 
 protected:
     bool readMore() override;
+    char* prepareWrite(std::size_t count) override;
 
 private:
     std::istream* _source;
 };
 
-/// Output device over a standard stream, which must outlive it. Writes at once; reads nothing.
+/// Output device over a standard stream, which must outlive it. Writes at once; at the end of its input always.
 class OVHOST_API RnOutBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
 public:
     explicit RnOutBuffer(std::ostream* sink) : _sink(sink) {}

@@ -26,7 +26,7 @@ private:
     struct Node;
     class Pool;
     static Pool& pool();
-    Node* takeFirst();
+    RnRef<RnPersistant> takeFirst();
 
     Node* _first = nullptr;
     Node* _last = nullptr;

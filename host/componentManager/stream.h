@@ -11,9 +11,10 @@ namespace Ov {
 
 /// A stream of values, formatted text and whole objects over a device, in text or in binary form.
 ///
-/// Text form: values stand as decimal text with one separator between them; lines break after column 70.
+/// Text form: values stand as decimal text with one separator between them; lines break after column 70. Numbers
+/// read back exactly; characters stand as numbers, bool as 0 or 1, a string between quotes with \", \\ and \uXXXX.
 /// Binary form: values stand little-endian in fixed widths (long as 32 bits, wchar_t as 16, bool as one byte,
-/// a string as a 32-bit length and its characters).
+/// a string as a 32-bit length and that many UTF-16 units).
 /// Formatted text is the same in both forms, one byte a character.
 ///
 /// Errors: a value that is missing or cannot be held raises RnStreamEx::ExReadError, one that cannot be written
@@ -69,7 +70,8 @@ public:
     virtual int formattedRead(const wchar_t* format, ...);
 
     /// Writes a whole object: its class id and version, then what its persistence adapter saves. Null is written
-    /// as such. Raises ExBadCast for an object that cannot be saved.
+    /// as such. Raises ExBadCast for an object that cannot be saved. In text form what the adapter saves starts on
+    /// a fresh line; in binary form its length stands before it.
     RnStream& operator<<(const RnCastable* object);
     /// Reads an object that the operator wrote: creates it by its class id, loads it with `name` and `basePath`,
     /// and gives it as the interface `*iid` (null: as it is). A null object, or one whose load answered false,
@@ -89,6 +91,14 @@ public:
         if (pendingSeparator) skipPendingSeparator();
         return _device->getChar();
     }
+    /// The character that `getChar` would give, which stays.
+    int peekChar() {
+        if (pendingSeparator) skipPendingSeparator();
+        if (_device->next() != _device->limit()) return static_cast<unsigned char>(*_device->next());
+        const int c = _device->getChar();
+        ungetChar(c);
+        return c;
+    }
     /// Pushes back what `getChar` gave; -1 changes nothing.
     void ungetChar(int c) {
         if (c >= 0) _device->unget(static_cast<wchar_t>(c));
@@ -101,10 +111,13 @@ public:
 
 private:
     void skipPendingSeparator();
+    void saveContent(RnPersistant& adapter);
+    bool loadContent(RnPersistant& adapter, const wchar_t* name, const wchar_t* basePath);
 
     RnRef<RnBufferedIO> _device;
     Form _form;
     RnPostLoadList* _postLoad;
+    std::wstring _formatted;  // formattedWrite's output, kept for its memory
 };
 
 }  // namespace Ov

@@ -1,0 +1,391 @@
+#include <charconv>
+#include <cmath>
+#include <limits>
+#include <string_view>
+
+#include "host/base/arguments.h"
+#include "host/base/textClass.h"
+#include "host/componentManager/stream.h"
+
+// Formatted reading. A number that lies wholly in the device's window is converted in place; everything else goes
+// character by character.
+
+namespace Ov {
+
+namespace {
+
+// Numbers.
+
+/// Whether a decimal number that is out of its type's range is too large, not too small.
+bool isTooLarge(std::string_view number) {
+    const std::size_t e = std::min(number.find_first_of("eE"), number.size());
+    const std::string_view digits = number.substr(0, e);
+    const std::size_t point = std::min(digits.find('.'), digits.size());
+    const std::size_t first = digits.find_first_of("123456789");
+    if (first == std::string_view::npos) return false;
+    std::string_view power = number.substr(std::min(e + 1, number.size()));
+    if (power.starts_with('+')) power.remove_prefix(1);
+    std::int64_t exponent = 0;
+    if (std::from_chars(power.data(), power.data() + power.size(), exponent).ec ==
+        std::errc::result_out_of_range) {
+        return !power.starts_with('-');
+    }
+    return exponent > static_cast<std::int64_t>(first) - static_cast<std::int64_t>(point);
+}
+
+/// Converts a complete token; false when the type cannot hold it. What is too small is 0.
+template <class T>
+bool convertReal(std::string_view token, T& value) {
+    const auto error = std::from_chars(token.data(), token.data() + token.size(), value).ec;
+    if (error == std::errc{}) return std::isfinite(value);
+    if (error != std::errc::result_out_of_range || isTooLarge(token)) return false;
+    value = token.starts_with('-') ? -T(0) : T(0);
+    return true;
+}
+
+template <class T>
+bool convertInteger(std::string_view token, int base, T& value) {
+    return std::from_chars(token.data(), token.data() + token.size(), value, base).ec == std::errc{};
+}
+
+/// Reads a number where the window holds white space, the number and what follows it. False, with nothing
+/// consumed, in every other case and for everything that is not plain.
+template <class T>
+bool readInWindow(RnBufferedIO& device, T& value) {
+    const char* start = device.next();
+    const char* const limit = device.limit();
+    while (start != limit && isWhiteSpace(*start)) ++start;
+    const char* digits = start != limit && *start == '-' ? start + 1 : start;
+    if (digits == limit || !(isDigit(*digits) || *digits == '.')) return false;
+    T result;
+    const auto [stop, error] = std::from_chars(start, limit, result);
+    if (error != std::errc{} || stop == limit) return false;
+    if constexpr (std::is_floating_point_v<T>) {
+        // An exponent without digits belongs to the number all the same.
+        if (*stop == 'e' || *stop == 'E' || !std::isfinite(result)) return false;
+    }
+    value = result;
+    device.advanceTo(stop);
+    return true;
+}
+
+// Input and format.
+
+/// The input of one call, with a look-ahead of one character. Inside a field no more than its width is seen.
+class Input {
+public:
+    explicit Input(RnBufferedIO& device) : _device(device) {}
+
+    /// The next character, or -1 at the end of the input or of the field.
+    int peek() {
+        if (_left == 0) return -1;
+        if (_ahead == unread) _ahead = _device.getChar();
+        return _ahead;
+    }
+    void take() {
+        _ahead = unread;
+        --_left;
+        ++_consumed;
+    }
+    void takeTo(std::string& token) {
+        token.push_back(static_cast<char>(peek()));
+        take();
+    }
+    bool takeIf(int c) {
+        if (peek() != c) return false;
+        take();
+        return true;
+    }
+    void skipWhiteSpace() {
+        while (isWhiteSpace(peek())) take();
+    }
+    void setField(int width) { _left = width; }
+    void endField() { _left = std::numeric_limits<int>::max(); }
+    void pushBack() {
+        if (_ahead >= 0) _device.unget(static_cast<wchar_t>(_ahead));
+        _ahead = unread;
+    }
+    int consumed() const { return _consumed; }
+
+private:
+    static constexpr int unread = -2;
+
+    RnBufferedIO& _device;
+    int _ahead = unread;
+    int _left = std::numeric_limits<int>::max();
+    int _consumed = 0;
+};
+
+/// One conversion of a format.
+struct Directive {
+    bool suppress = false;
+    int width = 0;  // 0: none given
+    wchar_t modifier = 0;
+    wchar_t letter = 0;
+    std::wstring_view set;  // of %[
+    bool setExcludes = false;
+
+    int fieldWidth() const { return width > 0 ? width : std::numeric_limits<int>::max(); }
+    bool skipsWhiteSpace() const { return letter != L'[' && letter != L'c' && letter != L'n'; }
+    bool setHolds(int c) const;
+};
+
+bool Directive::setHolds(int c) const {
+    for (std::size_t i = 0; i < set.size(); ++i) {
+        const bool isRange = i + 2 < set.size() && set[i + 1] == L'-';
+        const auto first = static_cast<int>(set[i]);
+        const auto last = static_cast<int>(isRange ? set[i + 2] : set[i]);
+        if (c >= first && c <= last) return !setExcludes;
+        if (isRange) i += 2;
+    }
+    return setExcludes;
+}
+
+/// Reads the set of %[, which starts behind the bracket; the position behind its end. A bracket that comes first
+/// belongs to the set.
+const wchar_t* parseSet(const wchar_t* format, Directive& directive) {
+    directive.setExcludes = *format == L'^';
+    if (directive.setExcludes) ++format;
+    const wchar_t* end = *format == L']' ? format + 1 : format;
+    while (*end != 0 && *end != L']') ++end;
+    directive.set = std::wstring_view(format, static_cast<std::size_t>(end - format));
+    return *end == 0 ? end : end + 1;
+}
+
+/// Reads a directive, which starts behind the percent sign; the position behind it.
+const wchar_t* parseDirective(const wchar_t* format, Directive& directive) {
+    constexpr int widest = 100'000'000;
+    if (*format == L'*') {
+        directive.suppress = true;
+        ++format;
+    }
+    for (; *format >= L'0' && *format <= L'9'; ++format) {
+        if (directive.width < widest) directive.width = 10 * directive.width + static_cast<int>(*format - L'0');
+    }
+    if (*format == L'h' || *format == L'l') directive.modifier = *format++;
+    directive.letter = *format;
+    if (*format != 0) ++format;
+    return directive.letter == L'[' ? parseSet(format, directive) : format;
+}
+
+/// Collects the longest text that starts as a number, "+" left out; false when it is no number yet.
+bool collectReal(Input& input, std::string& token) {
+    const auto takeDigits = [&] {
+        const std::size_t before = token.size();
+        while (isDigit(input.peek())) input.takeTo(token);
+        return token.size() != before;
+    };
+    if (input.peek() == '-') {
+        input.takeTo(token);
+    } else {
+        input.takeIf('+');
+    }
+    bool hasDigits = takeDigits();
+    if (input.peek() == '.') {
+        input.takeTo(token);
+        hasDigits |= takeDigits();
+    }
+    if (!hasDigits) return false;
+    if (input.peek() != 'e' && input.peek() != 'E') return true;
+    input.takeTo(token);
+    if (input.peek() == '+' || input.peek() == '-') input.takeTo(token);
+    return takeDigits();
+}
+
+bool isDigitOf(int c, int base) {
+    if (base == 16 && ((c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F'))) return true;
+    return isDigit(c) && c - '0' < base;
+}
+
+/// Collects an integer without its prefix. Base 0 is told by the prefix and then set.
+void collectInteger(Input& input, std::string& token, int& base) {
+    if (input.peek() == '-') {
+        input.takeTo(token);
+    } else {
+        input.takeIf('+');
+    }
+    if ((base == 0 || base == 16) && input.takeIf('0')) {
+        if (input.takeIf('x') || input.takeIf('X')) {
+            base = 16;
+        } else {
+            token.push_back('0');
+            base = base == 0 ? 8 : base;
+        }
+    }
+    if (base == 0) base = 10;
+    while (isDigitOf(input.peek(), base)) input.takeTo(token);
+}
+
+int baseOf(wchar_t letter) {
+    switch (letter) {
+        case L'i':
+            return 0;
+        case L'o':
+            return 8;
+        case L'x':
+        case L'X':
+            return 16;
+        default:
+            return 10;
+    }
+}
+
+/// Reads one format.
+class Scanner {
+public:
+    Scanner(RnBufferedIO& device, Arguments& arguments) : _input(device), _arguments(arguments) {}
+
+    int scan(const wchar_t* format) {
+        Outcome outcome = Outcome::goOn;
+        while (*format != 0 && outcome == Outcome::goOn) outcome = step(format);
+        _input.pushBack();
+        return outcome == Outcome::inputEnds && _converted == 0 ? -1 : _converted;
+    }
+
+private:
+    enum class Outcome { goOn, mismatch, inputEnds };
+
+    Outcome step(const wchar_t*& format);
+    Outcome matchLiteral(wchar_t c);
+    Outcome convert(const Directive& directive);
+    Outcome readInteger(const Directive& directive);
+    Outcome readReal(const Directive& directive);
+    template <class Matches>
+    Outcome readText(const Directive& directive, bool terminates, Matches matches);
+
+    template <class T>
+    Outcome store(const Directive& directive, bool isValid, T value) {
+        if (!isValid) return Outcome::mismatch;
+        if (!directive.suppress) {
+            *_arguments.next<T*>() = value;
+            ++_converted;
+        }
+        return Outcome::goOn;
+    }
+    template <class T>
+    Outcome storeInteger(const Directive& directive, const std::string& token, int base) {
+        T value{};
+        const bool isValid = convertInteger(token, base, value);
+        return store(directive, isValid, value);
+    }
+    template <class T>
+    Outcome storeReal(const Directive& directive, const std::string& token) {
+        T value{};
+        const bool isValid = convertReal(token, value);
+        return store(directive, isValid, value);
+    }
+
+    Input _input;
+    Arguments& _arguments;
+    int _converted = 0;
+};
+
+Scanner::Outcome Scanner::step(const wchar_t*& format) {
+    const wchar_t c = *format++;
+    if (isWhiteSpace(static_cast<int>(c))) {
+        _input.skipWhiteSpace();
+        return Outcome::goOn;
+    }
+    if (c != L'%') return matchLiteral(c);
+    Directive directive;
+    format = parseDirective(format, directive);
+    if (directive.skipsWhiteSpace()) _input.skipWhiteSpace();
+    if (directive.letter == L'%') return matchLiteral(L'%');
+    if (directive.letter == L'n') {
+        *_arguments.next<int*>() = _input.consumed();
+        return Outcome::goOn;
+    }
+    if (_input.peek() < 0) return Outcome::inputEnds;
+    _input.setField(directive.fieldWidth());
+    const Outcome outcome = convert(directive);
+    _input.endField();
+    return outcome;
+}
+
+Scanner::Outcome Scanner::matchLiteral(wchar_t c) {
+    if (_input.peek() < 0) return Outcome::inputEnds;
+    return _input.takeIf(static_cast<int>(c)) ? Outcome::goOn : Outcome::mismatch;
+}
+
+Scanner::Outcome Scanner::convert(const Directive& directive) {
+    switch (directive.letter) {
+        case L'd':
+        case L'i':
+        case L'u':
+        case L'o':
+        case L'x':
+        case L'X':
+            return readInteger(directive);
+        case L'e':
+        case L'E':
+        case L'f':
+        case L'F':
+        case L'g':
+        case L'G':
+            return readReal(directive);
+        case L's':
+            return readText(directive, true, [](int c) { return !isWhiteSpace(c); });
+        case L'[':
+            return readText(directive, true, [&](int c) { return directive.setHolds(c); });
+        case L'c':
+            if (directive.width == 0) _input.setField(1);
+            return readText(directive, false, [](int) { return true; });
+        default:
+            return Outcome::mismatch;
+    }
+}
+
+Scanner::Outcome Scanner::readInteger(const Directive& directive) {
+    std::string token;
+    int base = baseOf(directive.letter);
+    collectInteger(_input, token, base);
+    const bool isSigned = directive.letter == L'd' || directive.letter == L'i';
+    if (directive.modifier == L'h') {
+        return isSigned ? storeInteger<std::int16_t>(directive, token, base)
+                        : storeInteger<std::uint16_t>(directive, token, base);
+    }
+    return isSigned ? storeInteger<std::int32_t>(directive, token, base)
+                    : storeInteger<std::uint32_t>(directive, token, base);
+}
+
+Scanner::Outcome Scanner::readReal(const Directive& directive) {
+    std::string token;
+    if (!collectReal(_input, token)) return Outcome::mismatch;
+    return directive.modifier == L'l' ? storeReal<double>(directive, token) : storeReal<float>(directive, token);
+}
+
+template <class Matches>
+Scanner::Outcome Scanner::readText(const Directive& directive, bool terminates, Matches matches) {
+    if (!matches(_input.peek())) return Outcome::mismatch;
+    wchar_t* out = directive.suppress ? nullptr : _arguments.next<wchar_t*>();
+    for (int c = _input.peek(); c >= 0 && matches(c); c = _input.peek()) {
+        if (out) *out++ = static_cast<wchar_t>(c);
+        _input.take();
+    }
+    if (!out) return Outcome::goOn;
+    if (terminates) *out = 0;
+    ++_converted;
+    return Outcome::goOn;
+}
+
+}  // namespace
+
+int RnStream::formattedRead(const wchar_t* format, ...) {
+    if (pendingSeparator) skipPendingSeparator();
+    Arguments arguments;
+    va_start(arguments.list, format);
+    // "%f" and "%d" alone read whole files of numbers.
+    int count = 0;
+    if (format[0] == L'%' && format[1] != 0 && format[2] == 0) {
+        std::va_list peeked;
+        va_copy(peeked, arguments.list);
+        if (format[1] == L'f') count = readInWindow(*_device, *va_arg(peeked, float*));
+        if (format[1] == L'd') count = readInWindow(*_device, *va_arg(peeked, std::int32_t*));
+        va_end(peeked);
+    }
+    if (count == 0) count = Scanner(*_device, arguments).scan(format);
+    va_end(arguments.list);
+    return count;
+}
+
+}  // namespace Ov
