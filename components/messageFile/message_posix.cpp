@@ -4,7 +4,6 @@
 #include <cstdint>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
 #include <vector>
 
 #include "components/messageFile/messageStore.h"
@@ -26,16 +25,18 @@ class CatalogueImage {
 public:
     explicit CatalogueImage(const fs::path& path) {
         std::ifstream in(path, std::ios::binary);
-        _bytes.assign(std::istreambuf_iterator<char>(in), {});
+        read(in, headerSize);
+        std::error_code error;
+        const std::uintmax_t size = fs::file_size(path, error);
+        if (isOurs() && !error && size > headerSize) read(in, static_cast<std::size_t>(size) - headerSize);
     }
 
     /// Whether texts are missing at the end. The C library maps a catalogue without finding this out: a text
     /// behind the end would be empty, or end the process. Files of another kind it refuses itself.
     bool isCutShort() const {
         if (_bytes.size() < headerSize) return true;
-        const bool turned = word(0) == turnedMagic;
-        if (!turned && word(0) != magic) return false;
-        const std::uint64_t rows = std::uint64_t{size(1, turned)} * size(2, turned);
+        if (!isOurs()) return false;
+        const std::uint64_t rows = std::uint64_t{headerWord(1)} * headerWord(2);
         if (rows == 0 || rows > _bytes.size() / (2 * rowSize)) return true;
         const std::uint64_t texts = headerSize + 2 * rows * rowSize;
         return texts >= _bytes.size() || lastOffset(rows) >= _bytes.size() - texts || _bytes.back() != '\0';
@@ -53,8 +54,18 @@ private:
         return value;
     }
 
-    std::uint32_t size(std::size_t index, bool turned) const {
-        return turned ? __builtin_bswap32(word(index)) : word(index);
+    /// The header stands in the order of the machine that compiled it.
+    std::uint32_t headerWord(std::size_t index) const {
+        return word(0) == turnedMagic ? __builtin_bswap32(word(index)) : word(index);
+    }
+
+    bool isOurs() const { return _bytes.size() >= headerSize && headerWord(0) == magic; }
+
+    void read(std::istream& in, std::size_t count) {
+        const std::size_t before = _bytes.size();
+        _bytes.resize(before + count);
+        in.read(_bytes.data() + before, static_cast<std::streamsize>(count));
+        _bytes.resize(before + static_cast<std::size_t>(in.gcount()));
     }
 
     std::uint32_t lastOffset(std::uint64_t rows) const {

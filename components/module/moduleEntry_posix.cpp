@@ -1,0 +1,20 @@
+#include <dlfcn.h>
+
+#include "components/photo/lid/component.h"
+#include "components/photo/lid/moduleEntry.h"
+#include "host/platform/path.h"
+#include "ovphoto/module.h"
+
+namespace {
+
+/// The loader runs this when it has attached the module.
+__attribute__((constructor)) void attach() {
+    Dl_info module;
+    if (dladdr(reinterpret_cast<void*>(&attach), &module) == 0) return;
+    const auto path = std::filesystem::absolute(module.dli_fname);
+    OvPhotometrics::enterModule(module.dli_fbase, Ov::widePath(path));
+}
+
+}  // namespace
+
+Ov::RnComponentRegistry* RnGetComponentDescription() { return &OvPhotometrics::lidComponent(); }

@@ -1,0 +1,3 @@
+#include "ovphoto/numberedExports.h"
+
+const RnNumberedExport RnNumberedExports[] = {{0, nullptr}};

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "components/photo/distributions/analytic.h"
+#include "components/photo/lid/lidBuilder.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+class Isotropic;
+using IsotropicPersistant = CandelaPersistant<Isotropic>;
+
+/// The same intensity in every direction: flux = 4 pi candela.
+class Isotropic final : public AnalyticDist<Isotropic, IsotropicPersistant, Ov::RnIsotropicIntensityDist> {
+public:
+    static constexpr BuilderFacts facts{classIds::isotropic, distributionCategory, L"Isotropic Distribution",
+                                        L"Isotropic Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = facts.classId;
+
+    float intensity(float, float) const override { return candela; }
+    float intensityAt(const GeVector3<float>&) const override { return candela; }
+    float intensityAtUnit(const GeVector3<float>&) const override { return candela; }
+    float getFlux() const override { return candela * fourPi; }
+    void setFlux(float lumens) override { candela = lumens / fourPi; }
+    AngleRange getThetaRange() const override { return {0, 3.1415927f}; }
+
+private:
+    static constexpr float fourPi = 12.566371f;
+};
+
+using IsotropicBuilder = ObjectBuilder<Isotropic>;
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,110 @@
+#include <new>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/ies/ies.h"
+#include "components/photo/lid/reportMessage.h"
+#include "components/photo/lid/webDistribution.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr int valueLineLimit = 133;  // no value line reaches this many characters
+
+double widened(float value) { return value; }
+
+void writeValues(const std::vector<float>& values, Ov::RnStream& out) {
+    writeValueList(values.size(), values.data(), out, valueLineLimit);
+}
+
+void writeTilt(const IesFileRecord& rec, Ov::RnStream& out) {
+    switch (rec.tiltKind) {
+        case IesTiltKind::none:
+            writeLine(out, L"TILT=NONE");
+            break;
+        case IesTiltKind::include:
+            writeLine(out, L"TILT=INCLUDE");
+            writeLine(out, L" %d", rec.tilt.geometry);
+            writeLine(out, L" %d", static_cast<int>(rec.tilt.tiltAngles.size()));
+            writeValues(rec.tilt.tiltAngles, out);
+            writeValues(rec.tilt.tiltFactors, out);
+            break;
+        case IesTiltKind::file:
+            writeLine(out, L"TILT=%*s", 75, rec.tiltFile.c_str());
+            break;
+    }
+}
+
+void writeGrid(const CandelaGrid& grid, Ov::RnStream& out) {
+    writeValues(grid.verticalAngles, out);
+    writeValues(grid.horizontalAngles, out);
+    const auto column = static_cast<std::size_t>(grid.verticalCount);
+    for (int j = 0; j < grid.horizontalCount; ++j)
+        writeValueList(column, &grid.candelas[grid.index(0, j)], out, valueLineLimit);
+}
+
+int horizontalSamples(PhotoWebSymmetry symmetry) {
+    switch (symmetry) {
+        case PhotoWebSymmetry::Full:
+            return 36;
+        case PhotoWebSymmetry::Half:
+            return 18;
+        case PhotoWebSymmetry::Quarter:
+            return 9;
+        case PhotoWebSymmetry::Axial:
+            break;
+    }
+    return 1;
+}
+
+}  // namespace
+
+bool iesRecordInitForWriting(IesFileRecord& rec) {
+    try {
+        rec = IesFileRecord();
+        rec.lines = {L"IESNA91", L"[TEST]     Test unknown", L"[MANUFAC]  Manufacturing company unknown"};
+        return true;
+    } catch (const std::bad_alloc&) {
+        reportMessage(messages::outOfMemory);
+        return false;
+    }
+}
+
+bool iesRecordFromDistribution(Ov::RnIntensityDist& dist, IesFileRecord& rec) {
+    const auto web = webOf(dist);
+    const GridFit fit = web ? gridFit(*web) : GridFit::none;
+    if (fit == GridFit::none) return iesRecordFromSampling(dist, rec);
+    if (!iesRecordInitForWriting(rec) || !candelaGridFromWeb(rec.grid, *web, fit, 1)) return false;
+    rec.photometricType = fit == GridFit::polar ? IesPhotometricType::C : IesPhotometricType::A;
+    rec.lumensPerLamp = web->getLumens();
+    return true;
+}
+
+bool iesRecordFromSampling(Ov::RnIntensityDist& dist, IesFileRecord& rec) {
+    if (!iesRecordInitForWriting(rec)) return false;
+    if (!candelaGridFromSampling(rec.grid, dist, horizontalSamples(dist.getSymmetry()), 1)) return false;
+    rec.lumensPerLamp = dist.getFlux();
+    return true;
+}
+
+bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out) {
+    const CandelaGrid& grid = rec.grid;
+    const bool real = grid.verticalCount >= 2 && grid.horizontalCount >= 1;
+    for (const std::wstring& line : rec.lines) writeLine(out, L"%s", line.c_str());
+    writeTilt(rec, out);
+    writeLine(out, L"%d %.2f %.16g", rec.lampCount, widened(rec.lumensPerLamp), widened(rec.candelaMultiplier));
+    writeLine(out, L"%d %d", real ? grid.verticalCount : 2, real ? grid.horizontalCount : 1);
+    writeLine(out, L"%d", static_cast<int>(rec.photometricType));
+    writeLine(out, L"%d", rec.unitsType);
+    writeLine(out, L"%.16g %.16g %.16g", widened(rec.width), widened(rec.length), widened(rec.height));
+    writeLine(out, L"%.16g %.16g %.16g", widened(rec.ballastFactor), widened(rec.ballastLampFactor),
+              widened(rec.inputWatts));
+    if (real) {
+        writeGrid(grid, out);
+    } else {
+        for (const wchar_t* line : {L"0.0 180.0", L"0.0", L"0.0 0.0"}) writeLine(out, L"%s", line);
+    }
+    return true;
+}
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,58 @@
+#pragma once
+
+#include <memory>
+#include <unordered_map>
+
+#include "host/componentManager/builder.h"
+#include "host/componentManager/castImpl.h"
+
+namespace OvPhotometrics {
+
+/// Every builder of the library by class id. One table a process; it is filled before the module's first call and
+/// only read afterwards. The table and the builders are never freed.
+class BuilderTable {
+public:
+    /// Enters a builder, which must stay. The first of a class id is kept.
+    void add(Ov::RnComponentBuilder& builder);
+    Ov::RnComponentBuilder* find(const Ov::RnUid& classId) const;
+
+    std::size_t size() const { return _builders.size(); }
+    auto begin() const { return _builders.begin(); }
+    auto end() const { return _builders.end(); }
+
+private:
+    struct Hash {
+        std::size_t operator()(const Ov::RnUid* id) const { return id->w0; }
+    };
+    struct Equal {
+        bool operator()(const Ov::RnUid* a, const Ov::RnUid* b) const { return *a == *b; }
+    };
+    std::unordered_map<const Ov::RnUid*, Ov::RnComponentBuilder*, Hash, Equal> _builders;
+};
+
+/// Made on first use.
+BuilderTable& builderTable();
+
+/// The registry that the module's entry point answers; all it says comes from the builder table.
+class LidComponent final : public Ov::RnCastImpl<Ov::RnComponentRegistry, Ov::RnComponentRegistry> {
+public:
+    LidComponent() { builderTable(); }
+
+    Ov::RnRef<Ov::RnComponentBuilder> getBuilder(const Ov::RnUid& classId) override;
+    int getVersion() const override { return 1; }
+    const wchar_t* getLegalNotice() const override;
+    const wchar_t* getVendor() const override;
+    std::uint32_t getBuilderCount() const override;
+    Ov::RnEnum::Action enumerateBuilders(Ov::RnEnumerator<Ov::RnPtr<Ov::RnComponentBuilder>>& visitor) override;
+};
+
+LidComponent& lidComponent();
+
+/// A static object that is never destroyed, so that it may be asked until the process ends.
+template <class T>
+T& immortal() {
+    static T* object = new T;
+    return *object;
+}
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,48 @@
+#pragma once
+
+#include "host/componentManager/builder.h"
+#include "host/componentManager/castImpl.h"
+
+namespace OvPhotometrics {
+
+/// What a builder says of the class that it builds.
+struct BuilderFacts {
+    Ov::RnUid classId;
+    const wchar_t* category;
+    const wchar_t* name;
+    const wchar_t* description;
+};
+
+inline constexpr const wchar_t* photometricWebCategory = L"Photometric Web";
+inline constexpr const wchar_t* distributionCategory = L"Light Intensity Distribution";
+
+/// The texts that the registry and every builder give.
+inline constexpr const wchar_t* legalNotice = L"Copyright the ovphoto authors. MIT licence.";
+inline constexpr const wchar_t* vendor = L"The ovphoto authors";
+
+/// Base of every builder of the library.
+class LidBuilder : public Ov::RnComponentBuilder {
+public:
+    const wchar_t* getLegalNotice() const override { return legalNotice; }
+    const wchar_t* getVendor() const override { return vendor; }
+    int getVersion() const override { return 1; }
+    bool isCreatable() const override { return true; }
+};
+
+/// A builder's answers from `T::facts`, over `Base`, a LidBuilder that answers the castable operations.
+template <class T, class Base>
+class FactsBuilder : public Base {
+public:
+    const Ov::RnUid& getClassId() const override { return T::facts.classId; }
+    const wchar_t* getCategory() const override { return T::facts.category; }
+    const wchar_t* getName() const override { return T::facts.name; }
+    const wchar_t* getDescription() const override { return T::facts.description; }
+    Ov::RnRef<Ov::RnCastable> create() override { return Ov::rnCreateOrNull<T>(); }
+};
+
+/// Builds objects of a class that no file is imported into.
+template <class T>
+using ObjectBuilder =
+    FactsBuilder<T, Ov::RnCastImpl<LidBuilder, Ov::RnComponentBuilder, Ov::RnBuilderDescription>>;
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace OvPhotometrics {
+
+/// The companion that holds the message texts: the module's path with the file's extension replaced by "Res.dll",
+/// which is appended when the file has none.
+std::wstring companionPath(std::wstring_view modulePath);
+
+/// What every platform's entry does when the module has been loaded from `modulePath`: registers the builders,
+/// takes the host's language and names the companion to the catalogue, which opens it at the first message.
+void enterModule(void* instance, std::wstring_view modulePath);
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,129 @@
+#include "components/photo/lid/numberText.h"
+
+#include <algorithm>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/reportMessage.h"
+#include "host/base/textFormat.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr int ctrlZ = 0x1A;
+
+bool isBlank(int c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
+bool isBetween(int c) { return isBlank(c) || c == ','; }
+bool startsNumber(int c) { return (c >= '0' && c <= '9') || c == '-' || c == '.'; }
+
+}  // namespace
+
+bool readTextLine(Ov::RnStream& in, const wchar_t* format, std::wstring& line) {
+    wchar_t buffer[81] = {};
+    if (in.formattedRead(format, buffer) < 0) return false;
+    line = buffer;
+    int c = in.getChar();
+    if (c == '\r') c = in.getChar();
+    if (c != '\n') in.ungetChar(c);
+    return true;
+}
+
+bool matchesAt(Ov::RnBufferedIO& io, const wchar_t* text) {
+    const long start = io.seek(0, 1);
+    while (*text && io.getChar() == static_cast<int>(*text)) ++text;
+    io.seek(start, 0);
+    return *text == 0;
+}
+
+bool NumberText::fail(unsigned id) {
+    _failed = true;
+    reportParseMessage(id);
+    return false;
+}
+
+bool NumberText::fail(unsigned id, int character) {
+    _failed = true;
+    reportParseMessage(id, character);
+    return false;
+}
+
+/// Goes to the start of the next number. Without one that is reported, and `instead` is what the number gives.
+bool NumberText::findNumber(unsigned unexpected, std::int32_t& instead) {
+    int c = _in.peekChar();
+    while (isBetween(c)) {
+        _in.getChar();
+        c = _in.peekChar();
+    }
+    if (startsNumber(c)) return true;
+    instead = 0;
+    if (c >= 0) {
+        _in.getChar();
+        return fail(unexpected, c);
+    }
+    const bool first = !_ended;
+    _ended = true;
+    if (_atEnd == AtEnd::unexpectedBlank) return first && fail(unexpected, ' ');
+    instead = -1;
+    return first && fail(messages::numberNotConverted);
+}
+
+/// A number that runs on into something else is none: reading on there would shift all values behind it.
+bool NumberText::atNumberEnd() {
+    const int c = _in.peekChar();
+    return c < 0 || isBetween(c) || c == ctrlZ || c == 0;
+}
+
+bool NumberText::readInteger(std::int32_t& value) {
+    if (!findNumber(messages::integerExpected, value)) return false;
+    const bool converted = _in.formattedRead(L"%d", &value) == 1;
+    if (converted && _in.peekChar() == '.') {
+        do _in.getChar();
+        while (_in.peekChar() == '0');
+    }
+    if (converted && atNumberEnd()) return true;
+    value = -1;
+    return fail(messages::numberNotConverted);
+}
+
+bool NumberText::readFloat(float& value) {
+    std::int32_t instead;
+    if (!findNumber(messages::floatExpected, instead)) {
+        value = static_cast<float>(instead);
+        return false;
+    }
+    if (_in.formattedRead(L"%f", &value) == 1 && atNumberEnd()) return true;
+    value = -1;
+    return fail(messages::numberNotConverted);
+}
+
+bool NumberText::readFloats(std::size_t count, std::vector<float>& values) {
+    values.clear();
+    for (std::size_t i = 0; i < count && !_ended; ++i) {
+        float value;
+        readFloat(value);
+        values.push_back(value);
+    }
+    return !_failed;
+}
+
+void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit) {
+    Ov::FormatSpec twoDecimals;
+    twoDecimals.precision = 2;
+    twoDecimals.letter = L'f';
+    std::wstring item;
+    int length = 0;
+    for (std::size_t i = 0; i < count; ++i) {
+        item.assign(1, L' ');
+        Ov::appendDouble(item, twoDecimals, values[i]);
+        const int width = static_cast<int>(item.size());
+        length += width;
+        if (length >= limit) {
+            out.endLine();
+            length = width;
+        }
+        out.writeItem(item.data(), width);
+    }
+    out.endLine();
+}
+
+}  // namespace OvPhotometrics

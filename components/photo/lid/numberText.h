@@ -1,0 +1,66 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "host/componentManager/stream.h"
+
+// Lines, free-form numbers and value lists of text formats.
+
+namespace OvPhotometrics {
+
+/// Reads one line through `format` ("%80[^\r\n]": up to 80 characters, the most there may be), and its end: CR LF,
+/// LF or a lone CR. A longer line goes on as the next. False at the end of the input.
+bool readTextLine(Ov::RnStream& in, const wchar_t* format, std::wstring& line);
+
+/// Whether the text at the current position of `io` starts with `text`; the position is kept.
+bool matchesAt(Ov::RnBufferedIO& io, const wchar_t* text);
+
+/// Reads numbers that white space and commas separate, wherever lines break. A number must start with a digit, "-"
+/// or "." and end at white space, a comma, Ctrl-Z, NUL or the end of the input.
+///
+/// Errors:   a number that fails is reported (12946 to 12948, inside the general reading message), the end of the
+///           input once; the operations then answer false, and `failed` stays true. The value is 0 for an
+///           unexpected character, which is consumed, and -1 for what cannot be converted.
+class NumberText {
+public:
+    /// How a number is reported that the input ends before.
+    enum class AtEnd { notConverted, unexpectedBlank };
+
+    explicit NumberText(Ov::RnStream& in, AtEnd atEnd) : _in(in), _atEnd(atEnd) {}
+
+    /// A fraction of zeros ("73.0") counts as part of an integer.
+    bool readInteger(std::int32_t& value);
+    bool readFloat(float& value);
+    /// Reads a group to its end, even when a number fails; only the end of the input ends it. Memory is taken as
+    /// values arrive. Throws std::bad_alloc.
+    bool readFloats(std::size_t count, std::vector<float>& values);
+
+    bool failed() const { return _failed; }
+    /// Whether a number was wanted behind the end of the input.
+    bool ended() const { return _ended; }
+
+private:
+    bool findNumber(unsigned unexpected, std::int32_t& instead);
+    bool atNumberEnd();
+    bool fail(unsigned id);
+    bool fail(unsigned id, int character);
+
+    Ov::RnStream& _in;
+    AtEnd _atEnd;
+    bool _failed = false;
+    bool _ended = false;
+};
+
+/// Writes formatted text and ends the line.
+template <class... Args>
+void writeLine(Ov::RnStream& out, const wchar_t* format, Args... args) {
+    out.formattedWrite(format, args...);
+    out.endLine();
+}
+
+/// Writes values with two decimals, each behind a blank, as lines of less than `limit` characters.
+void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit);
+
+}  // namespace OvPhotometrics

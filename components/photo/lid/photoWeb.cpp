@@ -1,0 +1,277 @@
+#include "components/photo/lid/photoWeb.h"
+
+#include <algorithm>
+#include <cmath>
+#include <new>
+#include <vector>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/reportMessage.h"
+#include "components/photo/lid/webEvaluation.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+std::size_t count(int n) {
+    if (n < 0) throw std::bad_array_new_length();
+    return static_cast<std::size_t>(n);
+}
+
+std::unique_ptr<float[]> newFloats(std::size_t n) { return std::make_unique_for_overwrite<float[]>(n); }
+
+bool ascends(const float* angles, int n) { return std::is_sorted(angles, angles + n); }
+
+/// The flux integral over theta of many rows on one list of angles: the sines serve all rows.
+class ThetaIntegral {
+public:
+    ThetaIntegral(int n, const float* angles)
+        : _n(n), _angles(angles), _steps(n < 30 && n > 1 ? (n + 28) / (n - 1) : 1) {
+        if (n < 2) return;
+        _sines.reserve(count(n - 1) * count(_steps));
+        for (int k = 1; k < n; ++k)
+            if (subdivides())
+                addSteps(k);
+            else
+                addSine((angles[k] + angles[k - 1]) / 2);
+    }
+
+    float operator()(const float* values) const {
+        if (_n < 2) return 0;
+        return subdivides() ? sumOfSteps(values) : sumOfIntervals(values);
+    }
+
+private:
+    bool subdivides() const { return _n < 30; }
+    void addSine(float angle) { _sines.push_back(std::sin(static_cast<double>(angle))); }
+    float stepOf(int k) const { return (_angles[k] - _angles[k - 1]) / static_cast<float>(_steps); }
+
+    void addSteps(int k) {
+        const float da = stepOf(k);
+        float a = _angles[k - 1];
+        for (int step = 0; step < _steps; ++step, a += da) addSine((a + da + a) * 0.5f);
+    }
+
+    float sumOfIntervals(const float* v) const {
+        float sum = 0;
+        for (int k = 1; k < _n; ++k)
+            sum = static_cast<float>(sum +
+                                     _sines[count(k - 1)] * ((v[k] + v[k - 1]) * (_angles[k] - _angles[k - 1])));
+        return sum * 0.5f;
+    }
+
+    float sumOfSteps(const float* values) const {
+        float total = 0;
+        const double* sine = _sines.data();
+        for (int k = 1; k < _n; ++k) {
+            const float dv = (values[k] - values[k - 1]) / static_cast<float>(_steps);
+            float v = values[k - 1];
+            float sum = 0;
+            for (int step = 0; step < _steps; ++step, v += dv)
+                sum = static_cast<float>(sum + *sine++ * (v + dv + v));
+            total += stepOf(k) * sum;
+        }
+        return total * 0.5f;
+    }
+
+    int _n;
+    const float* _angles;
+    int _steps;  // equal parts that an interval of a coarse list is cut into
+    std::vector<double> _sines;
+};
+
+/// Flux in lumens of a grid whose values are relative to a peak of `maxCandela`.
+float integrateFlux(const PhotoWebRecord& rec, const float* values, float maxCandela) {
+    const ThetaIntegral integral(rec.nthetas, rec.thetas.get());
+    const auto row = [&](int j) { return integral(values + count(j) * count(rec.nthetas)); };
+    const float first = row(0);
+    float last = first;
+    float sum = 0;
+    for (int j = 1; j < rec.npsis; ++j) {
+        const float next = row(j);
+        sum += (next + last) * (rec.psis[j] - rec.psis[j - 1]);
+        last = next;
+    }
+    const float lastPsi = rec.psis[rec.npsis - 1];
+    switch (rec.symmetry) {
+        case PhotoWebSymmetry::Full:
+            if (!rec.psiTruncated) sum += ((rec.psis[0] + twoPi) - lastPsi) * (last + first);
+            break;
+        case PhotoWebSymmetry::Half:
+            if (!rec.psiTruncated) sum += 2 * last * (pi - lastPsi);
+            sum = 2 * sum;
+            break;
+        case PhotoWebSymmetry::Quarter:
+            if (!rec.psiTruncated) sum += 2 * last * (halfPi - lastPsi);
+            sum = 4 * sum;
+            break;
+        case PhotoWebSymmetry::Axial:
+            sum = (first + first) * twoPi;
+            break;
+    }
+    return sum * 0.5f * maxCandela;
+}
+
+/// The message that refuses the last psi for the symmetry, or 0.
+unsigned refusedPsiRange(const PhotoWebRecord& rec) {
+    const auto outside = [&](float limit) {
+        const float last = rec.psis[rec.npsis - 1];
+        return compareAngles(last, 0) <= 0 || compareAngles(last, limit) > 0;
+    };
+    switch (rec.symmetry) {
+        case PhotoWebSymmetry::Full:
+            return outside(twoPi) ? messages::fullRange : 0;
+        case PhotoWebSymmetry::Half:
+            return outside(pi) ? messages::halfRange : 0;
+        case PhotoWebSymmetry::Quarter:
+            return outside(halfPi) ? messages::quarterRange : 0;
+        case PhotoWebSymmetry::Axial:
+            return rec.npsis != 1 ? messages::axialCount : 0;
+    }
+    return 0;
+}
+
+unsigned refusedAngles(const PhotoWebRecord& rec) {
+    if (!ascends(rec.thetas.get(), rec.nthetas)) return messages::verticalAnglesNotAscending;
+    if (!ascends(rec.psis, rec.npsis)) return messages::horizontalAnglesNotAscending;
+    if (compareAngles(rec.psis[0], 0) != 0) return messages::firstHorizontalAngleNotZero;
+    return refusedPsiRange(rec);
+}
+
+}  // namespace
+
+int compareAngles(float a, float b) {
+    constexpr double tolerance = 0.0043633231;
+    if (static_cast<double>(b) > a + tolerance) return -1;
+    return a > b + tolerance ? 1 : 0;
+}
+
+void photoWebRecordInit(PhotoWebRecord& rec, int nthetas, int npsis, PhotoWebSymmetry symmetry, bool psiTruncated,
+                        bool loaded, const wchar_t* name) {
+    rec = PhotoWebRecord();
+    rec.loaded = loaded;
+    PhotoWebRecord filled;
+    filled.loaded = loaded;
+    if (name) filled.name = name;
+    filled.candelas = newFloats(count(nthetas) * count(npsis));
+    filled.thetas = newFloats(count(nthetas) + count(npsis));
+    filled.psis = filled.thetas.get() + nthetas;
+    filled.nthetas = nthetas;
+    filled.npsis = npsis;
+    filled.symmetry = symmetry;
+    filled.psiTruncated = psiTruncated;
+    if (symmetry == PhotoWebSymmetry::Axial && npsis > 0) filled.psis[0] = 0;
+    rec = std::move(filled);
+}
+
+void photoWebRecordFree(PhotoWebRecord& rec) {
+    rec.thetas.reset();
+    rec.psis = nullptr;
+    rec.candelas.reset();
+    rec.nthetas = rec.npsis = 0;
+    rec.name.clear();
+}
+
+void photoWebRecordSetTheta(PhotoWebRecord& rec, int i, float radians) {
+    rec.thetas[count(std::clamp(i, 0, rec.nthetas - 1))] = radians;
+}
+
+void photoWebRecordSetPsi(PhotoWebRecord& rec, int j, float radians) {
+    if (rec.symmetry != PhotoWebSymmetry::Axial)
+        rec.psis[photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry)] = radians;
+}
+
+void photoWebRecordSetCandela(PhotoWebRecord& rec, int i, int j, float candela) {
+    const std::size_t row = count(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry));
+    rec.candelas[row * count(rec.nthetas) + count(std::clamp(i, 0, rec.nthetas - 1))] = candela;
+    if (candela > rec.maxCandela) rec.maxCandela = candela;
+}
+
+void photoWebRecordSetLumens(PhotoWebRecord& rec, float lumens) { rec.lumens = lumens; }
+
+void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<float>& orientation) {
+    rec.orientation = orientation;
+    rec.identityOrientation = false;
+}
+
+float photoWebIntegrate(int n, const float* angles, const float* values) {
+    return ThetaIntegral(n, angles)(values);
+}
+
+bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
+    if (rec.nthetas <= 0 || rec.npsis <= 0) return false;
+    if (const unsigned refused = refusedAngles(rec)) {
+        reportMessage(refused);
+        return false;
+    }
+
+    // Everything that can fail comes before the first change of the web.
+    const std::size_t values = count(rec.nthetas) * count(rec.npsis);
+    const std::size_t angles = count(rec.nthetas) + count(rec.npsis);
+    auto candelas = newFloats(values);
+    auto thetas = newFloats(angles);
+    std::wstring name = rec.name;
+    std::copy_n(rec.thetas.get(), angles, thetas.get());
+    float lumens = 0;
+    if (rec.maxCandela > 0) {
+        std::transform(rec.candelas.get(), rec.candelas.get() + values, candelas.get(),
+                       [peak = rec.maxCandela](float value) { return value / peak; });
+        lumens = rec.lumens > 0 ? rec.lumens : integrateFlux(rec, candelas.get(), rec.maxCandela);
+    } else {
+        std::copy_n(rec.candelas.get(), values, candelas.get());
+    }
+    const auto finite = [](float value) { return std::isfinite(value); };
+    if (!finite(rec.maxCandela) || !finite(lumens) ||
+        !std::all_of(candelas.get(), candelas.get() + values, finite))
+        return false;
+
+    web._name = std::move(name);
+    web._thetas = std::move(thetas);
+    web._psis = web._thetas.get() + rec.nthetas;
+    web._candelas = std::move(candelas);
+    web._maxCandela = rec.maxCandela;
+    web._lumens = lumens;
+    web._orientation = rec.orientation.computeTranspose();
+    web._nthetas = rec.nthetas;
+    web._npsis = rec.npsis;
+    web._symmetry = rec.symmetry;
+    web._psiTruncated = rec.psiTruncated;
+    web._identityOrientation = rec.identityOrientation;
+    web._loaded = rec.loaded;
+    return true;
+}
+
+RnBasePhotoWebData::RnBasePhotoWebData(const RnBasePhotoWebData& other)
+    : Ov::RnPhotoWebData(),
+      _maxCandela(other._maxCandela),
+      _lumens(other._lumens),
+      _orientation(other._orientation),
+      _nthetas(other._nthetas),
+      _npsis(other._npsis),
+      _symmetry(other._symmetry),
+      _psiTruncated(other._psiTruncated),
+      _identityOrientation(other._identityOrientation) {
+    if (!other._thetas) return;
+    const std::size_t angles = count(_nthetas) + count(_npsis);
+    const std::size_t values = count(_nthetas) * count(_npsis);
+    _thetas = newFloats(angles);
+    _candelas = newFloats(values);
+    _psis = _thetas.get() + _nthetas;
+    std::copy_n(other._thetas.get(), angles, _thetas.get());
+    std::copy_n(other._candelas.get(), values, _candelas.get());
+}
+
+GeVector3<float>& RnBasePhotoWebData::toWebFrame(GeVector3<float>& out, const GeVector3<float>& direction) const {
+    out = _identityOrientation ? direction : (_orientation * direction).normalized();
+    return out;
+}
+
+GeVector3<float>& RnBasePhotoWebData::toWebFrameUnit(GeVector3<float>& out,
+                                                     const GeVector3<float>& direction) const {
+    out = (_identityOrientation ? direction : _orientation * direction).normalized();
+    return out;
+}
+
+float RnBasePhotoWebData::getIntensity(float theta, float psi) const { return evaluateWeb(*this, theta, psi); }
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,210 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "components/photo/lid/angleSearch.h"
+#include "ovphoto/photoWebData.h"
+
+// The photometric web in memory: the record that a format's reader fills, and the class behind RnPhotoWebData that
+// a finished record is installed into.
+//
+// Units:    radians; candela in a record, values relative to the peak in an installed web; lumens.
+// Layout:   candelas stand one psi row after another: the value of theta index i and psi index j is element
+//           j * nthetas + i.
+
+namespace OvPhotometrics {
+
+using Ov::AngleRange;
+using Ov::GeLinearMatrix3;
+using Ov::GeVector3;
+using Ov::IndexRange;
+using Ov::PhotoWebSymmetry;
+using Ov::RnEnum;
+using Ov::RnRef;
+
+// The single-precision angles that all range checks and foldings use.
+inline constexpr float pi = 3.1415927f;
+inline constexpr float twoPi = 6.2831855f;
+inline constexpr float halfPi = 1.5707964f;
+
+/// -1, 0 or +1 as a lies below, about at or above b, within 0.25 degree.
+int compareAngles(float a, float b);
+
+/// Degrees and radians in double, in this order of steps; an angle that is stored is rounded once.
+inline double inRadians(double degrees) { return degrees * 3.14159265358979323846 / 180.0; }
+inline double inDegrees(double radians) { return radians * 180.0 / 3.14159265358979323846; }
+inline float toRadians(double degrees) { return static_cast<float>(inRadians(degrees)); }
+
+/// A web as a reader fills it. Owns its blocks.
+struct PhotoWebRecord {
+    std::wstring name;
+    std::unique_ptr<float[]> thetas;  // one block: nthetas vertical angles, then npsis horizontal ones
+    float* psis = nullptr;            // inside that block
+    std::unique_ptr<float[]> candelas;
+    float maxCandela = 0;  // the largest value set so far
+    float lumens = 0;      // 0 or below: the file gives none
+    GeLinearMatrix3<float> orientation;
+    std::int32_t nthetas = 0;
+    std::int32_t npsis = 0;
+    PhotoWebSymmetry symmetry = PhotoWebSymmetry::Full;
+    bool psiTruncated = false;  // nothing is emitted beyond the last psi
+    bool identityOrientation = true;
+    bool loaded = false;
+};
+
+/// Starts a record: angles and candelas are allocated and not yet set (psi 0 of an axial web is 0). Throws
+/// std::bad_alloc, also for sizes that cannot be held; the record is then empty.
+void photoWebRecordInit(PhotoWebRecord& rec, int nthetas, int npsis, PhotoWebSymmetry symmetry, bool psiTruncated,
+                        bool loaded, const wchar_t* name);
+/// Lets go of the blocks and the name. A record does so itself at its end.
+void photoWebRecordFree(PhotoWebRecord& rec);
+
+// Setters: theta indices are clamped, psi indices folded by symmetry.
+void photoWebRecordSetTheta(PhotoWebRecord& rec, int i, float radians);
+/// Nothing for an axial web.
+void photoWebRecordSetPsi(PhotoWebRecord& rec, int j, float radians);
+void photoWebRecordSetCandela(PhotoWebRecord& rec, int i, int j, float candela);
+void photoWebRecordSetLumens(PhotoWebRecord& rec, float lumens);
+/// Counts as an orientation even when it is the identity.
+void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<float>& orientation);
+
+/// The stored psi index that index j stands for, j = -1 and beyond the last included: around the circle for Full,
+/// reflected at both ends for Half and Quarter, 0 for Axial.
+inline int photoWebFoldPsiIndex(int j, int npsis, PhotoWebSymmetry symmetry) {
+    const bool mirrored = symmetry == PhotoWebSymmetry::Half || symmetry == PhotoWebSymmetry::Quarter;
+    if ((!mirrored && symmetry != PhotoWebSymmetry::Full) || npsis < 2) return 0;
+    if (j >= 0 && j < npsis) return j;
+    if (!mirrored) return j < 0 ? npsis - 1 : j % npsis;
+    if (j < 0) return 1;
+    const int r = j % (2 * npsis - 2);
+    return r < npsis ? r : 2 * npsis - 2 - r;
+}
+
+/// The integral of v(theta) sin(theta) over the n sampled angles, v linear between them: exact sums are fixed, in
+/// single precision around a double sine. 0 for fewer than two angles.
+float photoWebIntegrate(int n, const float* angles, const float* values);
+
+class RnBasePhotoWebData;
+
+/// Checks a record and makes it the content of `web`: values relative to the peak, the flux integrated when the
+/// record has none, the orientation transposed (it then carries host directions into the web's frame).
+/// False, and nothing has changed, after a message about angles (12925 to 12931), or without one when the peak,
+/// the flux or a value is not finite. Throws std::bad_alloc with nothing changed.
+bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);
+
+/// The web behind RnPhotoWebData; each format derives its own. Queries work from the members alone and allocate
+/// nothing.
+class RnBasePhotoWebData : public Ov::RnPhotoWebData {
+public:
+    RnBasePhotoWebData() = default;
+    /// The grid, flux, peak, orientation and flags of `other`; no name, not loaded.
+    RnBasePhotoWebData(const RnBasePhotoWebData& other);
+    RnBasePhotoWebData& operator=(const RnBasePhotoWebData&) = delete;
+
+    bool isLoaded() const override { return _loaded; }
+    const wchar_t* getName() const override { return _name.c_str(); }
+    PhotoWebSymmetry getSymmetry() const override { return _symmetry; }
+    float getMaxCandela() const override { return _maxCandela; }
+    float getLumens() const override { return _lumens; }
+    bool hasIdentityOrientation() const override { return _identityOrientation; }
+    GeLinearMatrix3<float> getOrientation() const override { return _orientation; }
+    GeVector3<float>& toWebFrame(GeVector3<float>& out, const GeVector3<float>& direction) const override;
+    GeVector3<float>& toWebFrameUnit(GeVector3<float>& out, const GeVector3<float>& direction) const override;
+    bool isPsiTruncated() const override { return _psiTruncated; }
+    AngleRange getThetaRange() const override {
+        return _nthetas > 0 ? AngleRange{_thetas[0], _thetas[_nthetas - 1]} : AngleRange{};
+    }
+    AngleRange getPsiRange() const override {
+        return _npsis > 0 ? AngleRange{_psis[0], _psis[_npsis - 1]} : AngleRange{};
+    }
+    int findTheta(float angle) const override { return lastAtMost(_thetas.get(), _nthetas, angle); }
+    int findPsi(float angle) const override { return lastAtMost(_psis, _npsis, angle); }
+    int getThetaCount() const override { return _nthetas; }
+    float getTheta(int index) const override { return _nthetas > 0 ? _thetas[clampTheta(index)] : 0; }
+    int getPsiCount() const override { return _npsis; }
+    float getPsi(int index) const override {
+        return _npsis > 0 ? _psis[photoWebFoldPsiIndex(index, _npsis, _symmetry)] : 0;
+    }
+    float getCandela(int psiIndex, int thetaIndex) const override {
+        if (empty()) return 0;
+        return row(photoWebFoldPsiIndex(psiIndex, _npsis, _symmetry))[clampTheta(thetaIndex)];
+    }
+    void getCandelaBlock(IndexRange psis, IndexRange thetas, float* out) const override;
+    RnEnum::Action enumerateFiles(Ov::RnEnumerator<const wchar_t*>& visitor) const override {
+        return visitor.finish();
+    }
+    float getIntensity(float theta, float psi) const override;
+
+protected:
+    friend bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);
+
+    bool empty() const { return _nthetas <= 0 || _npsis <= 0; }
+    int clampTheta(int i) const { return i <= 0 ? 0 : i < _nthetas ? i : _nthetas - 1; }
+    const float* row(int j) const {
+        return _candelas.get() + static_cast<std::size_t>(j) * static_cast<std::size_t>(_nthetas);
+    }
+    float* copyRow(int j, IndexRange thetas, float* out) const;
+
+    std::wstring _name;
+    std::unique_ptr<float[]> _thetas;
+    float* _psis = nullptr;
+    std::unique_ptr<float[]> _candelas;
+    float _maxCandela = 0;
+    float _lumens = 0;
+    GeLinearMatrix3<float> _orientation;
+    std::int32_t _nthetas = 0;
+    std::int32_t _npsis = 0;
+    PhotoWebSymmetry _symmetry = PhotoWebSymmetry::Full;
+    bool _psiTruncated = false;
+    bool _identityOrientation = true;
+    bool _loaded = false;
+};
+
+inline float* RnBasePhotoWebData::copyRow(int j, IndexRange thetas, float* out) const {
+    const float* values = row(j);
+    if (thetas.first >= 0 && thetas.last < _nthetas) {
+        for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[i];
+    } else {
+        for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[clampTheta(i)];
+    }
+    return out;
+}
+
+inline void RnBasePhotoWebData::getCandelaBlock(IndexRange psis, IndexRange thetas, float* out) const {
+    if (empty()) {
+        for (int h = psis.first; h <= psis.last; ++h)
+            for (int i = thetas.first; i <= thetas.last; ++i) *out++ = 0;
+        return;
+    }
+    if (_symmetry == PhotoWebSymmetry::Axial) {
+        for (int h = psis.first; h <= psis.last; ++h) out = copyRow(0, thetas, out);
+        return;
+    }
+    const bool full = _symmetry == PhotoWebSymmetry::Full;
+    if (!full && _symmetry != PhotoWebSymmetry::Half && _symmetry != PhotoWebSymmetry::Quarter) return;
+    if (psis.first < -1 || psis.first >= _npsis)
+        Ov::Assertions::throwAssertionFailed("h >= -1 && h < _npsis", "components/photo/lid/photoweb", __LINE__);
+
+    // Rows wrap around the circle, or turn back at both ends.
+    int step = 1;
+    int j = psis.first;
+    if (j < 0) {
+        j = full ? _npsis - 1 : _npsis > 1 ? 1 : 0;
+        step = full ? 1 : -1;
+    }
+    for (int h = psis.first; h <= psis.last; ++h) {
+        out = copyRow(j, thetas, out);
+        if (_npsis == 1) continue;
+        j += step;
+        if (j >= 0 && j < _npsis) continue;
+        if (full) {
+            j = 0;
+        } else {
+            step = -step;
+            j += 2 * step;
+        }
+    }
+}
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,101 @@
+#pragma once
+
+#include "components/photo/lid/lidBuilder.h"
+#include "components/photo/lid/numberText.h"
+#include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/webDistribution.h"
+#include "components/photo/lid/webEvaluation.h"
+#include "host/componentManager/castImpl.h"
+#include "host/componentManager/stream.h"
+
+// A file format as a component, written once: web class, persistence adapter and builder. A format gives its facts
+// and functions in a struct:
+//
+//     struct IesFormat {
+//         using Web = PhotoWebIES;               // final, derived from PhotoWebOf<PhotoWebIES, IesFormat>
+//         using Record = IesFileRecord;          // the file as plain values; owns its parts
+//         static constexpr BuilderFacts facts;   // class id and texts
+//         static constexpr const wchar_t* extension;
+//         static constexpr const char* source;   // what stream exceptions carry: source path, lines, stream name
+//         static constexpr int saveLine, loadLine;
+//         static constexpr const char* streamName;
+//         static bool canImport(RnBufferedIO&);  // content test; keeps the position
+//         static bool read(Record&, RnStream&, const wchar_t* basePath);
+//         static bool toWeb(const Record&, Web&, bool loaded, const wchar_t* name, const wchar_t* basePath);
+//         static bool fromDistribution(RnIntensityDist&, Record&);
+//         static bool write(const Record&, RnStream&);
+//     };
+//
+// The functions report what is wrong and answer false; the adapter turns that into the stream exception.
+
+namespace OvPhotometrics {
+
+template <class Format>
+class PhotoWebPersistant;
+
+/// Base of a format's web class `Self`.
+template <class Self, class Format>
+class PhotoWebOf
+    : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData, Ov::RnPhotoWebData> {
+public:
+    static constexpr BuilderFacts facts = Format::facts;
+    static constexpr Ov::RnUid classId = Format::facts.classId;
+
+    RnRef<Ov::RnPhotoWebData> clone() const override { return Ov::rnCreate<Self>(self()); }
+    /// The shared evaluation, with this class's own queries resolved at compile time.
+    float getIntensity(float theta, float psi) const override { return evaluateWeb(self(), theta, psi); }
+
+private:
+    const Self& self() const { return static_cast<const Self&>(*this); }
+};
+
+/// Saves a web as its format's text, and loads it from there, on any kind of stream.
+template <class Format>
+class PhotoWebPersistant final : public Ov::RnTempObject<typename Format::Web> {
+public:
+    using Ov::RnTempObject<typename Format::Web>::RnTempObject;
+
+    void save(Ov::RnStream& out) override {
+        const auto distribution = makeWebDistribution(this->data());
+        typename Format::Record record;
+        if (!Format::fromDistribution(*distribution, record) || !Format::write(record, out))
+            throw Ov::RnStreamEx::ExWriteError(Format::source, Format::saveLine, Format::streamName);
+    }
+
+    bool load(Ov::RnStream& in, int, const wchar_t* name, const wchar_t* basePath) override {
+        typename Format::Record record;
+        if (!Format::read(record, in, basePath) || !Format::toWeb(record, this->data(), true, name, basePath))
+            throw Ov::RnStreamEx::ExReadError(Format::source, Format::loadLine, Format::streamName);
+        return true;
+    }
+};
+
+/// Builds webs of a format and imports them.
+template <class Format>
+class PhotoWebBuilder final
+    : public FactsBuilder<
+          typename Format::Web,
+          Ov::RnCastImpl2<LidBuilder, Ov::RnImportBuilder, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
+public:
+    using Ov::RnImportBuilder::canImport;
+    using Ov::RnImportBuilder::import;
+
+    RnEnum::Action enumerateExtensions(Ov::RnEnumerator<const wchar_t*>& visitor) override {
+        const auto action = visitor.visit(Format::extension);
+        return action != RnEnum::goOn ? action : visitor.finish();
+    }
+
+    bool canImport(Ov::RnBufferedIO* io) override { return Format::canImport(*Ov::rnCast<Ov::RnBufferedIO>(io)); }
+
+    RnRef<Ov::RnCastable> import(Ov::RnPtr<Ov::RnBufferedIO> io, const wchar_t* name,
+                                 const wchar_t* basePath) override {
+        Ov::RnPostLoadList postLoad;
+        Ov::RnStream stream(Ov::rnCast<Ov::RnBufferedIO>(io.get()).get(), Ov::RnStream::Form::text, &postLoad);
+        const auto web = Ov::rnCreate<typename Format::Web>();
+        Ov::rnCast<Ov::RnPersistant>(web.get())->load(stream, 0, name, basePath);
+        postLoad.finish();
+        return web;
+    }
+};
+
+}  // namespace OvPhotometrics

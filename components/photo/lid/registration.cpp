@@ -1,0 +1,18 @@
+#include "components/photo/lid/registration.h"
+
+#include "components/photo/distributions/isotropic.h"
+#include "components/photo/distributions/web.h"
+#include "components/photo/ies/photoWebIES.h"
+#include "components/photo/lid/component.h"
+
+namespace OvPhotometrics {
+
+void registerBuilders() {
+    BuilderTable& table = builderTable();
+    table.add(immortal<WebBuilder>());
+    table.add(immortal<IESBuilder>());
+    table.add(immortal<IsotropicBuilder>());
+    lidComponent();
+}
+
+}  // namespace OvPhotometrics
