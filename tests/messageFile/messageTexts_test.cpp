@@ -1,0 +1,128 @@
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <map>
+#include <regex>
+#include <set>
+#include <string>
+
+#include "components/messageFile/message.h"
+#include "components/messageFile/messageIds.h"
+#include "host/platform/path.h"
+#include "host/sdk/util.h"
+
+// The texts of every language against the numbers and arguments of messageIds.h.
+
+namespace {
+
+namespace messages = OvPhotometrics::messages;
+using messages::Message;
+
+class MessageTexts : public testing::TestWithParam<const wchar_t*> {
+protected:
+    MessageTexts() {
+        WendSDK::Util::setLanguage(GetParam());
+        catalogue.setFileName(Ov::fromUtf8(OVPHOTO_BIN_DIR "/libOVphotoRes.dll").c_str());
+        catalogue.getText(0);  // opens it
+        WendSDK::Util::setLanguage(L"");
+    }
+
+    std::set<std::wstring> textsBetween(unsigned first, unsigned last) {
+        std::set<std::wstring> texts;
+        for (unsigned id = first; id <= last; ++id) texts.insert(catalogue.getText(id));
+        return texts;
+    }
+
+    Ov::RnMessageFile catalogue;
+};
+
+INSTANTIATE_TEST_SUITE_P(Languages, MessageTexts, testing::Values(L"", L"de"),
+                         [](const auto& language) { return *language.param ? "german" : "english"; });
+
+/// The argument letters that a text's markers ask for, in the order of their numbers: "dss".
+std::string argumentsOf(const std::wstring& text) {
+    static const std::wregex marker(L"%%|%([0-9]+)(!([^!]*)!)?");
+    std::map<int, char> letters;
+    for (std::wsregex_iterator it(text.begin(), text.end(), marker), end; it != end; ++it) {
+        if (!(*it)[1].matched) continue;
+        const std::wstring conversion = (*it)[2].matched ? (*it)[3].str() : L"s";
+        const wchar_t letter = conversion.empty() ? L'?' : conversion.back();
+        letters[std::stoi((*it)[1])] = letter == L'g' ? 'f' : static_cast<char>(letter);
+    }
+    std::string result;
+    for (const auto& [number, letter] : letters) result += letter;
+    return result;
+}
+
+/// Formats a message with one argument for each letter of `types`; each is added to `shown` as it should appear.
+template <class... Arguments>
+std::wstring formatAs(const Message& message, const char* types, Ov::RnMessageFile& catalogue,
+                      std::set<std::wstring>& shown, Arguments... arguments) {
+    if constexpr (sizeof...(Arguments) < 3) {
+        const int number = static_cast<int>(1234 + sizeof...(Arguments));
+        const auto next = [&](auto argument, std::wstring text) {
+            shown.insert(std::move(text));
+            return formatAs(message, types + 1, catalogue, shown, arguments..., argument);
+        };
+        if (*types == 'd') return next(number, std::to_wstring(number));
+        if (*types == 'f') return next(number + 0.5, std::to_wstring(number) + L".5");
+        if (*types == 'c') return next(L'\u03b8', L"\u03b8");
+        if (*types == 's') return next(L"<text %1>", L"<text %1>");
+    }
+    EXPECT_EQ(*types, '\0') << message.id;
+    return catalogue.format(message.id, arguments...);
+}
+
+TEST_P(MessageTexts, EveryNumberHasATextThatShowsItsArguments) {
+    for (const Message& message : messages::all) {
+        SCOPED_TRACE(message.id);
+        const std::wstring text = catalogue.getText(message.id);
+        ASSERT_FALSE(text.empty());
+        ASSERT_EQ(argumentsOf(text), message.arguments);
+        std::set<std::wstring> shown;
+        const std::wstring formatted = formatAs(message, message.arguments, catalogue, shown);
+        EXPECT_FALSE(formatted.starts_with(L"MALFORMED"));
+        for (const std::wstring& argument : shown) EXPECT_NE(formatted.find(argument), formatted.npos);
+    }
+}
+
+TEST_P(MessageTexts, EveryTextHasANumber) {
+    std::set<unsigned> numbers;
+    for (const Message& message : messages::all) EXPECT_TRUE(numbers.insert(message.id).second) << message.id;
+    for (unsigned id = 1; id <= 0xFFFF; ++id)
+        EXPECT_EQ(catalogue.getText(id).empty(), !numbers.contains(id)) << id;
+}
+
+TEST_P(MessageTexts, WhatStandsInOtherTextsFits) {
+    // Natural light puts its details in as they are, without resolving escapes.
+    for (unsigned id = messages::lightHeader; id <= messages::lightSkyShadowsAccuracy; ++id)
+        EXPECT_EQ(catalogue.getText(id).find(L'%'), std::wstring::npos) << id;
+    for (unsigned id = messages::tbtTokenNumber; id <= messages::tbtTokenOther; ++id)
+        EXPECT_LE(catalogue.format(id, L"1234567.125").size(), 63u) << id;
+}
+
+TEST_P(MessageTexts, NamesTellMonthsAndZonesApart) {
+    EXPECT_EQ(textsBetween(messages::monthJanuary, messages::monthDecemberShort).size(), 23u);
+    EXPECT_EQ(textsBetween(messages::zoneSolomonIslands, messages::zoneBrasilia).size(), 31u);
+    EXPECT_EQ(catalogue.getText(messages::monthMay), catalogue.getText(messages::monthMayShort));
+    EXPECT_EQ(catalogue.getText(messages::monthMarch), *GetParam() ? L"M\u00e4rz" : L"March");
+}
+
+TEST(MessageNumbers, StandByNameInTheSources) {
+    const std::regex number("\\b(12[89]|130)[0-9]{2}\\b"), comment("//.*");
+    int files = 0;
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(OVPHOTO_SOURCE_DIR "/components")) {
+        const std::string extension = entry.path().extension();
+        if (entry.path().filename() == "messageIds.h" || (extension != ".h" && extension != ".cpp")) continue;
+        ++files;
+        std::ifstream in(entry.path());
+        for (std::string line; std::getline(in, line);) {
+            const std::string code = std::regex_replace(line, comment, "");
+            EXPECT_FALSE(std::regex_search(code, number)) << entry.path() << ": " << line;
+        }
+    }
+    EXPECT_GT(files, 5);
+}
+
+}  // namespace
