@@ -15,7 +15,7 @@ namespace {
 
 using std::string_literals::operator""s;
 
-/// The wide text of code points, in the width that wchar_t has.
+/// The wide text of these characters, surrogates and others.
 std::wstring wide(std::initializer_list<char32_t> characters) {
     std::wstring text;
     for (const char32_t c : characters) text += static_cast<wchar_t>(c);

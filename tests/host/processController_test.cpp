@@ -105,10 +105,7 @@ TEST_F(FindFile, NothingIsFoundWithoutAPlaceOrName) {
 
 TEST_F(FindFile, NamesAreTakenAsMakersWriteThem) {
     for (const char* file : {"base/my lamp.tlt", "base/sub/lamp.tlt", "base/sub\\odd.tlt", "base/sub/odd.tlt",
-                             "base/\xC3\xA9.tlt", "base/\xE9.tlt",
-                             "base/s\xC3\xBC"
-                             "b/l.tlt",
-                             "base/\xE8.tlt"}) {
+                             "base/\xC3\xA9.tlt", "base/\xE9.tlt", "base/\xE8.tlt", "base/\xC3\xBC/l.tlt"}) {
         folder.write(file, "x");
     }
     const struct {
@@ -117,14 +114,11 @@ TEST_F(FindFile, NamesAreTakenAsMakersWriteThem) {
     } cases[] = {
         {L" \tmy lamp.tlt \t", "base/my lamp.tlt"},
         {L"sub\\lamp.tlt", "base/sub/lamp.tlt"},
-        {L"sub\\odd.tlt", "base/sub\\odd.tlt"},  // as it stands comes first
-        {L"\xE9.tlt", "base/\xC3\xA9.tlt"},      // the character
-        {L"\xC3\xA9.tlt", "base/\xC3\xA9.tlt"},  // its two bytes
-        {L"\xE8.tlt", "base/\xE8.tlt"},          // a byte that is no UTF-8
-        {L"s\xC3\xBC"
-         L"b\\l.tlt",
-         "base/s\xC3\xBC"
-         "b/l.tlt"},  // bytes and the other slash
+        {L"sub\\odd.tlt", "base/sub\\odd.tlt"},       // as it stands comes first
+        {L"\xE9.tlt", "base/\xC3\xA9.tlt"},           // the character
+        {L"\xC3\xA9.tlt", "base/\xC3\xA9.tlt"},       // its two bytes
+        {L"\xE8.tlt", "base/\xE8.tlt"},               // a byte that is no UTF-8
+        {L"\xC3\xBC\\l.tlt", "base/\xC3\xBC/l.tlt"},  // bytes and the other slash
         {L"sub", "base/sub"},
         {L"\x20AC\xC3\xA9.tlt", "-"},
     };
