@@ -1,3 +1,4 @@
+#include <bit>
 #include <charconv>
 #include <cmath>
 #include <limits>
@@ -48,8 +49,54 @@ bool convertInteger(std::string_view token, int base, T& value) {
     return std::from_chars(token.data(), token.data() + token.size(), value, base).ec == std::errc{};
 }
 
-/// Reads a number where the window holds white space, the number and what follows it. False, with nothing
-/// consumed, in every other case and for everything that is not plain.
+/// Converts a plain decimal of up to 15 digits; the position behind it, or null for anything else. The digits and
+/// the power of ten below them are exact doubles, so their quotient is the right double. Rounding that to float is
+/// right, too, unless it lies midway between two floats.
+const char* convertShort(const char* text, const char* limit, float& value) {
+    static constexpr double powers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                        1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    constexpr std::uint64_t belowFloat = (1U << 29) - 1;
+    constexpr std::uint64_t midway = 1U << 28;
+    const bool isNegative = *text == '-';
+    if (isNegative) ++text;
+    std::uint64_t digits = 0;
+    const auto takeDigits = [&] {
+        const char* start = text;
+        for (; text != limit && isDigit(*text); ++text)
+            digits = 10 * digits + static_cast<std::uint64_t>(*text - '0');
+        return text - start;
+    };
+    std::ptrdiff_t count = takeDigits();
+    std::ptrdiff_t decimals = 0;
+    if (text != limit && *text == '.') {
+        ++text;
+        decimals = takeDigits();
+        count += decimals;
+    }
+    if (count == 0 || count > 15 || text == limit || *text == 'e' || *text == 'E') return nullptr;
+    const double quotient = static_cast<double>(digits) / powers[decimals];
+    if ((std::bit_cast<std::uint64_t>(quotient) & belowFloat) == midway) return nullptr;
+    value = static_cast<float>(isNegative ? -quotient : quotient);
+    return text;
+}
+
+/// Converts the number that starts at `text`; the position behind it, or null when it is not plain or not known to
+/// end before `limit`.
+const char* convertPlain(const char* text, const char* limit, float& value) {
+    if (const char* stop = convertShort(text, limit, value)) return stop;
+    const auto [stop, error] = std::from_chars(text, limit, value);
+    // An exponent without digits belongs to the number all the same.
+    const bool isPlain = error == std::errc{} && stop != limit && *stop != 'e' && *stop != 'E';
+    return isPlain && std::isfinite(value) ? stop : nullptr;
+}
+
+const char* convertPlain(const char* text, const char* limit, std::int32_t& value) {
+    const auto [stop, error] = std::from_chars(text, limit, value);
+    return error == std::errc{} && stop != limit ? stop : nullptr;
+}
+
+/// Reads a number where the window holds white space, the number and what follows it. False, with nothing consumed
+/// or changed, in every other case.
 template <class T>
 bool readInWindow(RnBufferedIO& device, T& value) {
     const char* start = device.next();
@@ -58,12 +105,8 @@ bool readInWindow(RnBufferedIO& device, T& value) {
     const char* digits = start != limit && *start == '-' ? start + 1 : start;
     if (digits == limit || !(isDigit(*digits) || *digits == '.')) return false;
     T result;
-    const auto [stop, error] = std::from_chars(start, limit, result);
-    if (error != std::errc{} || stop == limit) return false;
-    if constexpr (std::is_floating_point_v<T>) {
-        // An exponent without digits belongs to the number all the same.
-        if (*stop == 'e' || *stop == 'E' || !std::isfinite(result)) return false;
-    }
+    const char* stop = convertPlain(start, limit, result);
+    if (!stop) return false;
     value = result;
     device.advanceTo(stop);
     return true;
