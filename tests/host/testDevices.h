@@ -1,0 +1,34 @@
+#pragma once
+
+#include <string>
+
+#include "host/componentManager/devices.h"
+#include "host/componentManager/stream.h"
+
+namespace Ov {
+
+/// Memory that shows its bytes one at a time, so that no token lies wholly in its window.
+class DripDevice : public RnMemoryBuffer {
+public:
+    explicit DripDevice(std::string bytes) : _input(std::move(bytes)) {}
+
+protected:
+    bool readMore() override {
+        if (_shown == _input.size()) return false;
+        append(&_input[_shown++], 1);
+        return true;
+    }
+
+private:
+    std::string _input;
+    std::size_t _shown = 0;
+};
+
+inline std::string readRest(RnBufferedIO& device) {
+    std::string rest;
+    char c;
+    while (device.readBytes(&c, 1) == 1) rest += c;
+    return rest;
+}
+
+}  // namespace Ov
