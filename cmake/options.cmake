@@ -30,4 +30,5 @@ if(OVPHOTO_SANITIZE)
   target_compile_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE} -fno-sanitize-recover=all
                                                  -fno-omit-frame-pointer)
   target_link_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE})
+  target_compile_definitions(ovphoto_flags INTERFACE _GLIBCXX_ASSERTIONS)  # indices of the standard containers
 endif()
