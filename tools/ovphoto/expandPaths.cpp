@@ -19,7 +19,7 @@ void addFolder(const fs::path& folder, std::vector<FoundFile>& files) {
     for (fs::directory_iterator entry(folder, error), end; !error && entry != end; entry.increment(error)) {
         entries.push_back(*entry);
     }
-    if (error) files.push_back({toText(folder), false});
+    if (error) files.push_back({toText(folder), false, "cannot be listed: " + error.message()});
     std::sort(entries.begin(), entries.end());
     for (const fs::directory_entry& entry : entries) {
         std::error_code ignored;
@@ -27,7 +27,7 @@ void addFolder(const fs::path& folder, std::vector<FoundFile>& files) {
         if (entry.is_directory(ignored) && !entry.is_symlink(ignored)) {
             addFolder(entry.path(), files);
         } else if (!entry.is_directory(ignored)) {
-            files.push_back({toText(entry.path()), true});
+            files.push_back({toText(entry.path()), true, {}});
         }
     }
 }
@@ -42,7 +42,7 @@ std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths) {
         if (fs::is_directory(native, error)) {
             addFolder(native, files);
         } else {
-            files.push_back({path, false});
+            files.push_back({path, false, {}});
         }
     }
     return files;

@@ -5,14 +5,15 @@
 
 namespace OvTool {
 
-/// A file to be read, and whether it was found in a folder instead of being named by the user.
+/// A file to be read.
 struct FoundFile {
     std::string path;
-    bool fromFolder = false;
+    bool fromFolder = false;  // found there instead of being named by the user
+    std::string error;        // why a folder cannot be listed; empty for files
 };
 
 /// The files that the paths name: what is no folder as it is, and everything below the folders, by name. A folder
-/// that cannot be listed stands in the result itself, so that reading it fails.
+/// that cannot be listed stands in the result itself.
 std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths);
 
 /// Whether the file's extension is that of a photometric format: ies, cib, nmb or tbt.

@@ -25,13 +25,13 @@ int parseAndRun(CLI::App& app, int argc, char** argv) {
     std::string module;
     app.add_option("--module", module, "Load this module instead of the one beside the tool")->type_name("PATH");
     app.set_version_flag("--version", "ovphoto " OVPHOTO_VERSION, "Print the version and exit");
-    app.require_subcommand(1);
+    app.require_subcommand(0, 1);
     app.fallthrough();
     app.allow_windows_style_options(false);
 
     std::vector<std::pair<const CLI::App*, Action>> actions;
     for (const Command& command : commands()) {
-        CLI::App* sub = app.add_subcommand(command.name, command.summary);
+        CLI::App* sub = app.add_subcommand(command.name, command.summary)->group("Commands");
         actions.emplace_back(sub, command.declare(*sub));
     }
     try {
@@ -42,6 +42,7 @@ int parseAndRun(CLI::App& app, int argc, char** argv) {
     for (const auto& [sub, action] : actions) {
         if (sub->parsed()) return runCommand(action, module);
     }
+    std::cerr << "A command is required\nRun with --help for more information.\n";
     return exitUsage;
 }
 
@@ -50,7 +51,9 @@ int parseAndRun(CLI::App& app, int argc, char** argv) {
 int main(int argc, char** argv) {
     prepareStandardStreams();
     std::ios::sync_with_stdio(false);
-    CLI::App app{"Reads, checks and converts photometric files of luminaires."};
+    CLI::App app{"Reads, checks and converts photometric files of luminaires.", "ovphoto"};
+    app.get_formatter()->label("SUBCOMMAND", "COMMAND");
+    app.get_formatter()->label("TEXT", "");
     app.footer(
         "Exit status: 0 all well, 1 a file was refused or could not be read or written, 2 wrong usage.\n"
         "Angles are in degrees: theta from the axis, psi around it.");

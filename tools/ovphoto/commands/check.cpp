@@ -87,7 +87,8 @@ void printSummary(const Totals& totals) {
 
 void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, Totals& totals,
                const Progress& progress) {
-    const ReadResult result = session.read(file.path, options.as);
+    const ReadResult result =
+        file.error.empty() ? session.read(file.path, options.as) : ReadResult{file.path, {}, {}, {}, file.error};
     const bool foreign = file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
     if (foreign) {
         ++totals.skipped;

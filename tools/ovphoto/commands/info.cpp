@@ -117,8 +117,8 @@ std::string orientationText(const RnPhotoWebData& web) {
     const GeLinearMatrix3<float> matrix = web.getOrientation();
     if (web.hasIdentityOrientation()) return "not turned: host and file share their frame";
     if (std::abs(matrix[8]) < 0.5F) return "turned: the poles lie in the host's horizontal plane";
-    const double turn = std::atan2(matrix[1], matrix[0]) * 180 / std::numbers::pi;
-    return "turned about the axis: the host's psi 0 is psi " + degreesText(std::round(turn * 100) / 100) + " here";
+    const double turn = std::round(std::atan2(matrix[1], matrix[0]) * 18000 / std::numbers::pi) / 100;
+    return "turned about the axis: the host's psi 0 is psi " + degreesText(turn < 0 ? turn + 360 : turn) + " here";
 }
 
 void printBeamAngles(const RnPhotoWebData& web, const RnWebIntensityDist& light) {

@@ -115,7 +115,7 @@ int runIntensity(const IntensityOptions& options, const HostSession& session) {
 Action declareIntensity(CLI::App& app) {
     auto options = std::make_shared<IntensityOptions>();
     app.add_option("FILE", options->file, "Photometric file")->required();
-    app.add_option("T,P", options->directions,
+    app.add_option("DIRECTION", options->directions,
                    "Directions theta,psi in degrees; without any, lines \"theta psi\" from standard input")
         ->check(CLI::Validator(checkDirection, "", "direction"));
     app.add_option("--frame", options->frame,

@@ -1,0 +1,83 @@
+#pragma once
+
+#include <sys/wait.h>
+
+#include <cstdlib>
+#include <fstream>
+#include <functional>
+#include <iterator>
+#include <nlohmann/json.hpp>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include "support/tempFolder.h"
+
+// The built tool as a process, and small IES files for it.
+
+inline std::string readBytes(const std::filesystem::path& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+struct ToolResult {
+    int status = -1;
+    std::string out;
+    std::string err;
+
+    std::vector<nlohmann::ordered_json> json() const {
+        std::vector<nlohmann::ordered_json> objects;
+        std::istringstream lines(out);
+        for (std::string line; std::getline(lines, line);) objects.push_back(nlohmann::ordered_json::parse(line));
+        return objects;
+    }
+    bool says(const std::string& text) const { return (out + err).find(text) != std::string::npos; }
+};
+
+/// Runs a shell command in which `ovphoto` is the built tool, in the folder `folder`.
+inline ToolResult runShell(const std::string& command, const TempFolder& folder, const std::string& input = "") {
+    const TempFolder streams;
+    streams.write("in", input);
+    const std::string stem = streams.path().string();
+    const std::string line = "cd '" + folder.path().string() +
+                             "' && export LC_ALL=C && ovphoto() { '" OVPHOTO_BIN_DIR "/ovphoto' \"$@\"; } && { " +
+                             command + "\n} <" + stem + "/in >" + stem + "/out 2>" + stem + "/err";
+    const int status = std::system(line.c_str());
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, readBytes(stem + "/out"), readBytes(stem + "/err")};
+}
+
+inline ToolResult runTool(const std::string& arguments, const TempFolder& folder, const std::string& input = "") {
+    return runShell("ovphoto " + arguments, folder, input);
+}
+
+/// An IES file; what a test does not set is as plain as can be.
+struct IesFile {
+    std::string tilt = "NONE";
+    std::string lamps = "1 -1";
+    std::string multiplier = "1";
+    int type = 1;
+    std::string factors = "1 1 0";
+    std::vector<double> verticals{0, 45, 90};
+    std::vector<double> horizontals{0};
+    std::function<double(double, double)> candela = [](double, double) { return 100; };
+
+    std::string text() const {
+        std::ostringstream out;
+        out << "IESNA91\n[TEST] one\nTILT=" << tilt << "\n"
+            << lamps << " " << multiplier << " " << verticals.size();
+        out << " " << horizontals.size() << " " << type << " 2 0 0 0\n" << factors << "\n";
+        for (double v : verticals) out << v << "\n";
+        for (double h : horizontals) out << h << "\n";
+        for (double h : horizontals) {
+            for (double v : verticals) out << candela(v, h) << "\n";
+        }
+        return out.str();
+    }
+};
+
+/// Angles from `first` to `last`, `step` apart.
+inline std::vector<double> angles(double first, double last, double step) {
+    std::vector<double> result;
+    for (double a = first; a < last + step / 2; a += step) result.push_back(a);
+    return result;
+}
