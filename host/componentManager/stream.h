@@ -42,10 +42,11 @@ public:
 
     // Four groups over fifteen types, in this order of types. `count` items stand behind `value`; read returns
     // the number read, which is `count`.
-#define OV_STREAM_TYPES(X)                                                                                  \
-    X(unsigned long long)                                                                                   \
-    X(long long) X(std::wstring) X(double) X(float) X(bool) X(unsigned long) X(long) X(unsigned int) X(int) \
-        X(unsigned short) X(short) X(unsigned char) X(wchar_t) X(char)
+// clang-format off
+#define OV_STREAM_TYPES(X) \
+    X(unsigned long long) X(long long) X(std::wstring) X(double) X(float) X(bool) X(unsigned long) X(long) \
+    X(unsigned int) X(int) X(unsigned short) X(short) X(unsigned char) X(wchar_t) X(char)
+// clang-format on
 #define OV_STREAM_WRITE(T) virtual void write(const T& value, int count);
 #define OV_STREAM_INSERT(T) virtual RnStream& operator<<(T value);
 #define OV_STREAM_READ(T) virtual int read(T& value, int count);
@@ -60,8 +61,8 @@ public:
 #undef OV_STREAM_EXTRACT
 
     /// Formatted text as wide printf and scanf know it, with these fixed meanings on every platform: %s and %[
-    /// are wide strings, %hd and %hx 16 bits, %d, %u and %x 32 bits, %n int; reading, %g, %f and %e are float and
-    /// %lg, %lf and %le double. Independent of the process's locale, and exact. Only decimal numbers convert: no
+    /// are wide strings, %hd and %hx 16 bits, %d, %ld, %u and %x 32 bits, %n int; reading, %g, %f and %e are float
+    /// and %lg, %lf and %le double. Independent of the process's locale, and exact. Only decimal numbers convert: no
     /// "nan", "inf" or hexadecimal floats, and no number that its type cannot hold (one too small is 0).
     /// Writing returns the number of characters, reading the number of conversions, or -1 when the input ends
     /// before the first. Neither touches `column`; writing leaves `pendingSeparator` alone, reading consumes a

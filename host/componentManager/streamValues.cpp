@@ -99,8 +99,9 @@ void writeTextItem(RnStream& stream, const std::wstring& text) {
     stream.pendingSeparator = true;
 }
 
-/// The first character of the next item.
+/// The first character of the next item. A separator that is due is part of the white space before it.
 int startItem(RnStream& stream) {
+    stream.pendingSeparator = false;
     int c = stream.getChar();
     while (isWhiteSpace(c)) c = stream.getChar();
     if (c < 0) failRead(__LINE__);
