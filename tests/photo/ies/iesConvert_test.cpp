@@ -1,0 +1,130 @@
+#include <cmath>
+
+#include "tests/photo/photoFixture.h"
+
+// From a file's angles to a web: symmetry, offsets, orientation and where the light lies.
+
+namespace OvPhotometrics {
+namespace {
+
+class IesConvert : public Photo {};
+
+TEST_F(IesConvert, AnglesChooseTheLayout) {
+    using enum PhotoWebSymmetry;
+    const struct {
+        const char* name;
+        IesText file;
+        PhotoWebSymmetry symmetry;
+        int psis;
+        double lastPsi, firstTheta;  // degrees
+        bool truncated, turned;
+    } cases[] = {
+        {"one plane", {.horizontal = {0}}, Axial, 1, 0, 0, false, false},
+        {"planes 0 and 360", {.horizontal = {0, 360}}, Axial, 1, 0, 0, false, false},
+        {"quarter", {.horizontal = {0, 45, 90}}, Quarter, 3, 90, 0, false, false},
+        {"half", {.horizontal = {0, 90, 180}}, Half, 3, 180, 0, false, false},
+        {"closed circle", {.horizontal = {0, 90, 180, 270, 360}}, Full, 4, 270, 0, false, false},
+        {"open circle", {.horizontal = {0, 90, 180, 270}}, Full, 4, 270, 0, false, false},
+        {"planes 90 to 270", {.horizontal = {90, 180, 270}}, Half, 3, 180, 0, false, true},
+        {"within the tolerance",
+         {.vertical = {90.2, 179.8}, .horizontal = {0.2, 89.8}},
+         Quarter,
+         2,
+         89.8,
+         90.2,
+         false,
+         false},
+        {"type B, one side",
+         {.type = 2, .vertical = {-90, 0, 90}, .horizontal = {0, 45, 90}},
+         Half,
+         3,
+         90,
+         0,
+         true,
+         false},
+        {"type B, both sides",
+         {.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}},
+         Full,
+         3,
+         180,
+         0,
+         true,
+         true},
+        {"type A, 0 to 180",
+         {.type = 3, .vertical = {0, 90, 180}, .horizontal = {-60, 0, 60}},
+         Full,
+         3,
+         120,
+         0,
+         true,
+         true},
+        {"type A, part", {.type = 3, .vertical = {-40, 50}, .horizontal = {-30, 10}}, Full, 2, 40, 50, true, true},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        const auto web = import(c.file.text());
+        ASSERT_TRUE(web) << log.take();
+        EXPECT_EQ(web->getSymmetry(), c.symmetry);
+        EXPECT_EQ(web->getPsiCount(), c.psis);
+        EXPECT_FLOAT_EQ(web->getPsiRange().last, toRadians(c.lastPsi));
+        EXPECT_FLOAT_EQ(web->getThetaRange().first, toRadians(c.firstTheta));
+        EXPECT_EQ(web->isPsiTruncated(), c.truncated);
+        EXPECT_EQ(web->hasIdentityOrientation(), !c.turned);
+    }
+}
+
+TEST_F(IesConvert, HalfPlanes90To270LightWhatTheFullCircleLights) {
+    // The luminaire is mirrored at the plane through 90 and 270: plane 180 + a is as plane 180 - a.
+    const auto half =
+        import(IesText{.horizontal = {90, 135, 180, 225, 270}, .values = "1 1 1 1 2 1 1 7 1 1 3 1 1 4 1"}.text());
+    const auto full = import(IesText{.horizontal = {0, 45, 90, 135, 180, 225, 270, 315, 360},
+                                     .values = "1 7 1 1 2 1 1 1 1 1 2 1 1 7 1 1 3 1 1 4 1 1 3 1 1 7 1"}
+                                 .text());
+    ASSERT_TRUE(half && full) << log.take();
+    const auto a = distributionOf(*half);
+    const auto b = distributionOf(*full);
+    a->setPeakIntensity(half->getMaxCandela());
+    b->setPeakIntensity(full->getMaxCandela());
+    for (const double psi : {90.0, 100.0, 135.0, 170.0, 200.0, 225.0, 250.0, 270.0})
+        EXPECT_NEAR(a->intensityAtUnit(direction(80, psi)), b->intensityAtUnit(direction(80, psi)), 1e-4) << psi;
+    EXPECT_NEAR(a->intensityAtUnit(direction(90, 180)), 7, 1e-4);
+}
+
+TEST_F(IesConvert, ATypeAFileIsLitWhereItsAnglesSay) {
+    const auto web = import(
+        IesText{.type = 3, .vertical = {-90, 0, 90}, .horizontal = {-60, 0, 60}, .values = "0 2 0 0 5 0 0 3 0"}
+            .text());
+    ASSERT_TRUE(web) << log.take();
+    const auto light = distributionOf(*web);
+    light->setPeakIntensity(web->getMaxCandela());
+    EXPECT_NEAR(light->intensityAtUnit(direction(90, 0)), 5, 1e-4);
+    EXPECT_NEAR(light->intensityAtUnit(direction(90, -59.99)), 2, 1e-2);
+    EXPECT_NEAR(light->intensityAtUnit(direction(90, 59.99)), 3, 1e-2);
+    for (const double psi : {-61.0, 61.0, 180.0}) EXPECT_EQ(light->intensityAtUnit(direction(90, psi)), 0) << psi;
+}
+
+TEST_F(IesConvert, ATypeBFileWithAnOffsetHasItsAxisAtMinusY) {
+    const auto web = import(
+        IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-80, 0, 80}, .values = "0 1 0 0 9 0 0 1 0"}
+            .text());
+    ASSERT_TRUE(web) << log.take();
+    const auto light = distributionOf(*web);
+    light->setPeakIntensity(web->getMaxCandela());
+    EXPECT_NEAR(light->intensityAtUnit({0, -1, 0}), 9, 1e-4);
+}
+
+TEST_F(IesConvert, FactorsMultiplyAndZeroIsDark) {
+    const std::string tail = " 0 90 0 10 20";
+    const auto factors = import("TILT=NONE\n2 500 3 2 1 1 2 0 0 0 0.5 2 60" + tail);
+    ASSERT_TRUE(factors);
+    EXPECT_EQ(factors->getMaxCandela(), 60);
+    EXPECT_EQ(factors->getLumens(), 1000);
+    const auto dark = import("TILT=NONE\n2 500 3 2 1 1 2 0 0 0 1 0 60" + tail);
+    ASSERT_TRUE(dark);
+    EXPECT_EQ(dark->getMaxCandela(), 0);
+    EXPECT_EQ(dark->getLumens(), 0);
+    EXPECT_EQ(dark->getIntensity(0.5f, 0), 0);
+}
+
+}  // namespace
+}  // namespace OvPhotometrics

@@ -1,0 +1,181 @@
+#include "tests/photo/photoFixture.h"
+
+// What the reader accepts and refuses, and with which messages.
+
+namespace OvPhotometrics {
+namespace {
+
+class IesRead : public Photo {};
+
+struct Case {
+    const char* name;
+    std::string text;
+    std::string messages;  // empty: accepted
+};
+
+std::string numbers(const std::string& text) { return "TILT=NONE\n" + text; }
+std::string tilted(const std::string& block) { return IesText{.tilt = "INCLUDE\n" + block + "\n"}.text(); }
+std::string graded(const std::string& values) { return IesText{.values = values}.text(); }
+
+TEST_F(IesRead, EachFaultHasItsMessage) {
+    const Case cases[] = {
+        {"empty file", "", "12945 12956"},
+        {"no TILT line", "IESNA91\n[TEST] tilt\n", "12945 12956"},
+        {"nothing behind TILT", numbers(""), "12945 12946; 12945 12959 -1"},
+        {"no lamp", numbers("0 1 1 2 1 1 2 0 0 0"), "12945 12959 0"},
+        {"leading plus", numbers("+1"), "12945 12947 +; 12945 12959 0"},
+        {"cut off behind the lamps", numbers("1 "), "12945 12946; 12945 12960 -1"},
+        {"one vertical angle", numbers("1 1 1 1 1 1 2"), "12945 12960 1"},
+        {"fraction as a count", numbers("1 1 1 73.5 1"), "12945 12946; 12945 12960 -1"},
+        {"no horizontal angle", numbers("1 1 1 2 0 1 2"), "12945 12961 0"},
+        {"type 4", numbers("1 1 1 2 1 4 2"), "12945 12962 4"},
+        {"units 0", numbers("1 1 1 2 1 1 0"), "12945 12963 0"},
+        {"bad lumens are told with the dimensions", numbers("1 x 1 2 1 1 2 0 0 0"), "12945 12948 x; 12945 12964"},
+        {"missing dimension", numbers("1 1 1 2 1 1 2 0 0"), "12945 12946; 12945 12964"},
+        {"factors", numbers("1 1 1 2 1 1 2 0 0 0 1 1e99 60"), "12945 12946; 12945 12965"},
+        {"grid beyond all counts", numbers("1 1 1 65536 65536 1 2 0 0 0 1 1 60"), "12945 12936"},
+        {"huge counts, short file", numbers("1 1 1 40000 40000 1 2 0 0 0 1 1 60 0 1"), "12945 12946; 12945 12966"},
+        {"vertical angle", numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 x 90"), "12945 12948 x; 12945 12966"},
+        {"horizontal angle", numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 90 -"), "12945 12946; 12945 12967"},
+        {"two points", graded("1 12.5.3 3"), "12945 12946; 12945 12968"},
+        {"number with a tail", graded("1 7x 3"), "12945 12946; 12945 12948 x; 12945 12968"},
+        {"cut off in the candelas", graded("1 2"), "12945 12946; 12945 12968"},
+        {"angles fall", IesText{.vertical = {0, 90, 80, 180}}.text(), "12943"},
+        {"planes fall", IesText{.horizontal = {0, 90, 45}}.text(), "12944"},
+        {"type C vertical", IesText{.vertical = {0, 120}}.text(), "12940"},
+        {"type C last", IesText{.horizontal = {0, 120}}.text(), "12941 120"},
+        {"type C first", IesText{.horizontal = {45, 90}}.text(), "12942 45"},
+        {"type B vertical", IesText{.type = 2, .vertical = {-90, 90.5}, .horizontal = {0, 90}}.text(), "12937"},
+        {"type B one plane", IesText{.type = 2}.text(), "12938"},
+        {"type B last", IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {0, 90.5}}.text(), "12939"},
+        {"type B first", IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {10, 90}}.text(), "12939"},
+        {"type A vertical", IesText{.type = 3, .vertical = {-90.5, 90}, .horizontal = {0, 90}}.text(), "12932"},
+        {"type A one plane", IesText{.type = 3}.text(), "12933"},
+        {"type A first", IesText{.type = 3, .vertical = {-90, 90}, .horizontal = {-91, 90}}.text(), "12934"},
+        {"the web refuses", IesText{.horizontal = {0, 0.1, 360}}.text(), "12928; 12935"},
+        {"product overflows", numbers("1 1 1e30 2 1 1 2 0 0 0 1 1 60 0 90 0 1e30 1"), "12935"},
+        {"flux overflows", IesText{.lumens = -1, .values = "3e38 3e38 3e38"}.text(), "12935"},
+        {"tilt geometry", tilted("4 2 0 90 1 1"), "12945 12949 4"},
+        {"tilt pairs", tilted("1 1"), "12945 12950 1"},
+        {"tilt first angle", tilted("1 2 5 90 1 1"), "12945 12951 5"},
+        {"tilt order", tilted("1 3 0 45 45 1 1 1"), "12945 12952 45 45"},
+        {"tilt last angle", tilted("1 2 0 80 1 1"), "12945 12953 80"},
+        {"tilt angle fails", tilted("1 3 0 x 90 1 1 1"), "12945 12948 x; 12945 12954 3"},
+        {"tilt factors cut off", "TILT=INCLUDE\n1 2 0 90 1", "12945 12946; 12945 12955 2"},
+        {"no tilt file", IesText{.tilt = " lost.tlt\n"}.text(), "12957  lost.tlt"},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.name);
+        EXPECT_EQ(static_cast<bool>(import(c.text)), c.messages.empty());
+        EXPECT_EQ(log.take(), c.messages);
+    }
+}
+
+TEST_F(IesRead, AcceptsWhatMakersWrite) {
+    const std::string expected = saved(*import(IesText{}.text()));
+    const std::string plain = IesText{}.text();
+    std::string crlf, cr, commas = plain;
+    for (const char c : plain) {
+        crlf += c == '\n' ? "\r\n" : std::string(1, c);
+        cr += c == '\n' ? '\r' : c;
+    }
+    std::replace(commas.begin() + static_cast<std::ptrdiff_t>(commas.find("TILT=NONE") + 10), commas.end(), ' ',
+                 ',');
+    const Case cases[] = {
+        {"CR LF", crlf, ""},
+        {"lone CR", cr, ""},
+        {"commas", commas, ""},
+        {"Ctrl-Z behind the last number", plain.substr(0, plain.size() - 1) + '\x1a', ""},
+        {"NUL behind the last number", plain.substr(0, plain.size() - 1) + '\0', ""},
+        {"no IESNA91", IesText{.header = "1234\n\n[A] b\n"}.text(), ""},
+        {"header bytes above 127", IesText{.header = "IESNA91\n\xe4\xff\n"}.text(), ""},
+        {"long lines", IesText{.header = std::string(200, '=') + "\n"}.text(), ""},
+        {"tilt in lower case, blanks", IesText{.tilt = "none \t\n"}.text(), ""},
+        {"tilt data", tilted("1 2 0 89.95 1 1"), ""},
+        {"counts with a fraction of zeros", "TILT=NONE\n1.0 1e3 1 3.00 1. 1 2 0 0 0 1 1 60 0 90 180 0 1 2 3", ""},
+        {"tiny values are 0", graded("1 2 3 1e-50"), ""},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.name);
+        const auto web = import(c.text);
+        EXPECT_EQ(log.take(), "");
+        ASSERT_TRUE(web);
+        EXPECT_EQ(saved(*web), expected);
+    }
+}
+
+TEST_F(IesRead, HeaderLinesAreKeptInPieces) {
+    const std::string text =
+        "IESNA91\n\n" + std::string(200, 'x') + "\nTILT=NONE\n1 1 1 2 1 1 2 0 0 0 1 1 0 0 90 0 1 1";
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
+    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+    IesFileRecord rec;
+    ASSERT_TRUE(iesReadRecord(rec, stream, nullptr));
+    const std::vector<std::wstring> expected = {L"IESNA91", L"", std::wstring(80, L'x'), std::wstring(80, L'x'),
+                                                std::wstring(40, L'x')};
+    EXPECT_EQ(rec.lines, expected);
+}
+
+TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
+    TempFolder beside, listed;
+    beside.write("a.tlt", "1 2 0 90 1 1");
+    const std::wstring inList = listed.write("b.tlt", "1\n2\n0 90\n1 1\n");
+    beside.write("bad.tlt", "1 2 0 45 1 1");
+    beside.write("folder/x", "");
+    Ov::setPathList(L"WebPathList", {listed.wide()});
+    const auto tiltPath = [&](const char* name) -> std::wstring {
+        const auto web = import(IesText{.tilt = std::string(name) + "\n"}.text(), L"", beside.wide().c_str());
+        if (!web) return log.take().empty() ? L"silent" : L"refused";
+        std::wstring visited;
+        auto visitor = Ov::rnVisitor<const wchar_t*>([&](const wchar_t* path) { visited += path; });
+        web->enumerateFiles(visitor);
+        const auto clone = web->clone();
+        std::wstring again;
+        auto second = Ov::rnVisitor<const wchar_t*>([&](const wchar_t* path) { again += path; });
+        clone->enumerateFiles(second);
+        EXPECT_EQ(visited, again);
+        return visited;
+    };
+    EXPECT_EQ(tiltPath("a.tlt"), beside.wide("a.tlt"));
+    EXPECT_EQ(tiltPath("  b.tlt "), inList);
+    EXPECT_EQ(tiltPath("NONE"), L"");
+    EXPECT_EQ(tiltPath("NONEX"), L"refused");
+    EXPECT_EQ(tiltPath("bad.tlt"), L"refused");
+    EXPECT_EQ(tiltPath("folder"), L"refused");
+    Ov::setPathList(L"WebPathList", {});
+}
+
+TEST_F(IesRead, ContentTestKeepsThePosition) {
+    const struct {
+        const char* text;
+        bool accepted;
+    } cases[] = {{"IESNA91", true},          {"IESNA9", false},  {"", false},
+                 {"a\nb\nTILT=NONE", true},  {"a TILT=", false}, {"a\rTILT=NONE\r", false},
+                 {"iesna91\r\nTILT=", true}, {"\n\nTILT", false}};
+    for (const auto& c : cases) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(std::string("??") + c.text);
+        io->seek(2, 0);
+        EXPECT_EQ(immortal<IESBuilder>().canImport(static_cast<Ov::RnBufferedIO*>(io.get())), c.accepted)
+            << c.text;
+        EXPECT_EQ(io->seek(0, 1), 2);
+    }
+    EXPECT_THROW(immortal<IESBuilder>().canImport(static_cast<Ov::RnBufferedIO*>(nullptr)), Ov::ExBadCast);
+}
+
+TEST_F(IesRead, ARefusedFileLeavesTheWebAsItWas) {
+    const auto web = import(IesText{}.text(), L"first");
+    const std::string before = saved(*web);
+    const std::string refused[] = {IesText{.horizontal = {0, 120}}.text(), graded("1 2"), "",
+                                   IesText{.horizontal = {0, 0.1, 360}}.text()};
+    for (const std::string& text : refused) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        const auto adapter = Ov::rnCast<Ov::RnPersistant>(web.get());
+        EXPECT_THROW(adapter->load(stream, 0, L"second", nullptr), Ov::RnStreamEx::ExReadError);
+        EXPECT_EQ(saved(*web), before);
+        EXPECT_STREQ(web->getName(), L"first");
+    }
+}
+
+}  // namespace
+}  // namespace OvPhotometrics

@@ -1,0 +1,124 @@
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <set>
+#include <sstream>
+
+#include "components/photo/lid/moduleEntry.h"
+#include "host/componentManager/componentManager.h"
+#include "host/componentManager/persistant.h"
+#include "host/componentManager/processController.h"
+#include "host/componentManager/streamEx.h"
+#include "host/platform/module.h"
+#include "host/sdk/util.h"
+#include "ovphoto/classIds.h"
+#include "ovphoto/intensityDist.h"
+#include "ovphoto/numberedExports.h"
+#include "tests/support/tempFolder.h"
+
+// The built module, reached as a host reaches it.
+
+namespace {
+
+const char* const modulePath = OVPHOTO_BIN_DIR "/libOVphoto.so";
+
+class ModuleTest : public testing::Test {
+protected:
+    ModuleTest() : manager(Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager())) {
+        setenv("LC_ALL", "C", 1);
+        module = &manager->loadModule(path.c_str());
+    }
+    ~ModuleTest() override { manager->unloadModule(path.c_str()); }
+
+    std::wstring path = Ov::fromUtf8(modulePath);
+    Ov::RnRef<Ov::RnComponentManager> manager;
+    const Ov::Module* module;
+};
+
+TEST_F(ModuleTest, ShowsTwoSymbolsAndNothingElse) {
+    FILE* nm = popen((std::string("nm -D --defined-only --format=posix ") + modulePath).c_str(), "r");
+    ASSERT_TRUE(nm);
+    std::set<std::string> names;
+    char line[512];
+    while (std::fgets(line, sizeof line, nm)) names.insert(std::string(line, std::string_view(line).find(' ')));
+    EXPECT_EQ(pclose(nm), 0);
+    EXPECT_EQ(names, (std::set<std::string>{"RnGetComponentDescription", "RnNumberedExports"}));
+}
+
+TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
+    namespace ids = OvPhotometrics::classIds;
+    Ov::RnComponentRegistry& registry = module->registry();
+    std::set<std::wstring> names;
+    auto visitor = Ov::rnVisitor<Ov::RnPtr<Ov::RnComponentBuilder>>(
+        [&](Ov::RnPtr<Ov::RnComponentBuilder> builder) { names.insert(builder->getName()); });
+    EXPECT_EQ(registry.enumerateBuilders(visitor), Ov::RnEnum::goOn);
+    EXPECT_EQ(names, (std::set<std::wstring>{L"IES Web", L"Isotropic Distribution", L"Web Distribution"}));
+    EXPECT_EQ(registry.getBuilderCount(), names.size());
+    for (Ov::RnUid id : {ids::iesWeb, ids::isotropic, ids::webDistribution}) {
+        const auto builder = registry.getBuilder(id);
+        ASSERT_TRUE(builder);
+        EXPECT_TRUE(builder->hasInterface(Ov::RnBuilderDescription::iid));
+        EXPECT_EQ(builder->hasInterface(Ov::RnImportBuilder::iid), id == ids::iesWeb);
+        EXPECT_TRUE(builder->create());
+        for (std::uint32_t* word : {&id.w0, &id.w1, &id.w2, &id.w3}) {
+            ++*word;
+            EXPECT_FALSE(registry.getBuilder(id));
+            --*word;
+        }
+    }
+    int seen = 0;
+    auto stopping = Ov::rnVisitor<Ov::RnPtr<Ov::RnComponentBuilder>>([&](Ov::RnPtr<Ov::RnComponentBuilder>) {
+        ++seen;
+        return Ov::RnEnum::stop;
+    });
+    EXPECT_EQ(registry.enumerateBuilders(stopping), Ov::RnEnum::stop);
+    EXPECT_EQ(seen, 1);
+}
+
+TEST_F(ModuleTest, ImportsAFileNamedByItsPathAndReportsFaults) {
+    TempFolder folder;
+    const auto good = folder.write("lamp.one.ies", "IESNA91\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1");
+    const auto bad = folder.write("bad.ies", "IESNA91\nTILT=NONE\n0");
+    const auto builder = manager->findBuilder(OvPhotometrics::classIds::iesWeb);
+    const auto importer = Ov::rnCast<Ov::RnImportBuilder>(builder.get());
+    const auto object = importer->import(good.c_str(), nullptr);
+    const auto web = Ov::rnCast<Ov::RnPhotoWebData>(object.get());
+    EXPECT_STREQ(web->getName(), L"lamp.one");
+    EXPECT_TRUE(web->isLoaded());
+    EXPECT_EQ(web->getMaxCandela(), 5);
+
+    std::wstring reported;
+    Ov::setMessageReporter([&](int, const wchar_t* text) { reported += text; });
+    EXPECT_THROW(importer->import(bad.c_str(), nullptr), Ov::RnStreamEx::ExReadError);
+    EXPECT_THROW(importer->import(folder.wide().c_str(), nullptr), Ov::RnStreamEx::ExReadError);
+    Ov::setMessageReporter(nullptr);
+    EXPECT_NE(reported.find(L"is 0; it must be at least 1"), std::wstring::npos) << Ov::toUtf8(reported);
+}
+
+TEST_F(ModuleTest, AdaptersShareTheirObject) {
+    const auto object = manager->createObject(OvPhotometrics::classIds::iesWeb);
+    const auto first = Ov::rnCast<Ov::RnPersistant>(object.get());
+    const auto second = Ov::rnCast<Ov::RnPersistant>(object.get());
+    EXPECT_NE(first.get(), second.get());
+    EXPECT_EQ(first->getClassId(), OvPhotometrics::classIds::iesWeb);
+    EXPECT_EQ(object->getInterface(Ov::RnBufferedIO::iid), nullptr);
+    EXPECT_TRUE(object->hasInterface(Ov::RnPersistant::iid));
+    EXPECT_FALSE(object->hasInterface(Ov::RnBufferedIO::iid));
+}
+
+TEST_F(ModuleTest, NumberedExportsEndWithTheirTable) {
+    EXPECT_EQ(module->byOrdinal(0), nullptr);
+    EXPECT_EQ(module->byOrdinal(4711), nullptr);
+}
+
+TEST(CompanionPath, ReplacesTheExtensionOfTheFile) {
+    using OvPhotometrics::companionPath;
+    EXPECT_EQ(companionPath(L"C:\\x\\libOVphoto.dll"), L"C:\\x\\libOVphotoRes.dll");
+    EXPECT_EQ(companionPath(L"C:\\a.b\\lib"), L"C:\\a.b\\libRes.dll");
+    EXPECT_EQ(companionPath(L"/a.b/lib"), L"/a.b/libRes.dll");
+    EXPECT_EQ(companionPath(L"lib.so.1"), L"lib.soRes.dll");
+    EXPECT_EQ(companionPath(L"x.y:z"), L"x.y:zRes.dll");
+    EXPECT_EQ(companionPath(L""), L"Res.dll");
+}
+
+}  // namespace

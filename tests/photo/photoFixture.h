@@ -1,0 +1,92 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+
+#include "components/photo/ies/photoWebIES.h"
+#include "components/photo/lid/component.h"
+#include "components/photo/lid/registration.h"
+#include "host/componentManager/componentManager.h"
+#include "host/componentManager/devices.h"
+#include "tests/support/messageLog.h"
+
+namespace OvPhotometrics {
+
+/// A host that knows the library's builders and logs what they report.
+class Photo : public testing::Test {
+protected:
+    Photo() {
+        registerBuilders();
+        Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager())->addRegistry(lidComponent());
+    }
+
+    /// Imports text through the IES builder; null when it is refused.
+    RnRef<PhotoWebIES> import(const std::string& text, const wchar_t* name = L"",
+                              const wchar_t* basePath = nullptr) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
+        try {
+            const auto object =
+                immortal<IESBuilder>().import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), name, basePath);
+            return RnRef<PhotoWebIES>::share(dynamic_cast<PhotoWebIES*>(object.get()));
+        } catch (const Ov::RnStreamEx::ExReadError&) {
+            return {};
+        }
+    }
+
+    /// What an object's adapter saves into a text stream.
+    std::string saved(Ov::RnCastable& object) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        Ov::rnCast<Ov::RnPersistant>(&object)->save(stream);
+        return io->bytes();
+    }
+
+    RnRef<Ov::RnWebIntensityDist> distributionOf(Ov::RnPhotoWebData& web) { return makeWebDistribution(web); }
+
+    MessageLog log;
+};
+
+/// Numbers in text, one blank between them.
+inline std::string joined(const std::vector<double>& values) {
+    std::string text;
+    for (const double value : values) {
+        char buffer[32];
+        std::snprintf(buffer, sizeof buffer, "%.9g ", value);
+        text += buffer;
+    }
+    return text;
+}
+
+/// The text of an IES file; a test sets what is odd about it and nothing else.
+struct IesText {
+    std::string header = "IESNA91\n[TEST] 1\n";
+    std::string tilt = "NONE\n";
+    int type = 1;
+    double lumens = 1000;
+    std::vector<double> vertical = {0, 90, 180};
+    std::vector<double> horizontal = {0};
+    std::string values = {};  // empty: i + 10 j + 1 for vertical index i and horizontal index j
+
+    std::string text() const {
+        std::string all = header + "TILT=" + tilt + "1 " + joined({lumens}) + "1 " +
+                          std::to_string(vertical.size()) + " " + std::to_string(horizontal.size()) + " " +
+                          std::to_string(type) + " 2 0 0 0\n1 1 60\n" + joined(vertical) + "\n" +
+                          joined(horizontal) + "\n";
+        if (!values.empty()) return all + values;
+        for (std::size_t j = 0; j < horizontal.size(); ++j)
+            for (std::size_t i = 0; i < vertical.size(); ++i) all += std::to_string(i + 10 * j + 1) + " ";
+        return all;
+    }
+};
+
+/// A direction by angles in degrees.
+inline GeVector3<float> direction(double theta, double psi) {
+    const double t = inRadians(theta);
+    const double p = inRadians(psi);
+    return {static_cast<float>(std::sin(t) * std::cos(p)), static_cast<float>(std::sin(t) * std::sin(p)),
+            static_cast<float>(std::cos(t))};
+}
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,54 @@
+#include <cmath>
+#include <filesystem>
+
+#include "tests/photo/photoFixture.h"
+
+// Makers' files, read where OVPHOTO_SAMPLES says they lie.
+
+namespace OvPhotometrics {
+namespace {
+
+class Samples : public Photo {};
+
+void expectSound(Ov::RnPhotoWebData& web) {
+    EXPECT_GE(web.getMaxCandela(), 0);
+    EXPECT_TRUE(std::isfinite(web.getLumens()));
+    const auto light = makeWebDistribution(web);
+    for (int theta = 0; theta <= 180; theta += 3)
+        for (int psi = -180; psi <= 360; psi += 7) {
+            const float candela = light->intensityAtUnit(direction(theta, psi));
+            ASSERT_TRUE(candela >= 0 && std::isfinite(candela)) << theta << "," << psi;
+        }
+}
+
+TEST_F(Samples, AreReadOrRefusedWithAMessage) {
+    const char* folder = std::getenv("OVPHOTO_SAMPLES");
+    if (!folder) GTEST_SKIP() << "OVPHOTO_SAMPLES names no folder";
+    int files = 0, read = 0;
+    for (const auto& entry : std::filesystem::directory_iterator(folder)) {
+        if (entry.path().extension() != ".ies") continue;
+        SCOPED_TRACE(entry.path());
+        ++files;
+        RnRef<Ov::RnCastable> object;
+        try {
+            object = immortal<IESBuilder>().import(Ov::widePath(entry.path()).c_str(), nullptr);
+        } catch (const Ov::RnStreamEx::ExReadError&) {
+            EXPECT_NE(log.take(), "");
+            continue;
+        }
+        EXPECT_EQ(log.take(), "");
+        ++read;
+        const auto web = Ov::rnCast<Ov::RnPhotoWebData>(object.get());
+        expectSound(*web);
+        const std::string text = saved(*web);
+        if (const auto again = import(text)) {
+            EXPECT_EQ(again->getThetaCount(), web->getThetaCount());
+        }
+        log.take();
+    }
+    EXPECT_GT(files, 0);
+    EXPECT_GT(read, files / 2);
+}
+
+}  // namespace
+}  // namespace OvPhotometrics

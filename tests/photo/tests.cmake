@@ -1,0 +1,8 @@
+ovphoto_add_test(photo/lid/photoWeb_test)
+ovphoto_add_test(photo/ies/iesRead_test)
+ovphoto_add_test(photo/ies/iesConvert_test)
+ovphoto_add_test(photo/ies/iesWrite_test)
+ovphoto_add_test(photo/distributions/distributions_test)
+ovphoto_add_test(photo/samples_test)
+ovphoto_add_test(photo/module_test)
+add_dependencies(photo_module_test OVphoto ovphoto_messages)
