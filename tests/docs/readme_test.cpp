@@ -1,0 +1,100 @@
+#include <gmock/gmock.h>
+#include <sys/wait.h>
+
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <regex>
+#include <sstream>
+#include <string>
+#include <vector>
+
+// What the documents promise: the README's examples print what stands there, and links lead somewhere.
+
+namespace {
+
+namespace fs = std::filesystem;
+
+const fs::path sourceFolder = OVPHOTO_SOURCE_DIR;
+
+std::string readText(const fs::path& path) {
+    std::ostringstream text;
+    text << std::ifstream(path).rdbuf();
+    return text.str();
+}
+
+struct Example {
+    std::string command;
+    std::string output;
+};
+
+/// The commands of a document's fenced blocks, lines that start with "$ ", and what stands below each.
+std::vector<Example> examplesOf(const fs::path& document) {
+    std::vector<Example> examples;
+    bool fenced = false;
+    bool commandSeen = false;
+    std::istringstream lines(readText(document));
+    for (std::string line; std::getline(lines, line);) {
+        if (line.starts_with("```")) {
+            fenced = !fenced;
+            commandSeen = false;
+        } else if (fenced && line.starts_with("$ ")) {
+            examples.push_back({line.substr(2), ""});
+            commandSeen = true;
+        } else if (commandSeen) {
+            examples.back().output += line + '\n';
+        }
+    }
+    return examples;
+}
+
+/// What a shell in the source folder, where `ovphoto` is the built tool, prints; and the status when that is not
+/// 0.
+std::string runInSources(const std::string& command) {
+    const std::string line = "export LC_ALL=C PATH='" OVPHOTO_BIN_DIR "':\"$PATH\" && cd '" OVPHOTO_SOURCE_DIR
+                             "' && { " +
+                             command + "\n} 2>&1";
+    FILE* pipe = popen(line.c_str(), "r");
+    if (!pipe) return "no shell";
+    std::string output;
+    for (int c; (c = std::fgetc(pipe)) != EOF;) output += static_cast<char>(c);
+    const int status = pclose(pipe);
+    if (status != 0) output += "status " + std::to_string(WEXITSTATUS(status)) + '\n';
+    return output;
+}
+
+std::vector<fs::path> documents() {
+    std::vector<fs::path> found;
+    for (const auto& entry : fs::directory_iterator(sourceFolder))
+        if (entry.path().extension() == ".md") found.push_back(entry.path());
+    for (const auto& entry : fs::recursive_directory_iterator(sourceFolder / "docs"))
+        if (entry.path().extension() == ".md") found.push_back(entry.path());
+    return found;
+}
+
+TEST(Readme, ExamplesPrintWhatStandsThere) {
+    const std::vector<Example> examples = examplesOf(sourceFolder / "README.md");
+    ASSERT_GE(examples.size(), 3U);
+    for (const Example& example : examples) {
+        SCOPED_TRACE(example.command);
+        EXPECT_THAT(example.command, testing::StartsWith("ovphoto "));
+        EXPECT_EQ(runInSources(example.command), example.output);
+    }
+}
+
+TEST(Documents, LinksLeadToFiles) {
+    const std::regex link(R"(\]\(([^)#]+)[^)]*\))");
+    int links = 0;
+    for (const fs::path& document : documents()) {
+        const std::string text = readText(document);
+        for (std::sregex_iterator found(text.begin(), text.end(), link), end; found != end; ++found) {
+            const std::string target = (*found)[1];
+            if (target.starts_with("http")) continue;
+            ++links;
+            EXPECT_TRUE(fs::exists(document.parent_path() / target)) << document << " links to " << target;
+        }
+    }
+    EXPECT_GT(links, 5);
+}
+
+}  // namespace
