@@ -411,22 +411,31 @@ Scanner::Outcome Scanner::readText(const Directive& directive, bool terminates, 
     return Outcome::goOn;
 }
 
+/// Reads "%f" or "%d" alone, with which files of numbers are read, where the window holds all of the number.
+bool readSingle(RnBufferedIO& device, wchar_t letter, void* target) {
+    if (letter == L'f') return readInWindow(device, *static_cast<float*>(target));
+    return letter == L'd' && readInWindow(device, *static_cast<std::int32_t*>(target));
+}
+
+/// Not inlined: its frame would cost the short way as much as a number.
+__attribute__((noinline)) int scanAny(RnBufferedIO& device, const wchar_t* format, Arguments& arguments) {
+    return Scanner(device, arguments).scan(format);
+}
+
 }  // namespace
 
 int RnStream::formattedRead(const wchar_t* format, ...) {
     if (pendingSeparator) skipPendingSeparator();
+    if (format[0] == L'%' && (format[1] == L'f' || format[1] == L'd') && format[2] == 0) {
+        std::va_list single;
+        va_start(single, format);
+        void* const target = va_arg(single, void*);
+        va_end(single);
+        if (readSingle(*_device, format[1], target)) return 1;
+    }
     Arguments arguments;
     va_start(arguments.list, format);
-    // "%f" and "%d" alone read whole files of numbers.
-    int count = 0;
-    if (format[0] == L'%' && format[1] != 0 && format[2] == 0) {
-        std::va_list peeked;
-        va_copy(peeked, arguments.list);
-        if (format[1] == L'f') count = readInWindow(*_device, *va_arg(peeked, float*));
-        if (format[1] == L'd') count = readInWindow(*_device, *va_arg(peeked, std::int32_t*));
-        va_end(peeked);
-    }
-    if (count == 0) count = Scanner(*_device, arguments).scan(format);
+    const int count = scanAny(*_device, format, arguments);
     va_end(arguments.list);
     return count;
 }

@@ -90,14 +90,12 @@ bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout
 }
 
 void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout& layout, float factor) {
+    const auto at = [](const std::vector<float>& angles, int k) { return angles[static_cast<std::size_t>(k)]; };
     for (int i = 0; i < grid.verticalCount; ++i)
-        photoWebRecordSetTheta(rec, i,
-                               toRadians(grid.verticalAngles[static_cast<std::size_t>(i)] + layout.verticalShift));
+        photoWebRecordSetTheta(rec, i, toRadians(at(grid.verticalAngles, i) + layout.verticalShift));
     for (int j = 0; j < layout.columns; ++j) {
-        photoWebRecordSetPsi(
-            rec, j, toRadians(grid.horizontalAngles[static_cast<std::size_t>(j)] + layout.horizontalShift));
-        for (int i = 0; i < grid.verticalCount; ++i)
-            photoWebRecordSetCandela(rec, i, j, grid.candela(i, j) * factor);
+        photoWebRecordSetPsi(rec, j, toRadians(at(grid.horizontalAngles, j) + layout.horizontalShift));
+        photoWebRecordSetRow(rec, j, &grid.candelas[grid.index(0, j)], factor);
     }
 }
 

@@ -49,9 +49,12 @@ bool NumberText::fail(unsigned id, int character) {
 
 /// Goes to the start of the next number. Without one that is reported, and `instead` is what the number gives.
 bool NumberText::findNumber(unsigned unexpected, std::int32_t& instead) {
+    Ov::RnBufferedIO& device = _in.device();
     int c = _in.peekChar();
     while (isBetween(c)) {
-        _in.getChar();
+        const char* p = device.next();
+        while (p != device.limit() && isBetween(*p)) ++p;
+        device.advanceTo(p);
         c = _in.peekChar();
     }
     if (startsNumber(c)) return true;
@@ -97,12 +100,11 @@ bool NumberText::readFloat(float& value) {
 }
 
 bool NumberText::readFloats(std::size_t count, std::vector<float>& values) {
+    // The next values are no more than every second byte that is at hand.
+    const Ov::RnBufferedIO& device = _in.device();
     values.clear();
-    for (std::size_t i = 0; i < count && !_ended; ++i) {
-        float value;
-        readFloat(value);
-        values.push_back(value);
-    }
+    values.reserve(std::min(count, static_cast<std::size_t>(device.limit() - device.next()) / 2 + 1));
+    for (std::size_t i = 0; i < count && !_ended; ++i) readFloat(values.emplace_back());
     return !_failed;
 }
 

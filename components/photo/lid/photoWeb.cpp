@@ -1,6 +1,7 @@
 #include "components/photo/lid/photoWeb.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <new>
 #include <vector>
@@ -36,9 +37,12 @@ public:
                 addSine((angles[k] + angles[k - 1]) / 2);
     }
 
-    float operator()(const float* values) const {
-        if (_n < 2) return 0;
-        return subdivides() ? sumOfSteps(values) : sumOfIntervals(values);
+    /// The integrals of `Rows` rows, one after another in memory. The sums of a row are a chain of dependent
+    /// steps; several rows at once keep the machine busy.
+    template <int Rows>
+    std::array<float, Rows> of(const float* values) const {
+        if (_n < 2) return {};
+        return subdivides() ? sumOfSteps<Rows>(values) : sumOfIntervals<Rows>(values);
     }
 
 private:
@@ -52,12 +56,27 @@ private:
         for (int step = 0; step < _steps; ++step, a += da) addSine((a + da + a) * 0.5f);
     }
 
-    float sumOfIntervals(const float* v) const {
-        float sum = 0;
-        for (int k = 1; k < _n; ++k)
-            sum = static_cast<float>(sum +
-                                     _sines[count(k - 1)] * ((v[k] + v[k - 1]) * (_angles[k] - _angles[k - 1])));
-        return sum * 0.5f;
+    template <int Rows>
+    std::array<float, Rows> sumOfIntervals(const float* values) const {
+        std::array<float, Rows> sums{};
+        for (int k = 1; k < _n; ++k) {
+            const double sine = _sines[count(k - 1)];
+            const float da = _angles[k] - _angles[k - 1];
+            for (int r = 0; r < Rows; ++r) {
+                const float* v = values + static_cast<std::ptrdiff_t>(r) * _n + k;
+                float& sum = sums[count(r)];
+                sum = static_cast<float>(sum + sine * ((v[0] + v[-1]) * da));
+            }
+        }
+        for (float& sum : sums) sum *= 0.5f;
+        return sums;
+    }
+
+    template <int Rows>
+    std::array<float, Rows> sumOfSteps(const float* values) const {
+        std::array<float, Rows> totals{};
+        for (int r = 0; r < Rows; ++r, values += _n) totals[count(r)] = sumOfSteps(values);
+        return totals;
     }
 
     float sumOfSteps(const float* values) const {
@@ -80,18 +99,27 @@ private:
     std::vector<double> _sines;
 };
 
+std::vector<float> integrateRows(const PhotoWebRecord& rec, const float* values) {
+    constexpr int together = 8;
+    const ThetaIntegral integral(rec.nthetas, rec.thetas.get());
+    std::vector<float> rows;
+    rows.reserve(count(rec.npsis));
+    const auto add = [&](const auto& sums) { rows.insert(rows.end(), sums.begin(), sums.end()); };
+    int j = 0;
+    for (; j + together <= rec.npsis; j += together)
+        add(integral.of<together>(values + count(j) * count(rec.nthetas)));
+    for (; j < rec.npsis; ++j) add(integral.of<1>(values + count(j) * count(rec.nthetas)));
+    return rows;
+}
+
 /// Flux in lumens of a grid whose values are relative to a peak of `maxCandela`.
 float integrateFlux(const PhotoWebRecord& rec, const float* values, float maxCandela) {
-    const ThetaIntegral integral(rec.nthetas, rec.thetas.get());
-    const auto row = [&](int j) { return integral(values + count(j) * count(rec.nthetas)); };
-    const float first = row(0);
-    float last = first;
+    const std::vector<float> rows = integrateRows(rec, values);
+    const float first = rows.front();
+    const float last = rows.back();
     float sum = 0;
-    for (int j = 1; j < rec.npsis; ++j) {
-        const float next = row(j);
-        sum += (next + last) * (rec.psis[j] - rec.psis[j - 1]);
-        last = next;
-    }
+    for (int j = 1; j < rec.npsis; ++j)
+        sum += (rows[count(j)] + rows[count(j - 1)]) * (rec.psis[j] - rec.psis[j - 1]);
     const float lastPsi = rec.psis[rec.npsis - 1];
     switch (rec.symmetry) {
         case PhotoWebSymmetry::Full:
@@ -187,6 +215,16 @@ void photoWebRecordSetCandela(PhotoWebRecord& rec, int i, int j, float candela) 
     if (candela > rec.maxCandela) rec.maxCandela = candela;
 }
 
+void photoWebRecordSetRow(PhotoWebRecord& rec, int j, const float* values, float factor) {
+    float* row = rec.candelas.get() + count(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry)) * count(rec.nthetas);
+    float peak = rec.maxCandela;
+    for (int i = 0; i < rec.nthetas; ++i) {
+        row[i] = values[i] * factor;
+        peak = row[i] > peak ? row[i] : peak;
+    }
+    rec.maxCandela = peak;
+}
+
 void photoWebRecordSetLumens(PhotoWebRecord& rec, float lumens) { rec.lumens = lumens; }
 
 void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<float>& orientation) {
@@ -195,7 +233,7 @@ void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<flo
 }
 
 float photoWebIntegrate(int n, const float* angles, const float* values) {
-    return ThetaIntegral(n, angles)(values);
+    return ThetaIntegral(n, angles).of<1>(values)[0];
 }
 
 bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {

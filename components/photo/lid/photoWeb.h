@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <memory>
 #include <string>
 
@@ -65,6 +66,8 @@ void photoWebRecordSetTheta(PhotoWebRecord& rec, int i, float radians);
 /// Nothing for an axial web.
 void photoWebRecordSetPsi(PhotoWebRecord& rec, int j, float radians);
 void photoWebRecordSetCandela(PhotoWebRecord& rec, int i, int j, float candela);
+/// The whole row of psi index j: `values` times `factor`.
+void photoWebRecordSetRow(PhotoWebRecord& rec, int j, const float* values, float factor);
 void photoWebRecordSetLumens(PhotoWebRecord& rec, float lumens);
 /// Counts as an orientation even when it is the identity.
 void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<float>& orientation);
@@ -164,10 +167,11 @@ protected:
 inline float* RnBasePhotoWebData::copyRow(int j, IndexRange thetas, float* out) const {
     const float* values = row(j);
     if (thetas.first >= 0 && thetas.last < _nthetas) {
-        for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[i];
-    } else {
-        for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[clampTheta(i)];
+        // Nearly every block is 4 wide: a copy of known size is one instruction, others are a call.
+        if (thetas.last - thetas.first == 3) return std::copy_n(values + thetas.first, 4, out);
+        return std::copy(values + thetas.first, values + thetas.last + 1, out);
     }
+    for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[clampTheta(i)];
     return out;
 }
 
