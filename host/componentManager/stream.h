@@ -62,8 +62,8 @@ public:
 
     /// Formatted text as wide printf and scanf know it, with these fixed meanings on every platform: %s and %[
     /// are wide strings, %hd and %hx 16 bits, %d, %ld, %u and %x 32 bits, %n int; reading, %g, %f and %e are float
-    /// and %lg, %lf and %le double. Independent of the process's locale, and exact. Only decimal numbers convert: no
-    /// "nan", "inf" or hexadecimal floats, and no number that its type cannot hold (one too small is 0).
+    /// and %lg, %lf and %le double. Independent of the process's locale, and exact. Only decimal numbers convert:
+    /// no "nan", "inf" or hexadecimal floats, and no number that its type cannot hold (one too small is 0).
     /// Writing returns the number of characters, reading the number of conversions, or -1 when the input ends
     /// before the first. Neither touches `column`; writing leaves `pendingSeparator` alone, reading consumes a
     /// pending separator first.

@@ -43,7 +43,7 @@ class RefusingSink : public std::streambuf {};
 void expectBehavesAsText(RnBufferedIO& device, std::string text) {
     std::mt19937 random(2);
     std::size_t at = 0;
-    for (int step = 0; step < 20000; ++step) {
+    for (int step = 0; step < 8000; ++step) {
         SCOPED_TRACE(step);
         wchar_t c = 0;
         switch (random() % 8) {
