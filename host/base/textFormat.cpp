@@ -1,6 +1,7 @@
 #include "host/base/textFormat.h"
 
 #include <algorithm>
+#include <bit>
 #include <charconv>
 #include <cmath>
 #include <string_view>
@@ -117,6 +118,33 @@ char* ensurePoint(char* text, char* end) {
     return end + 1;
 }
 
+/// As std::to_chars with a few decimals, for a value that a float holds, whose product with a small power of ten
+/// is an exact integer over a power of two. Null for other values.
+char* convertFixedFloat(char* buffer, double value, int precision) {
+    static constexpr std::uint64_t powers[] = {1, 10, 100, 1000, 10000};
+    const auto bits = std::bit_cast<std::uint64_t>(value);
+    // The value is `mantissa`, of 24 bits, shifted down by `shift`.
+    const auto mantissa = (bits & ((1ULL << 52) - 1)) >> 29 | 1ULL << 23;
+    const int shift = 1023 + 23 - static_cast<int>(bits >> 52);
+    if ((bits & ((1ULL << 29) - 1)) != 0 || shift <= 0 || shift >= 63 || precision < 1 || precision > 4) {
+        return nullptr;
+    }
+    const std::uint64_t scaled = mantissa * powers[precision];
+    const std::uint64_t rest = scaled & ((1ULL << shift) - 1);
+    const std::uint64_t half = 1ULL << (shift - 1);
+    std::uint64_t rounded = scaled >> shift;
+    if (rest > half || (rest == half && rounded % 2 == 1)) ++rounded;
+
+    char* const point = std::to_chars(buffer, buffer + maxNumberLength, rounded / powers[precision]).ptr;
+    *point = '.';
+    rounded %= powers[precision];
+    for (int i = precision; i > 0; --i) {
+        point[i] = static_cast<char>('0' + rounded % 10);
+        rounded /= 10;
+    }
+    return point + precision + 1;
+}
+
 /// Writes the digits of a finite value that is not negative; returns their end.
 char* convertMagnitude(char* buffer, const FormatSpec& spec, double value) {
     char* const limit = buffer + maxNumberLength;
@@ -140,6 +168,9 @@ char* convertMagnitude(char* buffer, const FormatSpec& spec, double value) {
         const bool isFixed = exponent >= -4 && exponent < precision;
         format = isFixed ? std::chars_format::fixed : std::chars_format::scientific;
         precision -= isFixed ? exponent + 1 : 1;
+    }
+    if (format == std::chars_format::fixed) {
+        if (char* end = convertFixedFloat(buffer, value, precision)) return end;
     }
     char* end = std::to_chars(buffer, limit, value, format, precision).ptr;
     return spec.alternate ? ensurePoint(buffer, end) : end;
