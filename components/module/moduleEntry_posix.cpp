@@ -11,8 +11,9 @@ namespace {
 __attribute__((constructor)) void attach() {
     Dl_info module;
     if (dladdr(reinterpret_cast<void*>(&attach), &module) == 0) return;
-    const auto path = std::filesystem::absolute(module.dli_fname);
-    OvPhotometrics::enterModule(module.dli_fbase, Ov::widePath(path));
+    std::error_code failure;
+    const auto path = std::filesystem::absolute(module.dli_fname, failure);
+    OvPhotometrics::enterModule(module.dli_fbase, Ov::widePath(failure ? module.dli_fname : path));
 }
 
 }  // namespace

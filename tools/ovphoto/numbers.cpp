@@ -28,7 +28,7 @@ float toRadians(float degrees) { return static_cast<float>(degrees * std::number
 float toDegrees(float radians) {
     const double degrees = radians * 180 / std::numbers::pi;
     if (!std::isfinite(degrees)) return static_cast<float>(degrees);
-    for (int digits = 1; digits <= 9; ++digits) {
+    for (int digits = 1; digits <= 7; ++digits) {
         const auto candidate = parseFloat(formatDouble(degrees, std::chars_format::general, digits));
         if (candidate && toRadians(*candidate) == radians) return *candidate;
     }

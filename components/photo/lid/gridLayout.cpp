@@ -90,11 +90,15 @@ bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout
 }
 
 void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout& layout, float factor) {
-    const auto at = [](const std::vector<float>& angles, int k) { return angles[static_cast<std::size_t>(k)]; };
+    // An angle that is not shifted stays as it is, a negative zero included.
+    const auto shifted = [](const std::vector<float>& angles, int k, double shift) {
+        const double angle = angles[static_cast<std::size_t>(k)];
+        return toRadians(shift != 0 ? angle + shift : angle);
+    };
     for (int i = 0; i < grid.verticalCount; ++i)
-        photoWebRecordSetTheta(rec, i, toRadians(at(grid.verticalAngles, i) + layout.verticalShift));
+        photoWebRecordSetTheta(rec, i, shifted(grid.verticalAngles, i, layout.verticalShift));
     for (int j = 0; j < layout.columns; ++j) {
-        photoWebRecordSetPsi(rec, j, toRadians(at(grid.horizontalAngles, j) + layout.horizontalShift));
+        photoWebRecordSetPsi(rec, j, shifted(grid.horizontalAngles, j, layout.horizontalShift));
         photoWebRecordSetRow(rec, j, &grid.candelas[grid.index(0, j)], factor);
     }
 }

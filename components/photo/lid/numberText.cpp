@@ -61,7 +61,7 @@ bool NumberText::findNumber(unsigned unexpected, std::int32_t& instead) {
     instead = 0;
     if (c >= 0) {
         _in.getChar();
-        return fail(unexpected, c);
+        return fail(unexpected, c == 0 ? ' ' : c);  // a NUL would end the message
     }
     const bool first = !_ended;
     _ended = true;

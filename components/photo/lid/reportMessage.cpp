@@ -16,9 +16,8 @@ void post(std::wstring text) {
     controller->report(0, lastMessage.c_str());
 }
 
-}  // namespace
-
-std::wstring messageTextV(unsigned id, std::va_list args) {
+/// The formatted text of a message, or its number without a catalogue.
+std::wstring messageText(unsigned id, std::va_list args) {
     try {
         return Ov::messageFile().formatV(id, args);
     } catch (const Ov::RnMessageFileEx&) {
@@ -26,10 +25,12 @@ std::wstring messageTextV(unsigned id, std::va_list args) {
     }
 }
 
+}  // namespace
+
 void reportMessage(unsigned id, ...) {
     std::va_list args;
     va_start(args, id);
-    std::wstring text = messageTextV(id, args);
+    std::wstring text = messageText(id, args);
     va_end(args);
     post(std::move(text));
 }
@@ -37,9 +38,13 @@ void reportMessage(unsigned id, ...) {
 void reportParseMessage(unsigned id, ...) {
     std::va_list args;
     va_start(args, id);
-    const std::wstring detail = messageTextV(id, args);
+    const std::wstring detail = messageText(id, args);
     va_end(args);
-    reportMessage(messages::fileNotRead, detail.c_str());
+    try {
+        post(Ov::messageFile().format(messages::fileNotRead, detail.c_str()));
+    } catch (const Ov::RnMessageFileEx&) {
+        post(detail);
+    }
 }
 
 }  // namespace OvPhotometrics
