@@ -1,6 +1,9 @@
 #pragma once
 
-#include <memory>
+#include <array>
+#include <cstddef>
+#include <memory_resource>
+#include <new>
 #include <unordered_map>
 
 #include "host/componentManager/builder.h"
@@ -9,7 +12,7 @@
 namespace OvPhotometrics {
 
 /// Every builder of the library by class id. One table a process; it is filled before the module's first call and
-/// only read afterwards. The table and the builders are never freed.
+/// only read afterwards. Neither table nor builders are ever freed; as static storage they go with the module.
 class BuilderTable {
 public:
     /// Enters a builder, which must stay. The first of a class id is kept.
@@ -27,7 +30,9 @@ private:
     struct Equal {
         bool operator()(const Ov::RnUid* a, const Ov::RnUid* b) const { return *a == *b; }
     };
-    std::unordered_map<const Ov::RnUid*, Ov::RnComponentBuilder*, Hash, Equal> _builders;
+    std::array<std::byte, 2048> _memory;  // enough for dozens of builders
+    std::pmr::monotonic_buffer_resource _resource{_memory.data(), _memory.size()};
+    std::pmr::unordered_map<const Ov::RnUid*, Ov::RnComponentBuilder*, Hash, Equal> _builders{&_resource};
 };
 
 /// Made on first use.
@@ -48,10 +53,12 @@ public:
 
 LidComponent& lidComponent();
 
-/// A static object that is never destroyed, so that it may be asked until the process ends.
+/// The one object of a class, made on first use in static storage and never destroyed, so that it may be asked
+/// until the process ends or the module goes.
 template <class T>
 T& immortal() {
-    static T* object = new T;
+    alignas(T) static std::byte place[sizeof(T)];
+    static T* const object = new (place) T;
     return *object;
 }
 
