@@ -106,9 +106,31 @@ TEST_F(ModuleTest, AdaptersShareTheirObject) {
     EXPECT_FALSE(object->hasInterface(Ov::RnBufferedIO::iid));
 }
 
-TEST_F(ModuleTest, NumberedExportsEndWithTheirTable) {
-    EXPECT_EQ(module->byOrdinal(0), nullptr);
-    EXPECT_EQ(module->byOrdinal(4711), nullptr);
+TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
+    for (std::uint32_t ordinal : {0U, 1U, 421U, 435U, 4711U}) EXPECT_EQ(module->byOrdinal(ordinal), nullptr);
+    std::set<void*> functions;
+    for (std::uint32_t ordinal = 422; ordinal <= 434; ++ordinal) functions.insert(module->byOrdinal(ordinal));
+    EXPECT_EQ(functions.size(), 13U);
+    EXPECT_FALSE(functions.contains(nullptr));
+
+    EXPECT_EQ(module->byOrdinal<float(bool, int, int, bool)>(422)(true, 12, 30, true), 12.5F);
+    int hours = 0, minutes = 0, month = 0, day = 0;
+    bool pm = false;
+    module->byOrdinal<void(bool, float, int*, int*, bool*)>(423)(true, 13.75F, &hours, &minutes, &pm);
+    EXPECT_TRUE(hours == 1 && minutes == 45 && pm);
+    EXPECT_STREQ(module->byOrdinal<const wchar_t*(int)>(424)(2), L"Eastern Time");
+    EXPECT_EQ(module->byOrdinal<int(int)>(425)(15), 1);
+    EXPECT_FLOAT_EQ(module->byOrdinal<float(int)>(426)(2), 1.3089969F);
+    EXPECT_EQ(module->byOrdinal<int()>(427)(), 31);
+    EXPECT_EQ(module->byOrdinal<int(float)>(428)(1.3089969F), 2);
+    EXPECT_TRUE(module->byOrdinal<bool(int, float)>(429)(10, -170));
+    EXPECT_STREQ(module->byOrdinal<const wchar_t*(int)>(430)(6), L"June");
+    EXPECT_STREQ(module->byOrdinal<const wchar_t*(int)>(431)(6), L"Jun");
+    EXPECT_EQ(module->byOrdinal<int(int)>(432)(2), 28);
+    EXPECT_EQ(module->byOrdinal<int(int, int)>(433)(6, 21), 172);
+    EXPECT_TRUE(module->byOrdinal<bool(int, int*, int*)>(434)(172, &month, &day));
+    EXPECT_TRUE(month == 6 && day == 21);
+    EXPECT_STREQ(OvPhotometrics::numberedFunctions(*module).getMonthShortName(5), L"May");
 }
 
 TEST(CompanionPath, ReplacesTheExtensionOfTheFile) {
