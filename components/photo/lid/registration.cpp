@@ -4,11 +4,13 @@
 #include "components/photo/distributions/web.h"
 #include "components/photo/ies/photoWebIES.h"
 #include "components/photo/lid/component.h"
+#include "components/photo/naturallight/daylightData.h"
 
 namespace OvPhotometrics {
 
 void registerBuilders() {
     BuilderTable& table = builderTable();
+    table.add(immortal<DaylightBuilder>());
     table.add(immortal<WebBuilder>());
     table.add(immortal<IESBuilder>());
     table.add(immortal<IsotropicBuilder>());

@@ -1,0 +1,131 @@
+#include "components/photo/naturallight/daylight.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+
+#include "components/photo/lid/photoWeb.h"
+#include "components/photo/naturallight/calendar.h"
+#include "components/photo/naturallight/solar.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr double exactPi = std::numbers::pi;
+
+float single(double value) { return static_cast<float>(value); }
+
+double finite(float value) { return std::isfinite(value) ? value : 0; }
+
+/// A longitude or meridian: 180 degrees and beyond count as -180.
+double meridian(float value) {
+    if (std::abs(value) >= exactPi) return -3.1415927f;
+    return finite(value);
+}
+
+double latitudeOf(float value) { return std::isnan(value) ? 0 : value; }
+
+float coverOf(float value) { return value > 0 ? std::min(value, 1.0f) : 0; }
+
+/// Solar time and clock, both ways.
+void tellTime(Daylight& out, const Ov::NaturalLightSettings& in, std::optional<float> solarTime, int day) {
+    const double equation = equationOfTime(day);
+    const double toMeridian = (meridian(in.timeZone) - meridian(in.longitude)) * 12 / exactPi;
+    const double saving = in.daylightSaving ? 1 : 0;
+    out.equationOfTime = single(equation);
+    out.clockShift = equation + toMeridian - saving;
+    if (solarTime) {
+        out.solarTime = *solarTime;
+        out.localTime = single(finite(*solarTime) + saving - equation - toMeridian);
+    } else {
+        out.solarTime = single(finite(in.localTime) - saving + equation + toMeridian);
+        out.localTime = in.localTime;
+    }
+}
+
+/// Where the sun stands, and when it crosses the horizon. Altitude and azimuth in full precision are the result.
+SolarPosition placeSun(Daylight& out, const Ov::NaturalLightSettings& in, int day) {
+    const LatitudeTerms latitude(latitudeOf(in.latitude));
+    const double declination = solarDeclination(day);
+    SolarPosition sun{finite(in.solarAltitude), finite(in.solarAzimuth)};
+    if (!in.overrideSolarPosition) sun = solarPosition(latitude, declination, finite(out.solarTime));
+    out.solarAltitude = single(sun.altitude);
+    out.solarAzimuth = single(sun.azimuth);
+    out.solarZenith = single(exactPi / 2 - sun.altitude);
+    const double turned = sun.azimuth + finite(in.north);
+    const double across = std::cos(sun.altitude);
+    out.sunDirection = {single(-std::sin(turned) * across), single(-std::cos(turned) * across),
+                        single(std::sin(sun.altitude))};
+    const double sunrise = sunriseSolarTime(latitude, declination);
+    out.sunrise = single(sunrise - out.clockShift);
+    out.sunset = single(24 - sunrise - out.clockShift);
+    out.solarNoon = single(12 - out.clockShift);
+    return sun;
+}
+
+void light(Daylight& out, const Ov::NaturalLightSettings& in, double altitude, int day) {
+    out.skyType = skyTypeOf(coverOf(in.skyCover));
+    const double direct = in.overrideSolarIlluminance ? finite(in.directNormalIlluminance)
+                                                      : directNormalIlluminance(out.skyType, altitude, day);
+    const double horizontal = skyHorizontalIlluminance(out.skyType, altitude);
+    const double zenith = zenithLuminance(out.skyType, altitude, horizontal);
+    out.directNormalIlluminance = single(direct);
+    out.directHorizontalIlluminance = single(std::sin(altitude) * direct + 0.0);  // at night no -0
+    out.skyHorizontalIlluminance = single(horizontal);
+    out.zenithLuminance = single(zenith);
+    out.maxDirectNormalIlluminance = single(maxSolarIlluminance);
+    std::ranges::transform(skyCoefficients(out.skyType, altitude, zenith), out.skyCoefficients.begin(), single);
+}
+
+/// A colour over its luminance.
+std::array<float, 3> normalized(const std::array<float, 3>& color) {
+    const double luminance = 0.263 * std::abs(color[0]) + 0.655 * std::abs(color[1]) + 0.082 * std::abs(color[2]);
+    if (!(luminance >= 0.0001) || !std::isfinite(luminance)) return {1, 1, 1};
+    return {single(color[0] / luminance), single(color[1] / luminance), single(color[2] / luminance)};
+}
+
+SkyModel modelOf(const Daylight& daylight) {
+    SkyModel sky{daylight.skyType, {}};
+    std::ranges::copy(daylight.skyCoefficients, sky.c.begin());
+    return sky;
+}
+
+Vector vectorOf(const float v[3]) { return {v[0], v[1], v[2]}; }
+
+}  // namespace
+
+Daylight computeDaylight(const Ov::NaturalLightSettings& settings, std::optional<float> solarTime) {
+    Daylight out;
+    const int day = std::clamp<int>(settings.day, 1, daysInYear);
+    tellTime(out, settings, solarTime, day);
+    const SolarPosition sun = placeSun(out, settings, day);
+    light(out, settings, sun.altitude, day);
+    out.sunColor = normalized(settings.sunColor);
+    out.skyColor = normalized(settings.skyColor);
+    return out;
+}
+
+double skyLuminance(const Daylight& daylight, const float direction[3]) {
+    const Vector d = vectorOf(direction);
+    const Vector sun = vectorOf(daylight.sunDirection.data());
+    return skyLuminance(modelOf(daylight), d[2], d[0] * sun[0] + d[1] * sun[1] + d[2] * sun[2]);
+}
+
+double skyLuminanceAt(const Daylight& daylight, double zenithAngle, double azimuth) {
+    const double angle = inRadians(zenithAngle);
+    // As a sine, so that it is exactly 0 at the horizon.
+    const double cosine = std::sin(inRadians(90 - zenithAngle));
+    const double zenith = daylight.solarZenith;
+    const double cosineOfSun =
+        std::sin(zenith) * std::sin(angle) * std::cos(daylight.solarAzimuth - inRadians(azimuth)) +
+        std::cos(zenith) * cosine;
+    return skyLuminance(modelOf(daylight), cosine, cosineOfSun);
+}
+
+double skyIlluminance(const Daylight& daylight, const float normal[3], double north) {
+    return skyIlluminance(modelOf(daylight), vectorOf(daylight.sunDirection.data()), vectorOf(normal),
+                          std::isfinite(north) ? north : 0);
+}
+
+}  // namespace OvPhotometrics

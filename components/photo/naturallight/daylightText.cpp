@@ -1,0 +1,192 @@
+#include "components/photo/naturallight/daylightForms.h"
+
+#include <cwchar>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/photoWeb.h"
+#include "components/photo/naturallight/formParts.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+using Settings = Ov::NaturalLightSettings;
+using Ov::RnStream;
+namespace m = messages;
+
+class TextWriter {
+public:
+    explicit TextWriter(RnStream& out) : _out(out) {}
+
+    void number(const wchar_t* format, float value) { _out.formattedWrite(format, static_cast<double>(value)); }
+    void degrees(const wchar_t* format, float radians) { number(format, static_cast<float>(inDegrees(radians))); }
+    void word(const wchar_t* format, bool value, const wchar_t* whenFalse, const wchar_t* whenTrue) {
+        _out.formattedWrite(format, value ? whenTrue : whenFalse);
+    }
+    void color(const wchar_t* format, const std::array<float, 3>& c) {
+        _out.formattedWrite(format, static_cast<double>(c[0]), static_cast<double>(c[1]),
+                            static_cast<double>(c[2]));
+    }
+    void integer(const wchar_t* format, int value) { _out.formattedWrite(format, value); }
+
+private:
+    RnStream& _out;
+};
+
+void writeOverrides(TextWriter& text, const Settings& s) {
+    text.word(L"\nOverwrite Solar Position: %s\n", s.overrideSolarPosition, L"No", L"Yes");
+    if (s.overrideSolarPosition) {
+        text.number(L"Solar Altitude: %.16g\n", s.solarAltitude);
+        text.number(L"Solar Azimuth: %.16g\n", s.solarAzimuth);
+    }
+    text.word(L"Overwrite Solar Illuminance: %s\n", s.overrideSolarIlluminance, L"No", L"Yes");
+    if (s.overrideSolarIlluminance)
+        text.number(L"Direct Normal Solar Illuminance: %.16g\n", s.directNormalIlluminance);
+}
+
+/// Reads line after line. A line that fails is reported once and ends the reading: every operation answers false
+/// where its line cannot be read.
+class TextReader {
+public:
+    explicit TextReader(RnStream& in) : _in(in) {}
+
+    /// Reads `count` fields; `message` when there are fewer.
+    template <class... Targets>
+    bool fields(int count, unsigned message, const wchar_t* format, Targets*... targets) {
+        return _in.formattedRead(format, targets...) == count || fail(message);
+    }
+
+    bool number(unsigned message, const wchar_t* format, float& value) {
+        double read = 0;
+        if (!fields(1, message, format, &read)) return false;
+        value = static_cast<float>(read);
+        return true;
+    }
+
+    bool degrees(unsigned message, const wchar_t* format, float& radians) {
+        double read = 0;
+        if (!fields(1, message, format, &read)) return false;
+        radians = toRadians(read);
+        return true;
+    }
+
+    bool color(unsigned message, const wchar_t* format, std::array<float, 3>& c) {
+        return fields(3, message, format, &c[0], &c[1], &c[2]);
+    }
+
+    /// A word that starts with one of two others; `wordMessage` when it starts with neither.
+    bool word(unsigned message, unsigned wordMessage, const wchar_t* format, const wchar_t* whenFalse,
+              const wchar_t* whenTrue, bool& value) {
+        wchar_t word[4] = {};
+        if (!fields(1, message, format, word)) return false;
+        value = startsWith(word, whenTrue);
+        return value || startsWith(word, whenFalse) || fail(wordMessage);
+    }
+
+    /// "Yes", or any other word for no.
+    bool yes(unsigned message, const wchar_t* format, bool& value) {
+        wchar_t word[4] = {};
+        if (!fields(1, message, format, word)) return false;
+        value = startsWith(word, L"Yes");
+        return true;
+    }
+
+    bool flags(unsigned message, const wchar_t* format, void (*set)(Settings&, unsigned), Settings& s) {
+        unsigned short word = 0;
+        if (!fields(1, message, format, &word)) return false;
+        set(s, word);
+        return true;
+    }
+
+private:
+    static bool startsWith(const wchar_t* word, const wchar_t* start) {
+        return std::wcsncmp(word, start, std::wcslen(start)) == 0;
+    }
+    bool fail(unsigned message) {
+        reportFormError(message, _in.computeLineNb());
+        return false;
+    }
+
+    RnStream& _in;
+};
+
+/// What every release has.
+bool readCommon(TextReader& text, Settings& s) {
+    return text.word(m::lightOnOff, m::lightOnOffWord, L" Natural light is: %3s\n", L"Off", L"On", s.enabled) &&
+           text.word(m::lightInOut, m::lightInOutWord, L"In/Out: %3s\n", L"In", L"Out", s.outside) &&
+           text.degrees(m::lightNorth, L"North: %lg\n", s.north) &&
+           text.degrees(m::lightLatitude, L"Latitude: %lg\n", s.latitude) &&
+           text.degrees(m::lightLongitude, L"Longitude: %lg\n", s.longitude) &&
+           text.fields(1, m::lightDay, L"Day: %hd\n", &s.day) &&
+           text.word(m::lightDaylightSaving, m::lightDaylightSavingWord, L"Daylight Savings Time: %3s\n", L"No",
+                     L"Yes", s.daylightSaving) &&
+           text.number(m::lightLocalTime, L"Local Time: %lg\n", s.localTime) &&
+           text.number(m::lightTimeZone, L"Time Zone: %lg\n", s.timeZone) &&
+           text.number(m::lightSkyCover, L"Sky Cover: %lg\n", s.skyCover) &&
+           text.color(m::lightSunColor, L"Sun Color: %g %g %g\n", s.sunColor) &&
+           text.color(m::lightSkyColor, L"Sky Color: %g %g %g\n", s.skyColor);
+}
+
+bool readPosition(TextReader& text, Settings& s) {
+    if (!text.word(m::lightOverwritePosition, m::lightOverwritePositionWord, L"Overwrite Solar Position: %3s\n",
+                   L"No", L"Yes", s.overrideSolarPosition))
+        return false;
+    return !s.overrideSolarPosition ||
+           (text.number(m::lightSolarAltitude, L"Solar Altitude: %lg\n", s.solarAltitude) &&
+            text.number(m::lightSolarAzimuth, L"Solar Azimuth: %lg\n", s.solarAzimuth));
+}
+
+bool readIlluminance(TextReader& text, Settings& s) {
+    if (!text.word(m::lightOverwriteIlluminance, m::lightOverwriteIlluminanceWord,
+                   L"Overwrite Solar Illuminance: %3s\n", L"No", L"Yes", s.overrideSolarIlluminance))
+        return false;
+    return !s.overrideSolarIlluminance ||
+           text.number(m::lightDirectNormalIlluminance, L"Direct Normal Solar Illuminance: %lg\n",
+                       s.directNormalIlluminance);
+}
+
+bool readFlags(TextReader& text, Settings& s) {
+    return text.flags(m::lightSunFlags, L"Sun Flags: 0x%hx\n", setSunFlags, s) &&
+           text.flags(m::lightSkyFlags, L"Sky Flags: 0x%hx\n", setSkyFlags, s);
+}
+
+}  // namespace
+
+void writeDaylightText(RnStream& out, const Settings& s) {
+    TextWriter text(out);
+    out.formattedWrite(L"Marovendel Natural Light Version %d, Release %d\n\n", formVersion, formRelease);
+    text.word(L"Natural light is: %s\n", s.enabled, L"Off", L"On");
+    text.word(L"In/Out: %s\n", s.outside, L"In", L"Out");
+    text.degrees(L"North: %.16g\n", s.north);
+    text.degrees(L"Latitude: %.16g\n", s.latitude);
+    text.degrees(L"Longitude: %.16g\n", s.longitude);
+    text.integer(L"Day: %d\n", s.day);
+    text.word(L"Daylight Savings Time: %s\n", s.daylightSaving, L"No", L"Yes");
+    text.number(L"Local Time: %.16g\n", s.localTime);
+    text.number(L"Time Zone: %.16g\n", s.timeZone);
+    text.number(L"Sky Cover: %.16g\n", s.skyCover);
+    text.color(L"Sun Color: %.16g %.16g %.16g\n", s.sunColor);
+    text.color(L"\nSky Color: %.16g %.16g %.16g\n", s.skyColor);
+    writeOverrides(text, s);
+    text.integer(L"Sun Flags: 0x%x\n", sunFlagWord(s));
+    text.integer(L"Sky Flags: 0x%x\n", skyFlagWord(s));
+    text.number(L"Sky Shadows Accuracy: %.3g\n", s.skyShadowAccuracy);
+    out.formattedWrite(L"\n");
+}
+
+std::optional<Settings> readDaylightText(RnStream& in) {
+    TextReader text(in);
+    Settings s;
+    int version = 0;
+    int release = 0;
+    const bool isRead =
+        text.fields(2, m::lightHeader, L" Marovendel Natural Light Version %d, Release %d", &version, &release) &&
+        readCommon(text, s) && (release < 1 || (readPosition(text, s) && readIlluminance(text, s))) &&
+        (release != 2 || text.yes(m::lightSkyCastsShadows, L"Sky Casts Shadows: %3s\n", s.skyCastsShadows)) &&
+        (release < 3 || readFlags(text, s)) &&
+        (release < 2 ||
+         text.number(m::lightSkyShadowsAccuracy, L"Sky Shadows Accuracy: %lg\n", s.skyShadowAccuracy));
+    return isRead ? std::optional(s) : std::nullopt;
+}
+
+}  // namespace OvPhotometrics

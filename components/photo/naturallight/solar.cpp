@@ -1,0 +1,48 @@
+#include "components/photo/naturallight/solar.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr double pi = std::numbers::pi;
+
+}  // namespace
+
+double equationOfTime(int day) {
+    return 0.17 * std::sin(4 * pi * (day - 80) / 373) - 0.129 * std::sin(2 * pi * (day - 8) / 355);
+}
+
+double solarDeclination(int day) { return 0.4093 * std::sin(2 * pi * (day - 81) / 368); }
+
+LatitudeTerms::LatitudeTerms(double latitude) {
+    const bool isPole = 2 * std::abs(latitude) > pi;
+    sine = isPole ? std::copysign(1.0, latitude) : std::sin(latitude);
+    cosine = isPole ? 0 : std::cos(latitude);
+}
+
+SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, double solarTime) {
+    const double hourAngle = solarTime * pi / 12;  // from midnight
+    const double sineOfDeclination = std::sin(declination);
+    const double cosineOfDeclination = std::cos(declination);
+    const double cosineOfHour = std::cos(hourAngle);
+    const double sineOfAltitude =
+        sineOfDeclination * latitude.sine - cosineOfDeclination * latitude.cosine * cosineOfHour;
+    const double west = -cosineOfDeclination * std::sin(hourAngle);
+    const double south =
+        -(cosineOfDeclination * latitude.sine * cosineOfHour + sineOfDeclination * latitude.cosine);
+    return {std::asin(std::clamp(sineOfAltitude, -1.0, 1.0)), std::atan2(west, south)};
+}
+
+double sunriseSolarTime(const LatitudeTerms& latitude, double declination) {
+    const double above = std::sin(declination) * latitude.sine;
+    const double swing = std::cos(declination) * latitude.cosine;
+    // At a pole the swing is 0 and the quotient infinite, unless the sun goes around on the horizon.
+    if (std::abs(above) >= swing && above != 0) return above > 0 ? 0 : 12;
+    return above == 0 ? 6 : std::acos(above / swing) * 12 / pi;
+}
+
+}  // namespace OvPhotometrics
