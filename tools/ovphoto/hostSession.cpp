@@ -1,13 +1,12 @@
 #include "tools/ovphoto/hostSession.h"
 
 #include <filesystem>
-#include <utility>
 
-#include "host/componentManager/processController.h"
 #include "host/componentManager/streamEx.h"
 #include "host/platform/file.h"
 #include "host/platform/path.h"
 #include "ovphoto/classIds.h"
+#include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/platform.h"
 
 namespace OvTool {
@@ -17,20 +16,6 @@ using namespace Ov;
 namespace {
 
 constexpr const wchar_t* webCategory = L"Photometric Web";
-
-/// Collects what is reported while it lives.
-class MessageCollector {
-public:
-    explicit MessageCollector(std::vector<std::string>& messages)
-        : _previous(setMessageReporter(
-              [&messages](int, const wchar_t* text) { messages.push_back(toUtf8(text ? text : L"")); })) {}
-    MessageCollector(const MessageCollector&) = delete;
-    MessageCollector& operator=(const MessageCollector&) = delete;
-    ~MessageCollector() { setMessageReporter(std::move(_previous)); }
-
-private:
-    MessageReporter _previous;
-};
 
 std::wstring findModule() {
     const std::filesystem::path folder = executableFolder();
@@ -64,7 +49,7 @@ std::vector<std::string> ReadResult::reasons() const {
 HostSession::HostSession(const std::string& modulePath)
     : _manager(rnCast<RnComponentManager>(RnGetComponentManager())) {
     const std::wstring path = modulePath.empty() ? findModule() : fromUtf8(modulePath);
-    _manager->loadModule(path.c_str());
+    _module = &_manager->loadModule(path.c_str());
 }
 
 std::vector<RnRef<RnComponentBuilder>> HostSession::webImporters() const {

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "host/componentManager/componentManager.h"
+#include "host/platform/module.h"
 #include "ovphoto/intensityDist.h"
 
 namespace OvTool {
@@ -28,6 +29,8 @@ public:
     explicit HostSession(const std::string& modulePath);
 
     Ov::RnComponentManager& manager() const { return *_manager; }
+    /// For what the module exports by number.
+    const Ov::Module& module() const { return *_module; }
 
     /// The builders that import photometric webs, in order of their names.
     std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImporters() const;
@@ -45,6 +48,7 @@ private:
     void import(ReadResult& result, const std::string& as) const;
 
     Ov::RnRef<Ov::RnComponentManager> _manager;
+    const Ov::Module* _module;
 };
 
 /// "IES" for the builder named "IES Web".

@@ -51,12 +51,15 @@ int parseAndRun(CLI::App& app, int argc, char** argv) {
 int main(int argc, char** argv) {
     prepareStandardStreams();
     std::ios::sync_with_stdio(false);
-    CLI::App app{"Reads, checks and converts photometric files of luminaires.", "ovphoto"};
+    CLI::App app{"Reads, checks and converts photometric files of luminaires; works out the light of sun and sky.",
+                 "ovphoto"};
     app.get_formatter()->label("SUBCOMMAND", "COMMAND");
     app.get_formatter()->label("TEXT", "");
     app.footer(
         "Exit status: 0 all well, 1 a file was refused or could not be read or written, 2 wrong usage.\n"
-        "Angles are in degrees: theta from the axis, psi around it.");
+        "Angles are in degrees: theta from the axis, psi around it; latitudes positive towards north, "
+        "longitudes,\n"
+        "time zones and azimuths (0 is south) towards west.");
     const int status = parseAndRun(app, argc, argv);
     if (std::cout.flush()) return status;
     std::cerr << "ovphoto: standard output cannot be written\n";

@@ -10,7 +10,7 @@ namespace OvTool {
 namespace {
 
 std::string formatDouble(double value, std::chars_format format, int precision) {
-    char text[64];
+    char text[400];  // the largest double has 309 digits before its point
     const auto result = std::to_chars(std::begin(text), std::end(text), value, format, precision);
     return {text, result.ptr};
 }
@@ -48,6 +48,12 @@ std::string shortNumber(double value) {
     const int before = size >= 1 ? static_cast<int>(std::log10(size)) + 1 : 0;
     std::string text = formatDouble(value, std::chars_format::fixed, std::clamp(5 - before, 0, 5));
     dropTrailingZeros(text);
+    return text;
+}
+
+std::string fixedNumber(double value, int decimals) {
+    std::string text = formatDouble(value, std::chars_format::fixed, decimals);
+    if (text.front() == '-' && text.find_first_of("123456789in") == std::string::npos) text.erase(0, 1);
     return text;
 }
 

@@ -19,6 +19,8 @@ std::optional<float> parseFloat(std::string_view text);
 
 /// For people: about five significant digits, without trailing zeros.
 std::string shortNumber(double value);
+/// With `decimals` digits behind the point, for columns; never "-0".
+std::string fixedNumber(double value, int decimals);
 /// As many digits as the float needs to read back the same.
 std::string exactNumber(float value);
 

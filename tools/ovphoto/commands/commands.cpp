@@ -15,6 +15,11 @@ constexpr Command allCommands[] = {
     {"intensity", "Print the candela towards given directions", declareIntensity},
     {"convert", "Write a photometric file anew", declareConvert},
     {"check", "Read files and folders and list their faults", declareCheck},
+    {"sun", "Show where the sun stands and what light it and the sky give", declareSun},
+    {"sky", "Show the sky's luminance in a direction, or its light on a surface", declareSky},
+    {"settings", "Show or write saved settings of natural light", declareSettings},
+    {"zones", "List the time zones", declareZones},
+    {"months", "List the months", declareMonths},
 };
 
 }  // namespace
@@ -29,13 +34,16 @@ void addAsOption(CLI::App& app, std::string& as) {
         ->transform(CLI::IsMember({"IES", "CIBSE", "NIMB", "TBT"}, CLI::ignore_case).description(""));
 }
 
-void showReasons(const ReadResult& result) {
-    for (const std::string& reason : result.reasons()) std::cerr << result.file << ": " << reason << '\n';
+void showReasons(const std::string& file, const std::vector<std::string>& reasons) {
+    for (const std::string& reason : reasons) std::cerr << file << ": " << reason << '\n';
 }
 
-void printRefusal(const ReadResult& result) {
-    const std::vector<std::string> reasons = result.reasons();
-    printLine(Json{{"file", result.file}, {"error", reasons.front()}, {"messages", reasons}});
+void showReasons(const ReadResult& result) { showReasons(result.file, result.reasons()); }
+
+void printRefusal(const std::string& file, const std::vector<std::string>& reasons) {
+    printLine(Json{{"file", file}, {"error", reasons.front()}, {"messages", reasons}});
 }
+
+void printRefusal(const ReadResult& result) { printRefusal(result.file, result.reasons()); }
 
 }  // namespace OvTool

@@ -38,14 +38,21 @@ Action declareInfo(CLI::App& app);
 Action declareIntensity(CLI::App& app);
 Action declareConvert(CLI::App& app);
 Action declareCheck(CLI::App& app);
+Action declareSun(CLI::App& app);
+Action declareSky(CLI::App& app);
+Action declareSettings(CLI::App& app);
+Action declareZones(CLI::App& app);
+Action declareMonths(CLI::App& app);
 
 /// Options that several commands have: --json, and --as FORMAT (kept in capitals: "IES").
 void addJsonFlag(CLI::App& app, bool& json);
 void addAsOption(CLI::App& app, std::string& as);
 
 /// Shows on standard error, as `FILE: text`, what was reported while the file was read and why it was refused.
+void showReasons(const std::string& file, const std::vector<std::string>& reasons);
 void showReasons(const ReadResult& result);
-/// Prints a refused file's line of JSON.
+/// Prints a refused file's line of JSON; there is at least one reason.
+void printRefusal(const std::string& file, const std::vector<std::string>& reasons);
 void printRefusal(const ReadResult& result);
 
 }  // namespace OvTool

@@ -1,0 +1,27 @@
+#pragma once
+
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/naturalLight.h"
+
+namespace OvTool {
+
+/// Site, date, time and sky as the user gave them: a saved form to start from, and what to change in it.
+struct LightOptions {
+    std::string from;
+    std::vector<std::function<void(Ov::RnNaturalLight&)>> changes;
+};
+
+/// Declares the options. `options` must outlive the parsing.
+void addLightOptions(CLI::App& app, LightOptions& options);
+
+/// An object with the options applied. Null when the saved form is refused; its reasons have been shown then.
+Ov::RnRef<Ov::RnNaturalLight> makeLight(const HostSession& session, const LightOptions& options, bool json);
+
+/// Tells on standard error which settings are out of range, for commands that compute with them.
+void showOutOfRange(const Ov::RnNaturalLight& light);
+
+}  // namespace OvTool

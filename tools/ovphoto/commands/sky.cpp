@@ -1,0 +1,86 @@
+#include <cmath>
+#include <iostream>
+#include <memory>
+#include <optional>
+
+#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/parsedOption.h"
+#include "tools/ovphoto/json.h"
+#include "tools/ovphoto/lightText.h"
+
+namespace OvTool {
+
+using namespace Ov;
+
+namespace {
+
+using Vector = std::array<float, 3>;
+
+struct SkyOptions {
+    LightOptions light;
+    std::optional<float> zenith;  // degrees, with the azimuth
+    std::optional<float> azimuth;
+    std::optional<Vector> normal;
+    bool json = false;
+};
+
+/// The vector with length 1; one that has it, as far as floats can, stays as it is.
+Vector normalised(const Vector& v) {
+    const double length = std::hypot(double{v[0]}, double{v[1]}, double{v[2]});
+    if (std::abs(length - 1) < 1e-6) return v;
+    return {static_cast<float>(v[0] / length), static_cast<float>(v[1] / length),
+            static_cast<float>(v[2] / length)};
+}
+
+std::optional<Vector> parseNormal(std::string_view text) {
+    const auto vector = parseList<3>(text);
+    return vector == Vector{} ? std::nullopt : vector;
+}
+
+void printLuminance(RnNaturalLight& light, const SkyOptions& options) {
+    const float luminance = light.getSkyLuminanceAt(*options.zenith, *options.azimuth);
+    if (options.json) return printLine(Json{{"luminance", luminance}});
+    std::cout << shortNumber(luminance) << " cd/m2 at zenith angle " << shortNumber(*options.zenith)
+              << " deg, azimuth " << shortNumber(*options.azimuth)
+              << " deg\nAzimuth 0 is south, positive towards west.\n";
+}
+
+void printIlluminance(RnNaturalLight& light, const SkyOptions& options) {
+    const float illuminance = light.getSkyIlluminance(normalised(*options.normal).data());
+    if (options.json) return printLine(Json{{"illuminance", illuminance}});
+    std::cout << shortNumber(illuminance) << " lux from the sky on a surface that faces "
+              << shortNumber((*options.normal)[0]) << ", " << shortNumber((*options.normal)[1]) << ", "
+              << shortNumber((*options.normal)[2]) << "\nScene: x east, y north, z up, before north is turned.\n";
+}
+
+int runSky(const SkyOptions& options, const HostSession& session) {
+    const auto light = makeLight(session, options.light, options.json);
+    if (!light) return exitFailed;
+    showOutOfRange(*light);
+    options.normal ? printIlluminance(*light, options) : printLuminance(*light, options);
+    return exitWell;
+}
+
+}  // namespace
+
+Action declareSky(CLI::App& app) {
+    auto options = std::make_shared<SkyOptions>();
+    auto* zenith = addParsed(app, {"--zenith", "DEG", "Luminance at this angle from the zenith"}, parseFloat,
+                             [options = options.get()](float value) { options->zenith = value; });
+    auto* azimuth = addParsed(app, {"--azimuth", "DEG", "and this azimuth: 0 south, positive towards west"},
+                              parseFloat, [options = options.get()](float value) { options->azimuth = value; });
+    auto* normal = addParsed(
+        app, {"--normal", "X,Y,Z", "Illuminance of a surface that faces this way: x east, y north, z up"},
+        parseNormal, [options = options.get()](const Vector& value) { options->normal = value; });
+    zenith->needs(azimuth);
+    azimuth->needs(zenith);
+    normal->excludes(zenith, azimuth);
+    app.final_callback([options = options.get()] {
+        if (!options->zenith && !options->normal) throw CLI::RequiredError("--zenith and --azimuth, or --normal");
+    });
+    addLightOptions(app, options->light);
+    addJsonFlag(app, options->json);
+    return [options](const HostSession& session) { return runSky(*options, session); };
+}
+
+}  // namespace OvTool

@@ -1,0 +1,111 @@
+#include "tools/ovphoto/naturalLight.h"
+
+#include <algorithm>
+
+#include "host/componentManager/devices.h"
+#include "host/componentManager/persistant.h"
+#include "ovphoto/classIds.h"
+#include "tools/ovphoto/messageCollector.h"
+#include "tools/ovphoto/numbers.h"
+
+namespace OvTool {
+
+using namespace Ov;
+
+namespace {
+
+/// The first bytes of the input: in the binary form, version and release.
+std::string peek(RnBufferedIO& io) {
+    char bytes[4];
+    const int count = io.readBytes(bytes, sizeof bytes);
+    io.seek(0, 0);
+    return std::string(bytes, static_cast<std::size_t>(std::max(count, 0)));
+}
+
+/// The saved forms, told by content: version and release are small numbers of two bytes, so that NUL is among
+/// them.
+RnStream::Form formOf(const std::string& start) {
+    return start.find('\0') == std::string::npos ? RnStream::Form::text : RnStream::Form::binary;
+}
+
+/// The binary form of another version is taken, by the rules of the form, for the defaults.
+bool isForeign(const std::string& start) {
+    return formOf(start) == RnStream::Form::binary && start.substr(0, 2) != std::string("\1\0", 2);
+}
+
+bool loadFrom(RnNaturalLight& light, RnBufferedIO& io, std::vector<std::string>& reasons) {
+    const std::string start = peek(io);
+    RnStream stream(&io, formOf(start));
+    if (!rnCast<RnPersistant>(&light)->load(stream, 0, nullptr, nullptr)) return false;
+    if (isForeign(start)) reasons.push_back("of an unknown version; the defaults are taken");
+    return true;
+}
+
+std::string rangeNote(const char* what, float value, const char* unit, float taken) {
+    return std::string(what) + " " + shortNumber(value) + unit + " is out of range; computed with " +
+           shortNumber(taken) + unit;
+}
+
+}  // namespace
+
+RnRef<RnNaturalLight> createLight(const HostSession& session) {
+    const auto object = session.manager().createObject(OvPhotometrics::classIds::naturalLight);
+    if (!object) throw ExModule("the module builds no natural light");
+    return rnCast<RnNaturalLight>(object.get());
+}
+
+bool loadLight(RnNaturalLight& light, const std::string& file, std::vector<std::string>& reasons) {
+    std::string error;
+    try {
+        const MessageCollector collector(reasons);
+        const RnRef<RnBufferedIO> io = openFile(file, error);
+        if (io && loadFrom(light, *io, reasons)) return true;
+    } catch (...) {
+        error = "cannot be read: " + currentExceptionText();
+    }
+    if (error.empty() && reasons.empty()) error = "refused by the module";
+    if (!error.empty()) reasons.push_back(error);
+    return false;
+}
+
+std::string savedLight(RnNaturalLight& light, RnStream::Form form) {
+    const auto buffer = rnCreate<RnMemoryBuffer>();
+    RnStream stream(buffer.get(), form);
+    rnCast<RnPersistant>(&light)->save(stream);
+    return buffer->bytes();
+}
+
+std::vector<std::string> outOfRange(const RnNaturalLight& light) {
+    NaturalLightSettings settings;
+    light.getSettings(settings);
+    std::vector<std::string> notes;
+    const auto check = [&](const char* what, float value, const char* unit, float low, float high, float below,
+                           float above) {
+        if (value < low || value > high)
+            notes.push_back(rangeNote(what, value, unit, value < low ? below : above));
+    };
+    check("day", settings.day, "", 1, 365, 1, 365);
+    check("latitude", light.getLatitude(), " deg", -90, 90, -90, 90);
+    check("longitude", light.getLongitude(), " deg", -180, 180, -180, -180);
+    check("time zone", light.getTimeZone(), " deg", -180, 180, -180, -180);
+    check("sky cover", settings.skyCover, "", 0, 1, 0, 1);
+    return notes;
+}
+
+std::string dateText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+    const std::string day = "day " + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
+    if (light.getMonth() == 0) return day;
+    const std::string month = toUtf8(functions.getMonthName(light.getMonth()));
+    return std::to_string(light.getDayOfMonth()) + " " + month + ", " + day;
+}
+
+OvPhotometrics::NumberedFunctions findFunctions(const HostSession& session) {
+    const auto functions = OvPhotometrics::numberedFunctions(session.module());
+#define OVPHOTO_CHECK_EXPORT(number, name) \
+    if (!functions.name) throw ExModule("the module lacks its function " #number);
+    OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_CHECK_EXPORT)
+#undef OVPHOTO_CHECK_EXPORT
+    return functions;
+}
+
+}  // namespace OvTool

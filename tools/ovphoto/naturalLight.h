@@ -1,0 +1,32 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "host/componentManager/stream.h"
+#include "ovphoto/naturalLight.h"
+#include "ovphoto/numberedExports.h"
+#include "tools/ovphoto/hostSession.h"
+
+namespace OvTool {
+
+/// A new object of the module. Raises ExModule when the module builds none.
+Ov::RnRef<Ov::RnNaturalLight> createLight(const HostSession& session);
+
+/// Loads saved settings of either form into the object. False, with the reasons, when they are refused; then the
+/// object is as it was. Reasons may also tell what is odd about a file that was taken.
+bool loadLight(Ov::RnNaturalLight& light, const std::string& file, std::vector<std::string>& reasons);
+
+/// What the object's own save writes.
+std::string savedLight(Ov::RnNaturalLight& light, Ov::RnStream::Form form);
+
+/// Which settings lie outside their ranges, and what is computed with instead.
+std::vector<std::string> outOfRange(const Ov::RnNaturalLight& light);
+
+/// "21 June, day 172".
+std::string dateText(const Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions);
+
+/// The module's numbered functions. Raises ExModule when one is missing.
+OvPhotometrics::NumberedFunctions findFunctions(const HostSession& session);
+
+}  // namespace OvTool
