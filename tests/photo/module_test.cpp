@@ -52,9 +52,10 @@ TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
     auto visitor = Ov::rnVisitor<Ov::RnPtr<Ov::RnComponentBuilder>>(
         [&](Ov::RnPtr<Ov::RnComponentBuilder> builder) { names.insert(builder->getName()); });
     EXPECT_EQ(registry.enumerateBuilders(visitor), Ov::RnEnum::goOn);
-    EXPECT_EQ(names, (std::set<std::wstring>{L"IES Web", L"Isotropic Distribution", L"Web Distribution"}));
+    EXPECT_EQ(names, (std::set<std::wstring>{L"IES Web", L"Isotropic Distribution", L"Natural Lighting",
+                                             L"Web Distribution"}));
     EXPECT_EQ(registry.getBuilderCount(), names.size());
-    for (Ov::RnUid id : {ids::iesWeb, ids::isotropic, ids::webDistribution}) {
+    for (Ov::RnUid id : {ids::iesWeb, ids::isotropic, ids::naturalLight, ids::webDistribution}) {
         const auto builder = registry.getBuilder(id);
         ASSERT_TRUE(builder);
         EXPECT_TRUE(builder->hasInterface(Ov::RnBuilderDescription::iid));
