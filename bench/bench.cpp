@@ -10,6 +10,7 @@
 #include "components/photo/lid/component.h"
 #include "components/photo/lid/registration.h"
 #include "components/photo/lid/webDistribution.h"
+#include "components/photo/naturallight/daylightData.h"
 #include "host/componentManager/componentManager.h"
 #include "host/componentManager/devices.h"
 
@@ -146,11 +147,53 @@ void intensityAtUnit(benchmark::State& state) {
     askAll(state, [&](bench::Direction) { return light->intensityAtUnit(directions[next++ % directionCount]); });
 }
 
+/// One pass from the settings, by a change of the time and a question.
+void daylightPass(benchmark::State& state) {
+    const auto light = Ov::rnCreate<DaylightData>();
+    float hour = 0;
+    for (auto _ : state) {
+        light->setLocalTime(hour = hour < 23 ? hour + 0.1f : 0);
+        benchmark::DoNotOptimize(light->getZenithLuminance());
+    }
+}
+
+/// A horizontal surface, which faces all samples.
+void skyIlluminance(benchmark::State& state) {
+    const auto light = Ov::rnCreate<DaylightData>();
+    light->setSkyCover(static_cast<float>(state.range(0)) / 2);
+    const float up[3] = {0, 0, 1};
+    for (auto _ : state) benchmark::DoNotOptimize(light->getSkyIlluminance(up));
+}
+
+/// Calls `function` as often as the sky is sampled, with values from -1 to 1 in no order.
+template <class Function>
+void bareLoop(benchmark::State& state, Function function) {
+    std::vector<double> values;
+    for (int i = 0; i < 4096; ++i) values.push_back(std::cos(2.4 * i));
+    for (auto _ : state) {
+        double sum = 0;
+        for (const double value : values) sum += function(value);
+        benchmark::DoNotOptimize(sum);
+    }
+}
+
+void skyFloor(benchmark::State& state) {
+    bareLoop(state, [](double value) { return std::exp(-3 * std::acos(value)); });
+}
+
+void expFloor(benchmark::State& state) {
+    bareLoop(state, [](double value) { return std::exp(-3 * value); });
+}
+
 BENCHMARK(importIes)->Arg(0)->Arg(1);
 BENCHMARK(importFloor)->Arg(0)->Arg(1);
 BENCHMARK(getIntensity);
 BENCHMARK(intensityFloor);
 BENCHMARK(intensityAtUnit);
+BENCHMARK(daylightPass);
+BENCHMARK(skyIlluminance)->Arg(0)->Arg(1)->Arg(2);
+BENCHMARK(skyFloor);
+BENCHMARK(expFloor);
 
 /// Keeps the times of a run (the medians, where runs are repeated) and prints ours over the floor's.
 class RatioReporter : public benchmark::ConsoleReporter {
@@ -167,6 +210,9 @@ public:
         print("import 73 x 37, rate over from_chars", "importFloor/0", "importIes/0", "");
         print("import 361 x 721, rate over from_chars", "importFloor/1", "importIes/1", "0.5 at least");
         print("getIntensity 73 x 37, time over bare lookup", "getIntensity", "intensityFloor", "3.5 at most");
+        print("sky illuminance, time over 4096 acos and exp", "skyIlluminance/0", "skyFloor", "1.4 at most");
+        print("sky illuminance, time over 4096 exp", "skyIlluminance/0", "expFloor", "3.9 at most");
+        print("daylight pass, time over 4096 exp", "daylightPass", "expFloor", "0.05 at most");
     }
 
 private:

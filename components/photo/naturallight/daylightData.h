@@ -102,6 +102,9 @@ public:
     float getSkyLuminanceAt(float zenithAngle, float azimuth) override;
     void hook() override {}
 
+    /// Whether the derived values belong to the settings; else the next one asked for works them out.
+    bool isUpToDate() const { return _valid; }
+
 private:
     template <class T>
     void change(T& setting, const T& value) {
@@ -113,7 +116,7 @@ private:
 
     Ov::NaturalLightSettings _settings;
     Daylight _derived;
-    bool _valid = false;         // `_derived` belongs to the settings
+    bool _valid = false;
     bool _solarTimeSet = false;  // the solar time in `_derived` is the input, the local time follows
 };
 

@@ -19,7 +19,7 @@ double equationOfTime(int day) {
 double solarDeclination(int day) { return 0.4093 * std::sin(2 * pi * (day - 81) / 368); }
 
 LatitudeTerms::LatitudeTerms(double latitude) {
-    const bool isPole = 2 * std::abs(latitude) > pi;
+    const bool isPole = 2 * std::abs(latitude) >= pi;
     sine = isPole ? std::copysign(1.0, latitude) : std::sin(latitude);
     cosine = isPole ? 0 : std::cos(latitude);
 }

@@ -1,0 +1,324 @@
+#include <cstring>
+#include <random>
+
+#include "components/photo/naturallight/daylightData.h"
+#include "tests/photo/photoFixture.h"
+
+namespace OvPhotometrics {
+namespace {
+
+using Settings = Ov::NaturalLightSettings;
+using Form = Ov::RnStream::Form;
+
+/// A device whose source fails.
+class BrokenDevice : public Ov::RnMemoryBuffer {
+protected:
+    bool readMore() override { throw Ov::RnStreamEx::ExReadError("test", 7, "broken"); }
+};
+
+class LightForms : public Photo {
+protected:
+    bool load(const std::string& bytes, Form form) {
+        Ov::RnStream stream(Ov::rnCreate<Ov::RnMemoryBuffer>(bytes).get(), form);
+        return load(stream);
+    }
+    bool load(Ov::RnStream& stream) {
+        return Ov::rnCast<Ov::RnPersistant>(light.get())->load(stream, 0, nullptr, nullptr);
+    }
+    std::string save(Form form) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), form);
+        Ov::rnCast<Ov::RnPersistant>(light.get())->save(stream);
+        return io->bytes();
+    }
+    Settings settings() const {
+        Settings all;
+        light->getSettings(all);
+        return all;
+    }
+    /// Loads what must be refused and leave the object as it was; the report.
+    std::string refusal(const std::string& bytes, Form form) {
+        light->setLatitude(12);
+        const Settings before = settings();
+        EXPECT_FALSE(load(bytes, form));
+        EXPECT_EQ(settings(), before);
+        return log.take();
+    }
+
+    RnRef<DaylightData> light = Ov::rnCreate<DaylightData>();
+};
+
+/// Settings with every flag, word and override at random.
+Settings randomSettings(std::mt19937& random) {
+    const auto flag = [&] { return random() % 2 == 0; };
+    const auto value = [&] { return std::uniform_real_distribution<float>(-3, 3)(random); };
+    Settings s;
+    for (bool* b : {&s.enabled, &s.outside, &s.daylightSaving, &s.sunCastsShadows, &s.sunFlag2, &s.sunFlag3,
+                    &s.skyCastsShadows, &s.skyFlag2, &s.skyFlag3})
+        *b = flag();
+    for (float* f : {&s.north, &s.latitude, &s.longitude, &s.localTime, &s.timeZone, &s.skyCover}) *f = value();
+    s.day = static_cast<std::int16_t>(random());
+    s.skyShadowAccuracy = static_cast<float>(static_cast<int>(random() % 999)) / 1000;
+    s.sunColor = {value(), value(), value()};
+    s.skyColor = {value(), value(), value()};
+    s.overrideSolarPosition = flag();
+    if (s.overrideSolarPosition) s.solarAltitude = value(), s.solarAzimuth = value();
+    s.overrideSolarIlluminance = flag();
+    if (s.overrideSolarIlluminance) s.directNormalIlluminance = value() * 50000;
+    return s;
+}
+
+TEST_F(LightForms, ReadBackTheSame) {
+    std::mt19937 random(1);
+    for (int i = 0; i < 200; ++i) {
+        const Settings written = randomSettings(random);
+        for (const Form form : {Form::text, Form::binary}) {
+            light->setSettings(written);
+            const std::string bytes = save(form);
+            light->reset();
+            ASSERT_TRUE(load(bytes, form));
+            Settings read = settings();
+            if (form == Form::text) {  // degrees, which cost a rounding
+                EXPECT_FLOAT_EQ(read.north, written.north);
+                EXPECT_FLOAT_EQ(read.latitude, written.latitude);
+                EXPECT_FLOAT_EQ(read.longitude, written.longitude);
+                read.north = written.north, read.latitude = written.latitude, read.longitude = written.longitude;
+            }
+            EXPECT_EQ(read, written) << bytes;
+        }
+    }
+    EXPECT_EQ(log.take(), "");
+}
+
+TEST_F(LightForms, ObjectsFollowEachOtherInAStream) {
+    for (const Form form : {Form::text, Form::binary}) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), form);
+        for (const int day : {7, 8}) {
+            light->setDayOfYear(static_cast<std::uint16_t>(day));
+            stream << static_cast<const Ov::RnCastable*>(light.get());
+        }
+        io->seek(0, 0);
+        for (const int day : {7, 8}) {
+            const auto object = stream.readObject(&Ov::RnNaturalLight::iid);
+            EXPECT_EQ(Ov::rnCast<Ov::RnNaturalLight>(object.get())->getDayOfYear(), day);
+        }
+    }
+}
+
+/// The lines of a text form that has all sections of release 3, and what is reported without them.
+struct Line {
+    std::string key, value;
+    unsigned missing;
+    unsigned wrongWord = 0;  // for a word that is none of two
+    bool isAfterBlank = false;
+};
+
+const Line lines[] = {
+    {"Marovendel Natural Light Version ", "1, Release 3", 12898},
+    {"Natural light is: ", "On", 12899, 12900, true},
+    {"In/Out: ", "In", 12901, 12902},
+    {"North: ", "0", 12903},
+    {"Latitude: ", "41", 12904},
+    {"Longitude: ", "74", 12905},
+    {"Day: ", "172", 12906},
+    {"Daylight Savings Time: ", "Yes", 12907, 12908},
+    {"Local Time: ", "10", 12909},
+    {"Time Zone: ", "1.308996915817261", 12910},
+    {"Sky Cover: ", "0", 12911},
+    {"Sun Color: ", "1 0.949999988079071 0.8999999761581421", 12912},
+    {"Sky Color: ", "0.949999988079071 0.949999988079071 1", 12913, 0, true},
+    {"Overwrite Solar Position: ", "Yes", 12914, 12915, true},
+    {"Solar Altitude: ", "0.5", 12916},
+    {"Solar Azimuth: ", "-0.25", 12917},
+    {"Overwrite Solar Illuminance: ", "Yes", 12918, 12919},
+    {"Direct Normal Solar Illuminance: ", "50000", 12920},
+    {"Sun Flags: ", "0x100", 12922},
+    {"Sky Flags: ", "0x200", 12923},
+    {"Sky Shadows Accuracy: ", "0.5", 12924},
+};
+
+struct Text {
+    std::string text;
+    int line = 1;  // of what was changed
+
+    /// All lines, `changed` as `change` gives it (empty: left out).
+    template <class Change>
+    static Text with(const Line* changed, Change change) {
+        Text all;
+        for (const Line& l : lines) {
+            if (l.isAfterBlank) all.text += "\n";
+            if (&l == changed) all.line = 1 + static_cast<int>(std::ranges::count(all.text, '\n'));
+            all.text += &l == changed ? change(l) : l.key + l.value + "\n";
+        }
+        all.text += "\n";
+        return all;
+    }
+    static std::string whole() {
+        return with(nullptr, [](const Line&) { return ""; }).text;
+    }
+};
+
+TEST_F(LightForms, TextIsWrittenToTheByte) {
+    Settings s;
+    s.overrideSolarPosition = s.overrideSolarIlluminance = true;
+    s.solarAltitude = 0.5f;
+    s.solarAzimuth = -0.25f;
+    s.directNormalIlluminance = 50000;
+    light->setSettings(s);
+    EXPECT_EQ(save(Form::text), Text::whole());
+    ASSERT_TRUE(load(Text::whole(), Form::text));
+    EXPECT_EQ(settings(), s);
+}
+
+TEST_F(LightForms, EachLineHasItsOwnMessage) {
+    for (const Line& line : lines) {
+        SCOPED_TRACE(line.key);
+        const auto report = [](unsigned id, int at) {
+            return "12896 " + std::to_string(id) + " " + std::to_string(at);
+        };
+        const bool isLast = &line == std::end(lines) - 1;
+        const Text missing = Text::with(&line, [](const Line&) { return ""; });
+        // Reading stops where the next line starts, behind blank ones.
+        const int skipped = isLast || (&line)[1].isAfterBlank ? 1 : 0;
+        EXPECT_EQ(refusal(missing.text, Form::text), report(line.missing, missing.line + skipped));
+        const Text wrong = Text::with(&line, [](const Line& l) { return l.key + "Wrong\n"; });
+        const unsigned expected = line.wrongWord ? line.wrongWord : line.missing;
+        EXPECT_EQ(refusal(wrong.text, Form::text), report(expected, wrong.line));
+        const Text cut = Text::with(&line, [](const Line& l) { return l.key; });
+        const std::string ended = cut.text.substr(0, cut.text.find(line.key) + line.key.size());
+        EXPECT_EQ(refusal(ended, Form::text), report(line.missing, cut.line));
+    }
+}
+
+TEST_F(LightForms, TextOfOtherReleases) {
+    const std::string body = Text::whole().substr(Text::whole().find("Natural light is"));
+    const std::string common = body.substr(0, body.find("Overwrite Solar Position"));
+    const std::string overrides =
+        "Overwrite Solar Position: Yes\nSolar Altitude: 0.5\nSolar Azimuth: 1\nOverwrite Solar Illuminance: No\n";
+    const std::string accuracy = "Sky Shadows Accuracy: 0.25\n";
+    const std::string flags = "Sun Flags: 0x600\nSky Flags: 0xFFFF\n";
+    const struct {
+        const char* name;
+        std::string header, trailer;
+        bool isOverridden, sunCastsShadows, skyCastsShadows;
+        float accuracy;
+    } cases[] = {
+        {"0", "1, Release 0", "", false, true, false, 0.5f},
+        {"below 0", "1, Release -2", overrides, false, true, false, 0.5f},
+        {"1", "1, Release 1", overrides, true, true, false, 0.5f},
+        {"2, sky casts", "1, Release 2", overrides + "Sky Casts Shadows: Yes\n" + accuracy, true, true, true,
+         0.25f},
+        {"2, lower case", "1, Release 2", overrides + "Sky Casts Shadows: yes\n" + accuracy, true, true, false,
+         0.25f},
+        {"3", "1, Release 3", overrides + flags + accuracy, true, false, false, 0.25f},
+        {"later", "9, Release 12", overrides + flags + accuracy + "More: 1\n", true, false, false, 0.25f},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        ASSERT_TRUE(load("Marovendel Natural Light Version " + c.header + "\n" + common + c.trailer, Form::text));
+        const Settings s = settings();
+        EXPECT_EQ(s.overrideSolarPosition, c.isOverridden);
+        EXPECT_EQ(s.solarAzimuth, c.isOverridden ? 1 : 0);
+        EXPECT_EQ(s.sunCastsShadows, c.sunCastsShadows);
+        EXPECT_EQ(s.sunFlag3, c.sunCastsShadows);
+        EXPECT_EQ(s.skyCastsShadows, c.skyCastsShadows);
+        EXPECT_EQ(s.skyShadowAccuracy, c.accuracy);
+    }
+    const std::string release2 = "Marovendel Natural Light Version 1, Release 2\n" + common + overrides;
+    EXPECT_EQ(refusal(release2 + accuracy, Form::text).substr(0, 11), "12896 12921");
+    EXPECT_EQ(refusal(release2 + "Sky Casts Shadows: no\n", Form::text).substr(0, 11), "12896 12924");
+}
+
+TEST_F(LightForms, TextIsReadInThreeCharacterWords) {
+    const std::string text = Text::whole();
+    const auto replaced = [&](const char* from, const char* to) {
+        std::string other = text;
+        return other.replace(other.find(from), std::strlen(from), to);
+    };
+    EXPECT_TRUE(load(replaced("is: On\n", "is: One\n"), Form::text));
+    EXPECT_EQ(refusal(replaced("is: On\n", "is: Onward\n"), Form::text), "12896 12901 3");
+    EXPECT_EQ(refusal(replaced("is: On\n", "is: on\n"), Form::text).substr(0, 11), "12896 12900");
+    EXPECT_EQ(refusal(replaced("172", "40000"), Form::text).substr(0, 11), "12896 12906");
+    EXPECT_TRUE(load(replaced("is: On\n", "is:Off In/Out: Out\n#"), Form::text) == false);
+    EXPECT_TRUE(load(replaced("\nIn/Out", " In/Out"), Form::text));
+}
+
+TEST_F(LightForms, BinaryIsLittleEndianAtFixedPlaces) {
+    Settings s;
+    s.day = -2;
+    s.skyCover = 1;
+    s.timeZone = 0.5f;
+    s.directNormalIlluminance = -2;
+    s.sunFlag2 = false;
+    light->setSettings(s);
+    const std::string bytes = save(Form::binary);
+    ASSERT_EQ(bytes.size(), 116U);
+    const struct {
+        std::size_t offset;
+        std::string_view bytes;
+    } cases[] = {
+        {0, {"\1\0\3\0\1\0\0\0\0\0\0\0", 12}},                       // version, release, on, in, padding
+        {36, {"\xFE\xFF\xFF\xFF\1\0\0\0\0\0\x20\x41\0\0\0\0", 16}},  // day, saving, 10.0, padding
+        {52, {"\0\0\0\0\0\0\xE0\x3F\0\0\x80\x3F", 12}},              // time zone 0.5, cover 1
+        {84, {"\0\0\x80\x3F\0\0\0\0\0\0\0\0", 12}},                  // blue of the sky, padding, overrides
+        {104, {"\0\0\0\xC0\0\0\0\x3F\0\5\0\2", 12}},                 // illuminance -2, accuracy 0.5, flags
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(std::string_view(bytes).substr(c.offset, c.bytes.size()), c.bytes) << c.offset;
+}
+
+TEST_F(LightForms, BinaryOfOtherReleases) {
+    light->setOverrideSolarPosition(true);
+    light->setSolarPosition(0.5f, 1);
+    light->setSkyShadowAccuracy(0.25f);
+    light->setSunCastsShadows(false);
+    light->setSkyFlag3(true);
+    const Settings all = settings();
+    const std::string bytes = save(Form::binary);
+    const auto form = [&](char version, char release, const std::string& trailer) {
+        return std::string{version, 0, release, 0} + bytes.substr(4, 88) + trailer;
+    };
+    const std::string overrides = bytes.substr(92, 16);
+    const std::string accuracy = bytes.substr(108, 4);
+    Settings expected;
+    const auto check = [&](const std::string& input) {
+        light->setLatitude(3);
+        EXPECT_TRUE(load(input, Form::binary));
+        EXPECT_EQ(settings(), expected);
+        for (std::size_t size = 0; size < input.size(); ++size)
+            ASSERT_EQ(refusal(input.substr(0, size), Form::binary), "12896 12898 0") << size;
+    };
+    check(form(1, 0, ""));
+    expected.overrideSolarPosition = true;
+    expected.solarAltitude = 0.5f;
+    expected.solarAzimuth = 1;
+    check(form(1, 1, overrides));
+    expected.skyShadowAccuracy = 0.25f;
+    check(form(1, 2, overrides + std::string("\0\0", 2) + accuracy));
+    expected.skyCastsShadows = true;
+    check(form(1, 2, overrides + std::string("\0\1", 2) + accuracy));
+    expected = all;
+    check(bytes);
+    check(form(1, 9, bytes.substr(92)));
+
+    expected = Settings();
+    for (const char version : {'\0', '\2'}) {
+        light->setLatitude(3);
+        EXPECT_TRUE(load({version, 0, 3, 0}, Form::binary));
+        EXPECT_EQ(settings(), expected);
+    }
+}
+
+TEST_F(LightForms, FailuresOfTheStreamPassThrough) {
+    for (const Form form : {Form::text, Form::binary}) {
+        Ov::RnStream stream(Ov::rnCreate<BrokenDevice>().get(), form);
+        EXPECT_THROW(load(stream), Ov::RnStreamEx::ExReadError);
+    }
+    EXPECT_EQ(log.take(), "");
+    Ov::messageFile().setFileName(L"");
+    EXPECT_EQ(refusal("", Form::binary), "Message 12898.");
+}
+
+}  // namespace
+}  // namespace OvPhotometrics
