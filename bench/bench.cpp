@@ -165,11 +165,11 @@ void skyIlluminance(benchmark::State& state) {
     for (auto _ : state) benchmark::DoNotOptimize(light->getSkyIlluminance(up));
 }
 
-/// Calls `function` as often as the sky is sampled, with values from -1 to 1 in no order.
+/// Calls `function` as often as the sky is sampled, with values from 1 to -1.
 template <class Function>
 void bareLoop(benchmark::State& state, Function function) {
     std::vector<double> values;
-    for (int i = 0; i < 4096; ++i) values.push_back(std::cos(2.4 * i));
+    for (int i = 0; i < 4096; ++i) values.push_back(std::cos(i * 3.14159 / 4096));
     for (auto _ : state) {
         double sum = 0;
         for (const double value : values) sum += function(value);

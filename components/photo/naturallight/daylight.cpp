@@ -28,8 +28,8 @@ double latitudeOf(float value) { return std::isnan(value) ? 0 : value; }
 
 float coverOf(float value) { return value > 0 ? std::min(value, 1.0f) : 0; }
 
-/// Solar time and clock, both ways.
-void tellTime(Daylight& out, const Ov::NaturalLightSettings& in, std::optional<float> solarTime, int day) {
+/// Solar time and clock, both ways. The solar time in full precision is the result.
+double tellTime(Daylight& out, const Ov::NaturalLightSettings& in, std::optional<float> solarTime, int day) {
     const double equation = equationOfTime(day);
     const double toMeridian = (meridian(in.timeZone) - meridian(in.longitude)) * 12 / exactPi;
     const double saving = in.daylightSaving ? 1 : 0;
@@ -38,18 +38,20 @@ void tellTime(Daylight& out, const Ov::NaturalLightSettings& in, std::optional<f
     if (solarTime) {
         out.solarTime = *solarTime;
         out.localTime = single(finite(*solarTime) + saving - equation - toMeridian);
-    } else {
-        out.solarTime = single(finite(in.localTime) - saving + equation + toMeridian);
-        out.localTime = in.localTime;
+        return finite(*solarTime);
     }
+    const double time = finite(in.localTime) - saving + equation + toMeridian;
+    out.solarTime = single(time);
+    out.localTime = in.localTime;
+    return time;
 }
 
 /// Where the sun stands, and when it crosses the horizon. Altitude and azimuth in full precision are the result.
-SolarPosition placeSun(Daylight& out, const Ov::NaturalLightSettings& in, int day) {
+SolarPosition placeSun(Daylight& out, const Ov::NaturalLightSettings& in, double solarTime, int day) {
     const LatitudeTerms latitude(latitudeOf(in.latitude));
     const double declination = solarDeclination(day);
     SolarPosition sun{finite(in.solarAltitude), finite(in.solarAzimuth)};
-    if (!in.overrideSolarPosition) sun = solarPosition(latitude, declination, finite(out.solarTime));
+    if (!in.overrideSolarPosition) sun = solarPosition(latitude, declination, solarTime);
     out.solarAltitude = single(sun.altitude);
     out.solarAzimuth = single(sun.azimuth);
     out.solarZenith = single(exactPi / 2 - sun.altitude);
@@ -98,8 +100,8 @@ Vector vectorOf(const float v[3]) { return {v[0], v[1], v[2]}; }
 Daylight computeDaylight(const Ov::NaturalLightSettings& settings, std::optional<float> solarTime) {
     Daylight out;
     const int day = std::clamp<int>(settings.day, 1, daysInYear);
-    tellTime(out, settings, solarTime, day);
-    const SolarPosition sun = placeSun(out, settings, day);
+    const double time = tellTime(out, settings, solarTime, day);
+    const SolarPosition sun = placeSun(out, settings, time, day);
     light(out, settings, sun.altitude, day);
     out.sunColor = normalized(settings.sunColor);
     out.skyColor = normalized(settings.skyColor);

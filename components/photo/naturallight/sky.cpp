@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <numbers>
+#include <numeric>
 
 namespace OvPhotometrics {
 
@@ -96,29 +97,56 @@ struct BandProduct {
     double x, y, z;
 };
 
-/// Adds up all bands: `gradation` of a band times the sum of `indicatrix` (of the cosine of the angle from the
-/// sun) over those of its directions that the surface faces.
-template <class Gradation, class Indicatrix>
-double sumBands(const Vector& sun, const Vector& normal, Gradation gradation, Indicatrix indicatrix) {
-    const Samples& sampled = samples();
+using BandValues = std::array<double, azimuths>;
+
+/// The cosines between a vector and a band's directions; 0 for those that it does not face.
+BandValues facingOf(const Vector& v, const Samples::Band& band) {
+    const BandProduct product(v, band);
+    BandValues values;
+    std::ranges::transform(samples().azimuth, values.begin(),
+                           [&](const Samples::Terms& azimuth) { return std::max(0.0, product(azimuth)); });
+    return values;
+}
+
+/// The indicatrix over the directions of a band that the surface faces, times the cosines `facing`. In loops of
+/// one function each, which overlap in the processor as calls of two in turn do not.
+template <class Sky>
+double sumIndicatrix(const Vector& sun, const Samples::Band& band, const BandValues& facing) {
+    const BandProduct toSun(sun, band);
+    BandValues cosines;
+    std::ranges::transform(samples().azimuth, cosines.begin(),
+                           [&](const Samples::Terms& azimuth) { return std::clamp(toSun(azimuth), -1.0, 1.0); });
+    BandValues angles;
+    for (std::size_t j = 0; j < azimuths; ++j)
+        if (facing[j] > 0) angles[j] = std::acos(cosines[j]);
     double sum = 0;
-    for (const Samples::Band& band : sampled.zenith) {
-        const BandProduct toSurface(normal, band);
-        const BandProduct toSun(sun, band);
-        double bandSum = 0;
-        for (const Samples::Terms& azimuth : sampled.azimuth)
-            if (const double facing = toSurface(azimuth); facing > 0)
-                bandSum += facing * indicatrix(toSun(azimuth));
-        sum += gradation(band.cosine) * band.weight * bandSum;
-    }
+    for (std::size_t j = 0; j < azimuths; ++j)
+        if (facing[j] > 0) sum += facing[j] * Sky::indicatrix(angles[j], cosines[j]);
     return sum;
 }
 
+/// Adds up all bands: `gradation` of a band times `sum` over its directions that the surface faces.
+template <class Gradation, class Sum>
+double sumBands(const Vector& normal, Gradation gradation, Sum sum) {
+    double total = 0;
+    for (const Samples::Band& band : samples().zenith)
+        total += gradation(band.cosine) * band.weight * sum(band, facingOf(normal, band));
+    return total;
+}
+
 template <class Sky>
-double sumBands(const Vector& sun, const Vector& normal) {
+double sumSky(const Vector& sun, const Vector& normal) {
+    return sumBands(normal, Sky::gradation, [&](const Samples::Band& band, const BandValues& facing) {
+        return sumIndicatrix<Sky>(sun, band, facing);
+    });
+}
+
+double sumOvercastSky(const SkyCoefficients& c, const Vector& normal) {
     return sumBands(
-        sun, normal, [](double cosineOfZenith) { return Sky::gradation(cosineOfZenith); },
-        [](double cosineOfSun) { return indicatrixAt<Sky>(cosineOfSun); });
+        normal, [&](double cosine) { return overcastLuminance(c, cosine); },
+        [](const Samples::Band&, const BandValues& facing) {
+            return std::accumulate(facing.begin(), facing.end(), 0.0);
+        });
 }
 
 }  // namespace
@@ -198,12 +226,11 @@ double skyIlluminance(const SkyModel& sky, const Vector& sun, const Vector& norm
     const Vector n = turned(normal, north);
     switch (sky.type) {
         case SkyType::clear:
-            return sky.c[0] * sumBands<ClearSky>(s, n);
+            return sky.c[0] * sumSky<ClearSky>(s, n);
         case SkyType::partlyCloudy:
-            return sky.c[0] * sumBands<PartlyCloudySky>(s, n);
+            return sky.c[0] * sumSky<PartlyCloudySky>(s, n);
         default:
-            return sumBands(
-                s, n, [&](double cosine) { return overcastLuminance(sky.c, cosine); }, [](double) { return 1.0; });
+            return sumOvercastSky(sky.c, n);
     }
 }
 
