@@ -1,7 +1,6 @@
 #include "components/photo/naturallight/daylightData.h"
 
-#include <functional>
-
+#include "components/photo/naturallight/solar.h"
 #include "tests/photo/naturallight/lightSupport.h"
 #include "tests/photo/photoFixture.h"
 
@@ -38,56 +37,37 @@ TEST_F(Light, NewObjectsHaveTheDefaultsInDegrees) {
 }
 
 TEST_F(Light, SettersInvalidateWhatDependsOnThem) {
+    using L = DaylightData;
     const float color[3] = {1, 2, 3};
-    Ov::NaturalLightSettings all;
-    const struct {
-        const char* name;
-        std::function<void()> set;
-        bool invalidates;
-    } cases[] = {
-        {"settings", [&] { light->setSettings(all); }, true},
-        {"reset", [&] { light->reset(); }, true},
-        {"enabled", [&] { light->setEnabled(false); }, false},
-        {"outside", [&] { light->setOutside(true); }, false},
-        {"latitude", [&] { light->setLatitude(1); }, true},
-        {"longitude", [&] { light->setLongitude(1); }, true},
-        {"north", [&] { light->setNorth(1); }, true},
-        {"day", [&] { light->setDayOfYear(1); }, true},
-        {"date", [&] { light->setDate(1, 1); }, true},
-        {"zone in hours", [&] { light->setTimeZoneHours(1); }, true},
-        {"zone", [&] { light->setTimeZone(1); }, true},
-        {"daylight saving", [&] { light->setDaylightSaving(false); }, true},
-        {"local time", [&] { light->setLocalTime(1); }, true},
-        {"solar time", [&] { light->setSolarTime(1); }, true},
-        {"sky cover", [&] { light->setSkyCover(1); }, true},
-        {"accuracy", [&] { light->setSkyShadowAccuracy(1); }, true},
-        {"sun casts shadows", [&] { light->setSunCastsShadows(false); }, false},
-        {"sun flag 2", [&] { light->setSunFlag2(false); }, false},
-        {"sun flag 3", [&] { light->setSunFlag3(false); }, false},
-        {"sky casts shadows", [&] { light->setSkyCastsShadows(true); }, false},
-        {"sky flag 2", [&] { light->setSkyFlag2(false); }, false},
-        {"sky flag 3", [&] { light->setSkyFlag3(true); }, false},
-        {"sun color", [&] { light->setSunColor(color); }, true},
-        {"sky color", [&] { light->setSkyColor(color); }, true},
-        {"position, not overridden", [&] { light->setSolarPosition(1, 1); }, false},
-        {"illuminance, not overridden", [&] { light->setDirectNormalIlluminance(1); }, false},
-        {"override of the position", [&] { light->setOverrideSolarPosition(true); }, true},
-        {"override of the illuminance", [&] { light->setOverrideSolarIlluminance(true); }, true},
-        {"position", [&] { light->setSolarPosition(0.5f, 0.2f); }, true},
-        {"illuminance", [&] { light->setDirectNormalIlluminance(7); }, true},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.name);
+    const auto check = [&](bool invalidates, const auto& set) {
         light->getSunrise();
         ASSERT_TRUE(light->isUpToDate());
         const Ov::NaturalLightSettings before = settings();
-        c.set();
-        EXPECT_EQ(light->isUpToDate(), !c.invalidates);
-        EXPECT_TRUE(c.invalidates || settings() != before);
-        light->getSettings(all);
-        light->getLocalTime();
-        EXPECT_EQ(light->isUpToDate(), !c.invalidates) << "getters of settings do not compute";
-    }
+        set();
+        const Ov::NaturalLightSettings after = settings();
+        light->getLocalTime();  // getters of settings do not compute
+        EXPECT_EQ(light->isUpToDate(), !invalidates);
+        EXPECT_TRUE(invalidates || after != before);
+    };
+    for (const auto set : {&L::setLatitude, &L::setLongitude, &L::setNorth, &L::setTimeZoneHours, &L::setTimeZone,
+                           &L::setLocalTime, &L::setSolarTime, &L::setSkyCover, &L::setSkyShadowAccuracy})
+        check(true, [&] { (light.get()->*set)(1); });
+    for (const auto set : {&L::setSunColor, &L::setSkyColor}) check(true, [&] { (light.get()->*set)(color); });
+    check(true, [&] { light->setDayOfYear(1); });
+    check(true, [&] { light->setDate(1, 1); });
+    check(true, [&] { light->setSettings(settings()); });
+    check(true, [&] { light->reset(); });
+    for (const auto set :
+         {&L::setEnabled, &L::setSunCastsShadows, &L::setSunFlag2, &L::setSunFlag3, &L::setSkyFlag2})
+        check(false, [&] { (light.get()->*set)(false); });
+    for (const auto set : {&L::setOutside, &L::setSkyCastsShadows, &L::setSkyFlag3})
+        check(false, [&] { (light.get()->*set)(true); });
+    check(false, [&] { light->setSolarPosition(1, 1); });
+    check(false, [&] { light->setDirectNormalIlluminance(1); });
+    for (const auto set : {&L::setDaylightSaving, &L::setOverrideSolarPosition, &L::setOverrideSolarIlluminance})
+        check(true, [&] { (light.get()->*set)(true); });
+    check(true, [&] { light->setSolarPosition(0.5f, 0.2f); });
+    check(true, [&] { light->setDirectNormalIlluminance(7); });
     EXPECT_EQ(light->getSolarAltitude(), 0.5f);
     EXPECT_EQ(light->getSolarAzimuth(), 0.2f);
     EXPECT_FLOAT_EQ(light->getSolarZenith(), halfPi - 0.5f);
@@ -127,60 +107,54 @@ TEST_F(Light, SunriseIsWhenTheSunIsAtTheHorizon) {
 
 TEST_F(Light, SettingsOutOfRangeAreLimitedInTheComputationAlone) {
     const struct {
-        const char* name;
-        std::function<void(DaylightData&)> set, like;
+        void (DaylightData::*set)(float);
+        float given, like;
     } cases[] = {
-        {"day 0", [](auto& d) { d.setDayOfYear(0); }, [](auto& d) { d.setDayOfYear(1); }},
-        {"day 366", [](auto& d) { d.setDayOfYear(366); }, [](auto& d) { d.setDayOfYear(365); }},
-        {"day -1", [](auto& d) { d.setDayOfYear(65535); }, [](auto& d) { d.setDayOfYear(1); }},
-        {"no date", [](auto& d) { d.setDate(2, 29); }, [](auto& d) { d.setDayOfYear(1); }},
-        {"latitude", [](auto& d) { d.setLatitude(95); }, [](auto& d) { d.setLatitude(90); }},
-        {"south", [](auto& d) { d.setLatitude(-1e30f); }, [](auto& d) { d.setLatitude(-90); }},
-        {"longitude", [](auto& d) { d.setLongitude(180); }, [](auto& d) { d.setLongitude(-180); }},
-        {"far longitude", [](auto& d) { d.setLongitude(-300); }, [](auto& d) { d.setLongitude(-180); }},
-        {"zone", [](auto& d) { d.setTimeZoneHours(13); }, [](auto& d) { d.setTimeZone(-180); }},
-        {"cover", [](auto& d) { d.setSkyCover(7); }, [](auto& d) { d.setSkyCover(1); }},
+        {&DaylightData::setLatitude, 95, 90},       {&DaylightData::setLatitude, -1e30f, -90},
+        {&DaylightData::setLongitude, 180, -180},   {&DaylightData::setLongitude, -300, -180},
+        {&DaylightData::setTimeZoneHours, 13, -12}, {&DaylightData::setSkyCover, 7, 1},
+        {&DaylightData::setSkyCover, -7, 0},
     };
     for (const auto& c : cases) {
-        const auto a = Ov::rnCreate<DaylightData>();
-        const auto b = Ov::rnCreate<DaylightData>();
-        c.set(*a);
-        c.like(*b);
-        EXPECT_EQ(a->getSolarTime(), b->getSolarTime()) << c.name;
-        EXPECT_EQ(a->getSunDirection(), b->getSunDirection()) << c.name;
-        EXPECT_EQ(a->getSunrise(), b->getSunrise()) << c.name;
-        EXPECT_EQ(a->getZenithLuminance(), b->getZenithLuminance()) << c.name;
+        const auto other = Ov::rnCreate<DaylightData>();
+        light->reset();
+        (light.get()->*c.set)(c.given);
+        (other.get()->*c.set)(c.like);
+        EXPECT_EQ(light->getSunDirection(), other->getSunDirection()) << c.given;
+        EXPECT_EQ(light->getSunrise(), other->getSunrise()) << c.given;
+        EXPECT_EQ(light->getZenithLuminance(), other->getZenithLuminance()) << c.given;
     }
     light->setLatitude(95);
-    light->setDayOfYear(400);
-    light->getSunrise();
+    for (const auto& [given, like] : {std::pair(0, 1), std::pair(366, 365), std::pair(65535, 1)}) {
+        light->setDayOfYear(static_cast<std::uint16_t>(given));
+        EXPECT_EQ(light->getEquationOfTime(), static_cast<float>(equationOfTime(like)));
+        EXPECT_EQ(light->getDayOfYear(), given);
+        EXPECT_EQ(light->getMonth() + light->getDayOfMonth(), 0);
+    }
     EXPECT_EQ(light->getLatitude(), 95);
-    EXPECT_EQ(light->getDayOfYear(), 400);
-    EXPECT_EQ(light->getMonth() + light->getDayOfMonth(), 0);
+    light->setDate(2, 29);
+    EXPECT_EQ(light->getDayOfYear(), 0);
 }
 
 TEST_F(Light, NothingIsEverNotANumber) {
-    const float odd[] = {NAN, INFINITY, -INFINITY, 1e30f, -2, 2, 4, halfPi, 0};
-    for (const float value : odd)
-        for (const float cover : {0.0f, 0.5f, 1.0f, value}) {
-            Ov::NaturalLightSettings all;
-            all.latitude = all.longitude = all.timeZone = all.localTime = all.north = value;
-            all.sunColor = all.skyColor = {value, value, value};
-            all.solarAltitude = all.solarAzimuth = all.directNormalIlluminance = value;
-            all.skyCover = cover;
+    for (const float value : {NAN, INFINITY, -INFINITY, 1e30f, -2.0f, 2.0f, 4.0f, halfPi, 0.0f})
+        for (const float cover : {0.0f, 0.5f, 1.0f, value})
             for (const bool isOverridden : {false, true}) {
-                all.overrideSolarPosition = all.overrideSolarIlluminance = isOverridden;
-                const Daylight out = computeDaylight(all, isOverridden ? std::optional(value) : std::nullopt);
-                double sum = out.equationOfTime + out.sunrise + out.sunset + out.solarNoon + out.solarAltitude +
-                             out.solarAzimuth + out.solarZenith + out.directNormalIlluminance +
-                             out.directHorizontalIlluminance + out.skyHorizontalIlluminance + out.zenithLuminance;
-                for (const float c : out.skyCoefficients) sum += c;
-                for (int i = 0; i < 3; ++i) sum += out.sunDirection[i] + out.sunColor[i] + out.skyColor[i];
+                Ov::NaturalLightSettings in;
+                in.latitude = in.longitude = in.timeZone = in.localTime = in.north = value;
+                in.sunColor = {value, value, value};
+                in.solarAltitude = in.solarAzimuth = in.directNormalIlluminance = value;
+                in.skyCover = cover;
+                in.overrideSolarPosition = in.overrideSolarIlluminance = isOverridden;
+                const Daylight d = computeDaylight(in, isOverridden ? std::optional(value) : std::nullopt);
                 const float up[3] = {0, 0, 1};
-                sum += skyIlluminance(out, up, all.north) + skyLuminance(out, up);
+                double sum = d.sunrise + d.sunset + d.solarNoon + d.solarAltitude + d.solarAzimuth +
+                             d.directHorizontalIlluminance + d.skyHorizontalIlluminance + d.zenithLuminance +
+                             skyIlluminance(d, up, in.north) + skyLuminance(d, up);
+                for (const float c : d.skyCoefficients) sum += c;
+                for (std::size_t i = 0; i < 3; ++i) sum += d.sunDirection[i] + d.sunColor[i];
                 EXPECT_FALSE(std::isnan(sum)) << value << " " << cover << " " << isOverridden;
             }
-        }
 }
 
 }  // namespace
