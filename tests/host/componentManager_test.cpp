@@ -3,250 +3,227 @@
 #include <dlfcn.h>
 #include <gmock/gmock.h>
 
-#include "host/componentManager/devices.h"
+#include <thread>
+
 #include "host/componentManager/importer.h"
-#include "host/componentManager/streamEx.h"
 #include "host/platform/module.h"
-#include "host/platform/path.h"
+#include "ovphoto/classIds.h"
 #include "support/tempFolder.h"
-#include "testBuilders.h"
+#include "testObjects.h"
 
-namespace Ov {
-namespace {
-
+using namespace Ov;
+using namespace std::string_literals;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
-constexpr RnUid id(std::uint32_t w0) { return {w0, 0xa, 0xb, 0xc}; }
+/// The count that a further holder finds: holders minus one.
+long countOf(const RnCastable& object) {
+    object.newReference();
+    return object.release();
+}
 
-RnRef<RnComponentManager> manager() { return rnCast<RnComponentManager>(RnGetComponentManager()); }
+TEST(CastImpl, CountedObjectsEndWithTheirLastHolder) {
+    auto data = note(L"");
+    EXPECT_FALSE(data->hasInterface({0x11, 2, 3, 5}) || data->getInterface({0x11, 2, 3, 5}));
+    const auto hold = [&data] {
+        for (int i = 0; i < 20000; ++i) const RnRef<RnCastable> holder = data;
+    };
+    std::thread other(hold);
+    hold();
+    other.join();
+    EXPECT_EQ(countOf(*data), 0);
+    EXPECT_TRUE(data->hasInterface(NoteData::iid));
+    RnCastable* found = data->getInterface(NoteData::iid);
+    EXPECT_EQ(found, data.get());
+    EXPECT_EQ(countOf(*data), 1);
+    EXPECT_EQ(countOf(*rnCreate<Note>(*data)), 0);  // a copy has its own holders
+    EXPECT_EQ(found->release(), 0);
+    EXPECT_EQ(NoteData::alive(), 1);
+    EXPECT_EQ(data.detach()->release(), -1);
+    EXPECT_EQ(NoteData::alive(), 0);
+}
 
-std::vector<std::wstring> names(const std::vector<RnRef<RnComponentBuilder>>& builders) {
-    std::vector<std::wstring> all;
+TEST(CastImpl, AdaptersAreNewEachTimeAndHoldTheirData) {
+    auto data = note(L"");
+    EXPECT_TRUE(data->hasInterface(RnPersistant::iid));
+    auto first = rnCast<RnPersistant>(data.get()), second = rnCast<RnPersistant>(data.get());
+    EXPECT_NE(first.get(), second.get());
+    EXPECT_EQ(countOf(*first), 0);
+    EXPECT_EQ(countOf(*data), 2);
+    EXPECT_EQ(first->getInterface(NoteData::iid), nullptr);
+    data = {};
+    second = {};
+    EXPECT_EQ(NoteData::alive(), 1);
+    first = {};
+    EXPECT_EQ(NoteData::alive(), 0);
+}
+
+TEST(CastImpl, ASecondBaseAnswersWithItsOwnPart) {
+    ThingImportBuilder builder({7}, L"Import", "", {});
+    RnImportBuilder* part = &builder;
+    RnComponentBuilder* whole = &builder;
+    EXPECT_EQ(whole->getInterface(RnImportBuilder::iid), part);
+    EXPECT_EQ(part->getInterface(RnBuilderDescription::iid), whole);
+    EXPECT_EQ(part->getCastable(), whole->getCastable());
+    EXPECT_TRUE(part->hasInterface(RnBuilderDescription::iid) && whole->hasInterface(RnImportBuilder::iid));
+    EXPECT_FALSE(part->hasInterface(RnPersistant::iid));
+    // A static object: as many releases as one likes.
+    for (int i = 0; i < 3; ++i) EXPECT_EQ(part->release(), 0);
+}
+
+TEST(CastImpl, CastsThrowOrAskTheTranslators) {
+    const auto thing = rnCreate<ThingObject>();
+    EXPECT_THROW(rnCast<NoteData>(nullptr), ExBadCast);
+    EXPECT_FALSE(rnQuery<NoteData>(nullptr));
+    const RnTranslator toNewNote = [](RnCastable*, const RnUid& iid) -> RnCastable* {
+        return iid == NoteData::iid ? note(L"").detach() : nullptr;
+    };
+    RnAddTranslator(toNewNote);
+    EXPECT_EQ(countOf(*rnCast<NoteData>(thing.get())), 0);
+    EXPECT_THROW(rnCast<RnBufferedIO>(thing.get()), ExBase);
+    RnRemoveTranslator(toNewNote);
+    EXPECT_THROW(rnCast<NoteData>(thing.get()), std::bad_cast);
+    EXPECT_EQ(NoteData::alive(), 0);
+}
+
+TEST(PostLoadList, CallsInOrderOnceAndLetsGoEvenWhenOneThrows) {
+    const RnRef<Note> notes[] = {note(L"a"), note(L"b adds"), note(L"c"), note(L"d fails"), note(L"e")};
+    std::wstring finished;
+    {
+        RnPostLoadList list, other, ending;
+        const auto add = [&](RnPostLoadList& to, int i) { to.add(*rnCast<RnPersistant>(notes[i].get())); };
+        NoteData::whenFinished = [&](const std::wstring& text) {
+            finished += text[0];
+            if (text == L"b adds") add(list, 3), add(list, 4);
+            if (text == L"d fails") throw std::runtime_error("refused");
+        };
+        add(list, 0), add(list, 1), add(other, 2);
+        list.take(other);
+        list.take(list);
+        EXPECT_EQ(countOf(*notes[0]), 1);
+        EXPECT_THROW(list.finish(), std::runtime_error);
+        EXPECT_TRUE(list.empty() && other.empty());
+        add(list, 4), add(ending, 3);  // the end has nobody to tell
+    }
+    for (const auto& each : notes) EXPECT_EQ(countOf(*each), 0);
+    EXPECT_EQ(finished, L"abcdde");
+}
+
+Facts names(const std::vector<RnRef<RnComponentBuilder>>& builders) {
+    Facts all;
     for (const auto& builder : builders) all.push_back(builder->getName());
     return all;
 }
 
-/// A register with importers "Apple" and "Pear" (both take "fruit"), "Nut", and two builders that import nothing.
-class ComponentManager : public testing::Test {
-protected:
-    ComponentManager() {
-        manager()->addRegistry(first);
-        manager()->addRegistry(second);
-    }
-    ~ComponentManager() override {
-        manager()->removeRegistry(first);
-        manager()->removeRegistry(second);
-    }
-
-    ThingImportBuilder pear{id(1), L"Pear", "fruit", {L"pr", L"frt"}};
-    ThingImportBuilder nut{id(2), L"Nut", "nut", {L"nut"}};
-    ThingImportBuilder apple{id(3), L"Apple", "fruit", {L"frt"}};
-    ThingBuilder stone{id(4), L"Thing", L"Basalt"};
-    ThingBuilder cloud{id(5), L"Air", L"Zephyr"};
-    ThingBuilder impostor{id(2), L"Thing", L"Impostor"};
-    ThingRegistry first{{&pear, &stone, &nut}};
-    ThingRegistry second{{&impostor, &cloud, &apple}};
-    TempFolder folder;
-};
-
-TEST_F(ComponentManager, ClassesAreFoundByTheirWholeId) {
-    EXPECT_EQ(manager()->findBuilder(id(5)).get(), &cloud);
-    for (const RnUid& wrong :
-         {RnUid{6, 0xa, 0xb, 0xc}, RnUid{5, 0, 0xb, 0xc}, RnUid{5, 0xa, 0, 0xc}, RnUid{5, 0xa, 0xb, 0}}) {
-        EXPECT_FALSE(manager()->findBuilder(wrong));
-        EXPECT_FALSE(manager()->createObject(wrong));
-    }
-    const RnRef<RnCastable> object = manager()->createObject(id(5));
-    EXPECT_EQ(rnCast<Thing>(object.get())->classId, id(5));
-}
-
-TEST_F(ComponentManager, BuildersComeByCategoryAndName) {
-    EXPECT_THAT(names(manager()->builders()), ElementsAre(L"Zephyr", L"Apple", L"Basalt", L"Nut", L"Pear"));
-    EXPECT_THAT(names(manager()->builders(L"Thing")), ElementsAre(L"Apple", L"Basalt", L"Nut", L"Pear"));
-    EXPECT_THAT(names(manager()->builders(L"thing")), ElementsAre());
-}
-
-TEST_F(ComponentManager, TheFirstOfAClassCounts) {
-    EXPECT_EQ(manager()->findBuilder(id(2)).get(), static_cast<RnComponentBuilder*>(&nut));
-    manager()->addRegistry(first);  // counts once
-    manager()->removeRegistry(first);
-    EXPECT_EQ(manager()->findBuilder(id(2)).get(), &impostor);
-    EXPECT_THAT(names(manager()->builders()), ElementsAre(L"Zephyr", L"Apple", L"Impostor"));
-    EXPECT_FALSE(manager()->createObject(id(1)));
-}
-
-TEST_F(ComponentManager, ImportersAreFoundByContent) {
-    const auto fruit = rnCreate<RnMemoryBuffer>("..fruit"), nothing = rnCreate<RnMemoryBuffer>("");
-    fruit->seek(2, 0);
-    EXPECT_THAT(names(manager()->importersFor(L"Thing", fruit.get())), ElementsAre(L"Apple", L"Pear"));
-    EXPECT_EQ(fruit->seek(0, 1), 2);
-    EXPECT_THAT(names(manager()->importersFor(L"Thing", nothing.get())), ElementsAre());
-    EXPECT_THAT(names(manager()->importersFor(L"Air", fruit.get())), ElementsAre());
-}
-
-/// What an import leaves in the object: name, folder and content.
-std::vector<std::wstring> facts(const RnRef<RnCastable>& object) {
-    const auto thing = rnCast<Thing>(object.get());
-    return {thing->name, thing->basePath, fromUtf8(thing->firstBytes)};
-}
-
-TEST_F(ComponentManager, FilesAreImportedUnderTheirNames) {
-    const std::wstring path = folder.write("wall.v2.nut", "nut and bolt");
-    EXPECT_TRUE(nut.canImport(path.c_str(), nullptr));
-    EXPECT_FALSE(pear.canImport(path.c_str(), nullptr));
-    EXPECT_THAT(facts(nut.import(path.c_str(), nullptr)), ElementsAre(L"wall.v2", folder.wide(), L"nut"));
-    EXPECT_THAT(facts(nut.import(path.c_str(), L"")), ElementsAre(L"wall.v2", folder.wide(), L"nut"));
-    EXPECT_THAT(facts(nut.import(path.c_str(), L"/b")), ElementsAre(L"wall.v2", L"/b", L"nut"));
-}
+Facts facts(const RnRef<RnCastable>& object) { return rnCast<Thing>(object.get())->facts; }
 
 class TestImporter : public RnCastHeap<RnCastImpl<RnBaseImporter, RnImporter>> {
 public:
-    const wchar_t* getImportCategory() const override { return category; }
-    const wchar_t* category = L"Thing";
+    const wchar_t* getImportCategory() const override { return L"Thing"; }
 };
 
-TEST_F(ComponentManager, AFileThatCannotBeOpenedIsNamed) {
-    const auto importer = rnCreate<TestImporter>();
-    bool recognised = true;
-    for (const auto& [path, reason] : {std::pair{folder.wide("absent.nut"), "no such file"},
-                                       std::pair{folder.wide(), "folder"}, std::pair{std::wstring(), "no such"}}) {
-        EXPECT_FALSE(nut.canImport(path.c_str(), nullptr));
-        try {
-            nut.import(path.c_str(), nullptr);
-            ADD_FAILURE();
-        } catch (const RnStreamEx::ExReadError& e) {
-            EXPECT_THAT(e.what(), testing::AllOf(HasSubstr(toUtf8(path)), HasSubstr(reason)));
-            EXPECT_STREQ(e.getFile(), "host/componentManager/builder");
-        }
-        EXPECT_THROW(importer->import(path.c_str(), nullptr, recognised), RnStreamEx::ExReadError);
-        EXPECT_FALSE(recognised);
+/// A register with importers "Apple" and "Pear" (both take "fruit"), "Nut", and builders that import nothing.
+class ComponentManager : public testing::Test {
+protected:
+    ComponentManager() {
+        for (ThingRegistry* each : {&first, &second}) manager->addRegistry(*each);
     }
+    ~ComponentManager() override {
+        for (ThingRegistry* each : {&first, &second}) manager->removeRegistry(*each);
+    }
+
+    RnRef<RnComponentManager> manager = rnCast<RnComponentManager>(RnGetComponentManager());
+    ThingImportBuilder pear{{1, 7, 8, 9}, L"Pear", "fruit", {L"pr", L"frt"}};
+    ThingImportBuilder nut{{2, 7, 8, 9}, L"Nut", "nut", {L"nut"}};
+    ThingImportBuilder apple{{3, 7, 8, 9}, L"Apple", "fruit", {L"frt"}};
+    ThingBuilder stone{{4, 7, 8, 9}, L"Thing", L"Basalt"}, cloud{{5, 7, 8, 9}, L"Air", L"Zephyr"};
+    ThingBuilder impostor{{2, 7, 8, 9}, L"Thing", L"Impostor"};
+    ThingRegistry first{{&pear, &stone, &nut}}, second{{&impostor, &cloud, &apple}};
+    RnRef<TestImporter> importer = rnCreate<TestImporter>();
+    TempFolder folder;
+};
+
+TEST_F(ComponentManager, FindsTheFirstOfAClassByItsWholeId) {
+    for (const RnUid& wrong : {RnUid{6, 7, 8, 9}, RnUid{5, 0, 8, 9}, RnUid{5, 7, 0, 9}, RnUid{5, 7, 8, 0}})
+        EXPECT_FALSE(manager->findBuilder(wrong) || manager->createObject(wrong));
+    EXPECT_THAT(facts(manager->createObject({5, 7, 8, 9})), ElementsAre(L"Zephyr"));
+    EXPECT_THAT(facts(manager->createObject({2, 7, 8, 9})), ElementsAre(L"Nut"));
+    EXPECT_THAT(names(manager->builders()), ElementsAre(L"Zephyr", L"Apple", L"Basalt", L"Nut", L"Pear"));
+    EXPECT_THAT(names(manager->builders(L"Thing")), ElementsAre(L"Apple", L"Basalt", L"Nut", L"Pear"));
+    manager->addRegistry(first);  // counts once
+    manager->removeRegistry(first);
+    EXPECT_THAT(names(manager->builders()), ElementsAre(L"Zephyr", L"Apple", L"Impostor"));
 }
 
-TEST_F(ComponentManager, TheImporterOffersItsFamily) {
-    const auto importer = rnCreate<TestImporter>();
+TEST_F(ComponentManager, ImportsFilesByContentUnderTheirNames) {
+    const std::wstring path = folder.write("wall.v2.nut", "nut and bolt"), fruit = folder.write("a.nut", "fruit");
+    EXPECT_TRUE(nut.canImport(path.c_str(), nullptr));
+    EXPECT_FALSE(pear.canImport(path.c_str(), nullptr));
+    for (const wchar_t* base : {static_cast<const wchar_t*>(nullptr), L"", L"/b"}) {
+        const std::wstring where = base && *base ? base : folder.wide();
+        EXPECT_THAT(facts(nut.import(path.c_str(), base)),
+                    ElementsAre(L"Nut", L"wall.v2", where, L"nut and bolt"));
+        EXPECT_THAT(facts(importer->import(fruit.c_str(), base)), ElementsAre(L"Apple", L"a", where, L"fruit"));
+    }
+    EXPECT_STREQ(importer->getDefaultSearch(), L"*.frt;*.nut;*.pr");
     EXPECT_STREQ(importer->getFileTypes(),
                  L"All (*.frt;*.nut;*.pr)|*.frt;*.nut;*.pr|Apple (*.frt)|*.frt|Nut (*.nut)|*.nut|"
                  L"Pear (*.pr;*.frt)|*.pr;*.frt");
-    EXPECT_STREQ(importer->getDefaultSearch(), L"*.frt;*.nut;*.pr");
-    importer->category = L"Air";
-    EXPECT_STREQ(importer->getFileTypes(), L"");
-    EXPECT_STREQ(importer->getDefaultSearch(), L"");
-}
-
-struct Walk : RnEnumerator<RnCPtr<RnImportBuilder>> {
-    explicit Walk(std::size_t stopAfter) : limit(stopAfter) {}
-    RnEnum::Action visit(RnCPtr<RnImportBuilder> builder) override {
-        visited.push_back(builder.get());
-        return visited.size() < limit ? RnEnum::goOn : RnEnum::stop;
-    }
-    RnEnum::Action finish() override {
-        finished = true;
-        return RnEnum::stop;
-    }
-    std::size_t limit;
-    std::vector<const RnImportBuilder*> visited;
-    bool finished = false;
-};
-
-TEST_F(ComponentManager, TheImporterVisitsItsBuildersByName) {
-    const auto importer = rnCreate<TestImporter>();
-    Walk all(10), two(2);
-    EXPECT_EQ(importer->enumerateObjects(all), RnEnum::stop) << "what finish answers";
-    EXPECT_THAT(all.visited, ElementsAre(&apple, &nut, &pear));
-    EXPECT_TRUE(all.finished);
-    EXPECT_EQ(importer->enumerateObjects(two), RnEnum::stop);
-    EXPECT_THAT(two.visited, ElementsAre(&apple, &nut));
-    EXPECT_FALSE(two.finished);
-}
-
-TEST_F(ComponentManager, TheImporterTakesTheFirstThatAccepts) {
-    const auto importer = rnCreate<TestImporter>();
-    const std::wstring fruit = folder.write("a.nut", "fruit"), other = folder.write("b.nut", "other");
-    bool recognised = false;
-    const RnRef<RnCastable> object = importer->import(fruit.c_str(), nullptr, recognised);
-    EXPECT_TRUE(recognised);
-    EXPECT_EQ(rnCast<Thing>(object.get())->classId, apple.classId);
-    EXPECT_THAT(facts(object), ElementsAre(L"a", folder.wide(), L"fruit"));
-    EXPECT_THAT(facts(importer->import(fruit.c_str(), L"/b")), ElementsAre(L"a", L"/b", L"fruit"));
-
-    EXPECT_FALSE(importer->import(other.c_str(), nullptr, recognised));
+    bool recognised = true;
+    EXPECT_FALSE(importer->import(folder.write("b.nut", "other").c_str(), nullptr, recognised));
     EXPECT_FALSE(recognised);
+    EXPECT_TRUE(importer->import(path.c_str(), nullptr, recognised) && recognised);
 
-    const auto nuts = rnCreate<RnMemoryBuffer>("nut"), others = rnCreate<RnMemoryBuffer>("other");
-    EXPECT_THAT(facts(importer->import(nuts.get(), L"name", L"/c")), ElementsAre(L"name", L"/c", L"nut"));
-    EXPECT_FALSE(importer->import(others.get(), L"name", L"/c"));
+    const auto device = rnCreate<RnMemoryBuffer>("..fruit");
+    EXPECT_FALSE(importer->import(device.get(), L"name", L"/c"));
+    device->seek(2, 0);
+    EXPECT_THAT(names(manager->importersFor(L"Thing", device.get())), ElementsAre(L"Apple", L"Pear"));
+    EXPECT_THAT(names(manager->importersFor(L"Air", device.get())), ElementsAre());
+    EXPECT_THAT(facts(importer->import(device.get(), L"name", L"/c")),
+                ElementsAre(L"Apple", L"name", L"/c", L"fruit"));
 }
 
-const std::string moduleFile = OVPHOTO_BIN_DIR "/libhostTestModule.so";
-const std::string emptyModuleFile = OVPHOTO_BIN_DIR "/libhostEmptyModule.so";
-
-bool isLoaded(const std::string& file) {
-    void* handle = dlopen(file.c_str(), RTLD_NOW | RTLD_NOLOAD);
-    if (handle) dlclose(handle);
-    return handle != nullptr;
-}
-
-TEST(Module, IsLoadedOnceAndUnloaded) {
-    constexpr RnUid classId{7, 7, 7, 7};
-    const TempFolder folder;
-    std::filesystem::create_symlink(moduleFile, folder.path() / "link.so");
-    const std::wstring path = fromUtf8(moduleFile);
-
-    const ::Ov::Module& module = manager()->loadModule(path.c_str());
-    EXPECT_EQ(module.path(), path);
-    EXPECT_EQ(&manager()->loadModule(path.c_str()), &module);
-    EXPECT_EQ(&manager()->loadModule(folder.wide("link.so").c_str()), &module);
-    EXPECT_TRUE(rnQuery<Thing>(manager()->createObject(classId).get()));
-    EXPECT_THAT(names(manager()->builders(L"Module Thing")), ElementsAre(L"From a module"));
-
-    manager()->unloadModule(L"/elsewhere.so");
-    EXPECT_TRUE(manager()->findBuilder(classId));
-    manager()->unloadModule(folder.wide("link.so").c_str());
-    EXPECT_FALSE(manager()->findBuilder(classId));
-    EXPECT_FALSE(isLoaded(moduleFile));
-}
-
-TEST(Module, WhatCannotBeLoadedIsNamedAndNotKept) {
-    const TempFolder folder;
-    const std::wstring emptyModule = fromUtf8(emptyModuleFile);
-    const struct {
-        std::wstring path;
-        const char* reason;
-    } cases[] = {
-        {folder.wide("l\xC3\xA4mp.so"), "no such file"},
-        {folder.write("text\xE9.so", "text"), "file too short"},
-        {folder.wide(), "folder"},
-        {L"libm.so.6", "no such file"},
-        {L"", "no such file"},
-        {emptyModule, "RnGetComponentDescription"},
-    };
-    for (const auto& c : cases) {
-        try {
-            manager()->loadModule(c.path.c_str());
-            ADD_FAILURE() << toUtf8(c.path);
-        } catch (const ExModule& e) {
-            EXPECT_THAT(e.what(), testing::AllOf(HasSubstr(toUtf8(c.path)), HasSubstr(c.reason)));
-            EXPECT_STREQ(e.getReason(), e.what());
-        }
+template <class Exception, class F>
+std::string failureOf(F function) {
+    try {
+        function();
+    } catch (const Exception& e) {
+        return dynamic_cast<const ExBase&>(e).getDetailedReason();
     }
-    EXPECT_FALSE(isLoaded(emptyModuleFile));
-    EXPECT_THAT(manager()->builders(), ElementsAre());
+    return "nothing raised";
 }
 
-TEST(Module, NumberedExportsAreFound) {
-    const ::Ov::Module module(fromUtf8(moduleFile));
-    EXPECT_EQ(module.byOrdinal<int(int)>(422)(5), 10);
-    EXPECT_EQ(module.byOrdinal<int(int)>(431)(5), 15);
-    for (const std::uint32_t ordinal : {0u, 1u, 423u, 432u}) EXPECT_EQ(module.byOrdinal(ordinal), nullptr);
-    EXPECT_NE(module.byName("RnGetComponentDescription"), nullptr);
-    EXPECT_EQ(module.byName("twice"), nullptr);
-
-    const ::Ov::Module without(fromUtf8(emptyModuleFile));
-    EXPECT_EQ(without.byOrdinal(422), nullptr);
-    EXPECT_EQ(without.byOrdinal(0), nullptr);
+TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
+    const std::wstring text = folder.write("text\xE9.so", "text"),
+                       host = fromUtf8(OVPHOTO_BIN_DIR "/libOVhost.so");
+    for (const auto& [path, reason] :
+         {std::pair{folder.wide("l\xC3\xA4mp.so"), ": no such file"}, std::pair{folder.wide(), ": it is a folder"},
+          std::pair{L"libm.so.6"s, ": no such file"}}) {
+        bool recognised = true;
+        EXPECT_FALSE(nut.canImport(path.c_str(), nullptr));
+        EXPECT_THAT(failureOf<std::runtime_error>([&] { nut.import(path.c_str(), nullptr); }),
+                    HasSubstr(toUtf8(path) + reason + " (host/componentManager/builder, line "));
+        EXPECT_THROW(importer->import(path.c_str(), nullptr, recognised), RnStreamEx::ExReadError);
+        EXPECT_FALSE(recognised);
+        EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(path.c_str()); }),
+                    HasSubstr(toUtf8(path) + reason));
+    }
+    EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(text.c_str()); }),
+                HasSubstr("\xE9.so: file too short"));
+    EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(host.c_str()); }),
+                HasSubstr("RnGetComponentDescription"));
+    EXPECT_EQ(manager->builders().size(), 5U);
 }
 
-}  // namespace
-}  // namespace Ov
+TEST_F(ComponentManager, LoadsAModuleOnceAndUnloadsIt) {
+    const std::wstring path = fromUtf8(OVPHOTO_BIN_DIR "/libOVphoto.so"), link = folder.wide("link.so");
+    std::filesystem::create_symlink(nativePath(path), nativePath(link));
+    const Module& module = manager->loadModule(path.c_str());
+    EXPECT_EQ(&manager->loadModule(link.c_str()), &module);
+    EXPECT_EQ(Module(fromUtf8(OVPHOTO_BIN_DIR "/libOVhost.so")).byOrdinal(422), nullptr);
+    manager->unloadModule(L"/elsewhere.so");
+    EXPECT_TRUE(manager->createObject(OvPhotometrics::classIds::iesWeb));
+    manager->unloadModule(link.c_str());
+    EXPECT_FALSE(manager->findBuilder(OvPhotometrics::classIds::iesWeb));
+    EXPECT_FALSE(dlopen(toUtf8(path).c_str(), RTLD_NOW | RTLD_NOLOAD));
+}

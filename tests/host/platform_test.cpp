@@ -1,206 +1,117 @@
 #include <gmock/gmock.h>
-#include <sys/resource.h>
 #include <sys/stat.h>
 
 #include <cstdlib>
-#include <optional>
 
+#include "host/componentManager/processController.h"
 #include "host/platform/file.h"
 #include "host/platform/path.h"
 #include "host/sdk/util.h"
 #include "support/tempFolder.h"
+#include "testObjects.h"
 
-namespace Ov {
-namespace {
+using namespace Ov;
+using namespace std::string_literals;
 
-using std::string_literals::operator""s;
-
-/// The wide text of these characters, surrogates and others.
-std::wstring wide(std::initializer_list<char32_t> characters) {
-    std::wstring text;
-    for (const char32_t c : characters) text += static_cast<wchar_t>(c);
-    return text;
-}
-
-TEST(Utf8, BytesThatAreNoCharacterStandForThemselves) {
-    const struct {
-        const char* name;
-        std::string bytes;
-        std::wstring text;
-    } cases[] = {
-        {"ASCII and NUL", "a\0b"s, wide({'a', 0, 'b'})},
-        {"two, three and four bytes", "\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80", wide({0xE9, 0x20AC, 0x1F600})},
-        {"Latin-1", "\xE9t\xE9", wide({0xDCE9, 't', 0xDCE9})},
-        {"overlong slash", "\xC0\xAF", wide({0xDCC0, 0xDCAF})},
-        {"overlong in three bytes", "\xE0\x9F\xBF", wide({0xDCE0, 0xDC9F, 0xDCBF})},
-        {"overlong in four bytes", "\xF0\x8F\xBF\xBF", wide({0xDCF0, 0xDC8F, 0xDCBF, 0xDCBF})},
-        {"surrogate", "\xED\xA0\x80", wide({0xDCED, 0xDCA0, 0xDC80})},
-        {"above the last character", "\xF4\x90\x80\x80", wide({0xDCF4, 0xDC90, 0xDC80, 0xDC80})},
-        {"last character", "\xF4\x8F\xBF\xBF", wide({0x10FFFF})},
-        {"cut off by the end", "x\xE2\x82", wide({'x', 0xDCE2, 0xDC82})},
-        {"cut off by a character", "\xE2\x82g", wide({0xDCE2, 0xDC82, 'g'})},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.name);
-        EXPECT_EQ(fromUtf8(c.bytes), c.text);
-        EXPECT_EQ(toUtf8(c.text), c.bytes);
+TEST(Utf8, EveryCharacterAndAnyBytesComeBack) {
+    EXPECT_EQ(fromUtf8("a\0\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80\xE9t\xE2\x82g\xE2\x82"s),
+              L"a\0\xE9\x20AC\x1F600\xDCE9t\xDCE2\xDC82g\xDCE2\xDC82"s);
+    // Too many bytes, a surrogate, and above the last character.
+    for (const std::string bytes :
+         {"\xC0\xAF", "\xE0\x9F\xBF", "\xF0\x8F\xBF\xBF", "\xED\xA0\x80", "\xF4\x90\x80\x80"}) {
+        std::wstring each;
+        for (const char c : bytes) each += static_cast<wchar_t>(0xDC00 + static_cast<unsigned char>(c));
+        EXPECT_EQ(fromUtf8(bytes), each);
     }
-}
-
-TEST(Utf8, EveryCharacterComesBack) {
-    for (char32_t block = 0; block <= 0x10FFFF; block += 0x800) {
-        if (block == 0xD800) continue;
-        std::wstring text;
-        for (char32_t c = block; c < block + 0x800; ++c) text += static_cast<wchar_t>(c);
-        ASSERT_EQ(fromUtf8(toUtf8(text)), text) << std::hex << static_cast<unsigned>(block);
-    }
-}
-
-TEST(Utf8, AnyBytesComeBack) {
-    // All that differs in any rule: leads and trails at their limits, in every order.
+    std::wstring all;
+    for (wchar_t c = 0; c <= 0x10FFFF; c = c == 0xD7FF ? 0xE000 : c + 1) all += c;
+    EXPECT_TRUE(fromUtf8(toUtf8(all)) == all);
+    // Leads and trails at the limits of every rule, in every order.
     const std::string edges = "\x00\x41\x7F\x80\x8F\x90\x9F\xA0\xBF\xC0\xC2\xDF\xE0\xE1\xED\xEF\xF0\xF4\xF5\xFF"s;
-    for (char a : edges) {
-        for (char b : edges) {
-            for (char c : edges) {
-                for (char d : edges) {
-                    const std::string bytes{a, b, c, d};
-                    ASSERT_EQ(toUtf8(fromUtf8(bytes)), bytes) << testing::PrintToString(bytes);
-                }
-            }
-        }
+    for (std::size_t i = 0; i < 160000; ++i) {
+        const std::string any{edges[i % 20], edges[i / 20 % 20], edges[i / 400 % 20], edges[i / 8000]};
+        ASSERT_EQ(toUtf8(fromUtf8(any)), any) << testing::PrintToString(any);
     }
+    // A pair, half a pair, second halves, and no character.
+    EXPECT_EQ(toUtf8(L"\xD83D\xDE00\xD83Dx\xDC41\xDFFF\x110000"), "\xF0\x9F\x98\x80\uFFFDx\uFFFD\uFFFD\uFFFD");
 }
 
-TEST(Utf8, WideTextIsMadeUnicode) {
-    EXPECT_EQ(toUtf8(wide({0xD83D, 0xDE00})), "\xF0\x9F\x98\x80") << "a pair";
-    EXPECT_EQ(toUtf8(wide({0xD83D, 'x'})), "\xEF\xBF\xBDx") << "half a pair";
-    EXPECT_EQ(toUtf8(wide({0xDC41, 0xDFFF})), "\xEF\xBF\xBD\xEF\xBF\xBD") << "second halves, and no bytes";
-    EXPECT_EQ(toUtf8(wide({0x110000})), "\xEF\xBF\xBD");
-}
+class Files : public testing::Test {
+protected:
+    ~Files() override { setPathList(L"Lamps", {}); }
 
-TEST(Path, StemAndFolder) {
-    const struct {
-        const wchar_t *path, *stem, *folder;
-    } cases[] = {
-        {L"/lamps/wall.v2.ies", L"wall.v2", L"/lamps"},
-        {L"wall.ies", L"wall", L"."},
-        {L"a.b/wall", L"wall", L"a.b"},
-        {L"/wall", L"wall", L"/"},
-        {L"../.ies", L".ies", L".."},
-        {L"l\xE4mp\xDCE9.ies", L"l\xE4mp\xDCE9", L"."},
-    };
-    for (const auto& c : cases) {
-        EXPECT_EQ(pathStem(c.path), c.stem);
-        EXPECT_EQ(pathFolder(c.path), c.folder);
+    static std::string contents(const std::wstring& path) {
+        const RnRef<RnBufferedIO> device = openInputFile(path.c_str());
+        return device ? readRest(*device) : openFailure(path.c_str());
     }
-}
+    /// What is found, as a path in the folder of the test; "-" when nothing is.
+    std::string find(const std::wstring& name, const wchar_t* list = L"Lamps", const char* base = "base") const {
+        std::wstring result = L"left over";
+        const std::wstring basePath = base ? folder.wide(base) : L"";
+        rnCast<RnProcessController>(RnGetThreadProcessController())
+            ->findFile(result, name.c_str(), base ? basePath.c_str() : nullptr, list);
+        return result.empty() ? "-" : nativePath(result).lexically_relative(folder.path()).string();
+    }
 
-std::optional<std::string> contents(const std::wstring& path) {
-    const RnRef<RnBufferedIO> device = openInputFile(path.c_str());
-    if (!device) return std::nullopt;
-    std::string bytes;
-    for (int c = device->getChar(); c >= 0; c = device->getChar()) bytes += static_cast<char>(c);
-    return bytes;
-}
+    TempFolder folder;
+};
 
-TEST(InputFile, BytesAreReadAsTheyAre) {
-    const TempFolder folder;
+TEST_F(Files, OnlyRegularOnesOpenAndGiveTheirBytes) {
     const std::string bytes = "a\r\n\x1A\x00\xFF\n"s;
     folder.write("l\xC3\xA4mp \xE9.ies", bytes);  // a name that is only partly UTF-8
     EXPECT_EQ(contents(folder.wide() + L"/l\xE4mp \xDCE9.ies"), bytes);
-    std::filesystem::create_symlink(folder.path() / "l\xC3\xA4mp \xE9.ies", folder.path() / "link");
-    EXPECT_EQ(contents(folder.wide("link")), bytes);
-}
-
-TEST(InputFile, OnlyRegularFilesOpen) {
-    const TempFolder folder;
     ASSERT_EQ(mkfifo((folder.path() / "pipe").c_str(), 0600), 0);  // opening it would wait for a writer
-    std::filesystem::create_symlink(folder.path() / "pipe", folder.path() / "link");
-    const struct {
-        std::wstring path;
-        const char* reason;
-    } cases[] = {
-        {folder.wide(), "it is a folder"},
-        {folder.wide("pipe"), "it is not a regular file"},
-        {folder.wide("link"), "it is not a regular file"},
-        {L"/dev/null", "it is not a regular file"},
-        {folder.wide("absent"), "no such file"},
-        {folder.wide(std::string(5000, 'x')), "File name too long"},
-        {L"", "no such file"},
-    };
-    for (const auto& c : cases) {
-        EXPECT_EQ(contents(c.path), std::nullopt);
-        EXPECT_EQ(openFailure(c.path.c_str()), toUtf8(c.path) + ": " + c.reason);
-    }
+    std::filesystem::create_symlink("pipe", folder.path() / "link");
+    for (const auto& [path, reason] :
+         {std::pair{folder.wide(), "it is a folder"}, std::pair{folder.wide("link"), "it is not a regular file"},
+          std::pair{L"/dev/null"s, "it is not a regular file"}, std::pair{L""s, "no such file"},
+          std::pair{folder.wide(std::string(5000, 'x')), "File name too long"}})
+        EXPECT_EQ(contents(path), toUtf8(path) + ": " + reason);
     EXPECT_FALSE(openInputFile(nullptr));
+    EXPECT_EQ(pathFolder(L"l\xE4mp\xDCE9.v2.ies") + pathStem(L"l\xE4mp\xDCE9.v2.ies"), L".l\xE4mp\xDCE9.v2");
 }
 
-TEST(InputFile, ItIsClosedWithTheDevice) {
-    const TempFolder folder;
-    const std::wstring path = folder.write("a", "x");
-    rlimit before{};
-    getrlimit(RLIMIT_NOFILE, &before);
-    const rlimit few{32, before.rlim_max};
-    setrlimit(RLIMIT_NOFILE, &few);
-
-    for (int i = 0; i < 100; ++i) EXPECT_EQ(contents(path), "x");
-    std::vector<RnRef<RnBufferedIO>> open;
-    while (const auto device = openInputFile(path.c_str())) open.push_back(device);
-    const std::string failure = openFailure(path.c_str());
-    open.clear();
-    EXPECT_EQ(contents(path), "x");
-
-    setrlimit(RLIMIT_NOFILE, &before);
-    EXPECT_EQ(failure, toUtf8(path) + ": Too many open files");
+TEST_F(Files, AreFoundInTheOrderOfPlacesAndSpellings) {
+    for (const char* file : {"base/a", "one/a", "one/b", "two/b", "two/c", "elsewhere", "base/my lamp.tlt",
+                             "base/sub/lamp.tlt", "base/sub\\odd.tlt", "base/sub/odd.tlt", "base/\xC3\xA9.tlt",
+                             "base/\xE9.tlt", "base/\xE8.tlt", "base/\xC3\xBC/l.tlt"})
+        folder.write(file, "x");
+    setPathList(L"Lamps", {folder.wide("one"), L"", folder.wide("two")});
+    // Places; then a name as it stands before one with the other slash, the character before the two bytes that a
+    // reader takes it for, a byte that is no UTF-8, and bytes with the other slash.
+    for (const char* row :
+         {"a|base/a", "b|one/b", "c|two/c", "d|-", "sub|base/sub", " \t|-", "sub\\lamp.tlt|base/sub/lamp.tlt",
+          " \tmy lamp.tlt \t|base/my lamp.tlt", "sub\\odd.tlt|base/sub\\odd.tlt", "\u00E9.tlt|base/\u00E9.tlt",
+          "\u00C3\u00A9.tlt|base/\u00E9.tlt", "\u00E8.tlt|base/\xE8.tlt", "\u00C3\u00BC\\l.tlt|base/\u00FC/l.tlt",
+          "\u20AC\u00C3\u00A9.tlt|-"})
+        EXPECT_EQ(find(fromUtf8(cells(row)[0])), cells(row)[1]) << row;
+    EXPECT_EQ(find(folder.wide("elsewhere")), "elsewhere");
+    EXPECT_EQ(find(folder.wide("absent")) + find(std::wstring(5000, L'x')), "--");
+    EXPECT_EQ(find(L"a", L"Lamps", nullptr), "one/a");
+    EXPECT_EQ(find(L"b", L"Other") + find(L"b", nullptr), "--");
 }
 
-class Language : public testing::Test {
-protected:
-    ~Language() override {
-        set("", "", "");
-        WendSDK::Util::setLanguage(L"");
-    }
-    static void set(const char* all, const char* messages, const char* lang) {
-        setenv("LC_ALL", all, 1);
-        setenv("LC_MESSAGES", messages, 1);
-        setenv("LANG", lang, 1);
-    }
-};
+TEST(ProcessController, ReportsToItsReporterOrStandardError) {
+    const auto controller = rnCast<RnProcessController>(RnGetProcessController());
+    std::wstring heard;
+    setMessageReporter([&](int level, const wchar_t* text) { heard = std::to_wstring(level) + text; });
+    controller->report(3, L"c");
+    EXPECT_EQ(heard, L"3c");
+    setMessageReporter(nullptr);
+    testing::internal::CaptureStderr();
+    controller->report(0, L"l\xE4mp\xDCFF");
+    controller->report(0, nullptr);
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "l\xC3\xA4mp\xFF\n\n");
+}
 
-TEST_F(Language, IsTakenFromTheFirstVariableThatIsNotEmpty) {
-    const struct {
-        const char *all, *messages, *lang;
-        const wchar_t* language;
-    } cases[] = {
-        {"", "", "de_DE.UTF-8@euro", L"de"},
-        {"", "fr", "de", L"fr"},
-        {"C", "fr", "de", L""},
-        {"it@x", "fr", "de", L"it"},
-        {"", "", "POSIX", L""},
-        {"", "", "C.UTF-8", L""},
-        {"", "", "DE.utf8", L"de"},
-        {"", "", "../de", L""},
-        {"", "", "de/x_DE", L""},
-        {"", "", "d\xC3\xA9", L""},
-        {"", "", "_DE", L""},
-        {"", "", "de:en", L""},
-        {"", "", "", L""},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(testing::Message() << c.all << "|" << c.messages << "|" << c.lang);
+TEST(Language, IsTakenFromTheFirstVariableThatIsNotEmpty) {
+    for (const char* row : {"||de_DE.UTF-8@euro|de", "|fr|de|fr", "C|fr|de|", "it@x|fr|de|it", "||POSIX|",
+                            "||C.UTF-8|", "||DE.utf8|de", "||../de|", "||d\u00E9|", "||_DE|", "|||"}) {
+        const auto c = cells(row);
+        for (std::size_t i = 0; const char* name : {"LC_ALL", "LC_MESSAGES", "LANG"})
+            setenv(name, c[i++].c_str(), 1);
         WendSDK::Util::setLanguage(L"xx");
-        set(c.all, c.messages, c.lang);
         WendSDK::Util::UseLanguagePackLocale(nullptr);
-        EXPECT_EQ(WendSDK::Util::language(), c.language);
+        EXPECT_EQ(toUtf8(WendSDK::Util::language()), c[3]) << row;
     }
 }
-
-TEST_F(Language, SetDirectlyHoldsLettersOnly) {
-    WendSDK::Util::setLanguage(L"De");
-    EXPECT_EQ(WendSDK::Util::language(), L"de");
-    WendSDK::Util::setLanguage(L"../..");
-    EXPECT_EQ(WendSDK::Util::language(), L"");
-}
-
-}  // namespace
-}  // namespace Ov
