@@ -111,9 +111,7 @@ public:
         if (id == RnPersistant::iid) return rnCreate<Adapter>(static_cast<Self&>(*this)).detach();
         return Impl::getInterface(id);
     }
-    bool hasInterface(const RnUid& id) const override {
-        return id == RnPersistant::iid || Impl::hasInterface(id);
-    }
+    bool hasInterface(const RnUid& id) const override { return id == RnPersistant::iid || Impl::hasInterface(id); }
 };
 
 /// A data object: counted, answers `Interfaces` (Base derives from them) and saves itself through `Adapter`.

@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <cstdint>
+#include <numbers>
 #include <string>
 
 #include "components/messageFile/message.h"
@@ -87,7 +88,8 @@ float getTimeZoneMeridian(int index) {
 }
 
 int findTimeZone(float meridian) {
-    const float hours = meridian * 12.0F / pi;
+    // In double, rounded once: a meridian midway between two zones then lies exactly midway.
+    const auto hours = static_cast<float>(meridian * 12.0 / std::numbers::pi);
     int nearest = 0;
     for (int i = 1; i < zoneCount; ++i) {
         if (std::abs(zones[i].offset - hours) < std::abs(zones[nearest].offset - hours)) nearest = i;
