@@ -5,6 +5,7 @@
 #include <climits>
 #include <cmath>
 #include <limits>
+#include <numbers>
 #include <set>
 #include <string>
 
@@ -120,6 +121,8 @@ TEST(TimeZones, EveryMeridianFindsTheFirstZoneOfItsOffset) {
     EXPECT_EQ(findTimeZone(75 * degree), 2);
     EXPECT_EQ(findTimeZone(-120 * degree), 14);
     EXPECT_EQ(findTimeZone(56.25F * degree), 0);  // as far from 3.5 as from 4
+    EXPECT_EQ(findTimeZone(static_cast<float>(-10.5 * std::numbers::pi / 12)), 10);
+    EXPECT_EQ(findTimeZone(static_cast<float>(-7.25 * std::numbers::pi / 12)), 16);
     EXPECT_EQ(findTimeZone(1000), 8);
     EXPECT_EQ(findTimeZone(-1000), 9);
     for (float meridian : {infinity, -infinity, notANumber}) EXPECT_EQ(findTimeZone(meridian), 0);
