@@ -1,15 +1,39 @@
+#include "components/messageFile/message.h"
+
+#include <gtest/gtest.h>
 #include <sys/stat.h>
 
-#include "components/messageFile/message.h"
-#include "tests/messageFile/catalogueFiles.h"
+#include <cstdlib>
+#include <fstream>
+#include <iterator>
 
-namespace {
+#include "host/sdk/util.h"
+#include "tests/support/tempFolder.h"
 
-using Ov::RnMessageFile;
+namespace fs = std::filesystem;
 using Ov::RnMessageFileEx;
 
-class MessageFile : public CatalogueFiles {
+/// Compiled catalogues of one test, in a folder of its own. The language is none, until the test sets one.
+class MessageFile : public testing::Test {
 protected:
+    MessageFile() { WendSDK::Util::setLanguage(L""); }
+    ~MessageFile() override { WendSDK::Util::setLanguage(L""); }
+
+    /// Compiles messages ("5 text", one a line) to a file of the folder; its wide path.
+    std::wstring compile(const std::string& name, const std::string& messages) {
+        folder.write("source.msg", "$ codeset=UTF-8\n$set 1\n" + messages + "\n");
+        const fs::path file = folder.path() / name;
+        fs::create_directories(file.parent_path());
+        const std::string command =
+            "LC_ALL=C gencat '" + file.string() + ".new' '" + folder.path().string() + "/source.msg'";
+        EXPECT_EQ(std::system(command.c_str()), 0) << command;
+        fs::rename(file.string() + ".new", file);
+        return Ov::widePath(file);
+    }
+    static std::string bytesOf(const std::wstring& file) {
+        std::ifstream in(Ov::nativePath(file), std::ios::binary);
+        return {std::istreambuf_iterator<char>(in), {}};
+    }
     std::wstring textIn(const std::wstring& file, unsigned id = 5) {
         catalogue.setFileName(file.c_str());
         return catalogue.getText(id);
@@ -23,63 +47,45 @@ protected:
         }
     }
 
-    RnMessageFile catalogue;
+    TempFolder folder;
+    Ov::RnMessageFile catalogue;
 };
 
-TEST_F(MessageFile, LookupWithoutANameSaysSo) {
+TEST_F(MessageFile, LookupWithoutNameOrFileSaysSoAndTriesAgain) {
+    const std::wstring file = folder.wide() + L"/Me\u00dfwerte.cat";
     for (int i = 0; i < 2; ++i) {
+        catalogue.setFileName(i ? nullptr : L"");
         try {
             catalogue.format(5);
             FAIL();
         } catch (const RnMessageFileEx::ExNoFilename& e) {
-            EXPECT_STREQ(e.getReason(), "Message filename not set.");
             EXPECT_EQ(e.getDetailedReason(),
                       "Message filename not set. (components/messageFile/message, line 145)");
-            EXPECT_EQ(e.getCode(), 145);
         }
-        catalogue.setFileName(L"");
-    }
-    EXPECT_EQ(textIn(compile("a.cat", "5 five")), L"five");
-    catalogue.setFileName(nullptr);
-    EXPECT_THROW(catalogue.getText(5), std::runtime_error);
-}
-
-TEST_F(MessageFile, LookupWithoutTheFileNamesItAndTriesAgain) {
-    const std::wstring file = folder.wide() + L"/Me\u00dfwerte.cat";
-    catalogue.setFileName(file.c_str());
-    for (int i = 0; i < 2; ++i) {
+        catalogue.setFileName(file.c_str());
         try {
             catalogue.getText(5);
             FAIL();
-        } catch (const RnMessageFileEx::ExNoCatalogue& e) {
-            EXPECT_EQ(e.getReason(), Ov::toUtf8(file) + ": Cannot open message catalogue.");
-            EXPECT_STREQ(static_cast<const std::runtime_error&>(e).what(), e.getReason());
-            EXPECT_EQ(e.getCode(), 160);
+        } catch (const std::runtime_error& e) {
+            EXPECT_EQ(e.what(), Ov::toUtf8(file) + ": Cannot open message catalogue.");
+            EXPECT_EQ(dynamic_cast<const RnMessageFileEx::ExNoCatalogue&>(e).getCode(), 160);
         }
     }
     compile("Me\u00dfwerte.cat", "5 five");
     EXPECT_EQ(catalogue.getText(5), L"five");
-    EXPECT_EQ(catalogue.fileName(), file);
 }
 
-TEST_F(MessageFile, RefusesWhatIsNoCatalogue) {
-    std::filesystem::create_directory(folder.path() / "folder");
+TEST_F(MessageFile, RefusesWhatIsNoCatalogueOrCutShortAnywhere) {
     ASSERT_EQ(mkfifo((folder.path() / "pipe").c_str(), 0600), 0);
-    EXPECT_FALSE(opens(folder.wide("folder")));
-    EXPECT_FALSE(opens(folder.wide() + L"/"));
-    EXPECT_FALSE(opens(folder.wide("pipe")));
-    EXPECT_FALSE(opens(folder.wide("a.cat") + L"/a.cat"));
-    EXPECT_FALSE(opens(folder.write("text", "$set 1\n5 five, long enough for a header\n")));
-    EXPECT_FALSE(opens(folder.write("zeros", std::string(5000, '\0'))));
-    EXPECT_FALSE(opens(L"/proc/self/exe"));
-}
+    for (const std::wstring& path : {folder.wide(), folder.wide("pipe"), folder.wide("a.cat") + L"/a.cat",
+                                     folder.write("text", "$set 1\n5 five, long enough for a header\n"),
+                                     folder.write("zeros", std::string(5000, '\0'))})
+        EXPECT_FALSE(opens(path)) << Ov::toUtf8(path);
 
-TEST_F(MessageFile, RefusesACatalogueCutShortAnywhere) {
     const std::string small = bytesOf(compile("small.cat", "5 five\n6 six\n7 seven"));
     for (std::size_t length = 0; length < small.size(); ++length)
         EXPECT_FALSE(opens(folder.write("cut", small.substr(0, length)))) << length;
     EXPECT_TRUE(opens(folder.write("cut", small)));
-
     // Texts on pages that the file no longer has.
     const std::string large =
         bytesOf(compile("large.cat", "5 " + std::string(1900, 'a') + "\n6 " + std::string(9000, 'b')));
@@ -106,10 +112,8 @@ TEST_F(MessageFile, TextsByNumber) {
     EXPECT_EQ(catalogue.format(5, 7), L"Lichtst\u00e4rke 7");
     EXPECT_EQ(catalogue.getText(6), std::wstring(5000, L'x'));
     EXPECT_EQ(catalogue.getText(65535), L"last");
-    for (const unsigned id : {0u, 2u, 65536u, 65537u, 0x7FFFFFFFu, 0x80000001u, 0xFFFFFFFFu}) {
-        EXPECT_EQ(catalogue.getText(id), L"") << id;
-        EXPECT_EQ(catalogue.format(id, 7), L"") << id;
-    }
+    for (const unsigned id : {0u, 2u, 65536u, 65537u, 0x80000001u, 0xFFFFFFFFu})
+        EXPECT_EQ(catalogue.getText(id) + catalogue.format(id, 7), L"") << id;
 }
 
 TEST_F(MessageFile, AnOpenFileStaysUntilItsNameIsSetAgain) {
@@ -117,23 +121,19 @@ TEST_F(MessageFile, AnOpenFileStaysUntilItsNameIsSetAgain) {
     EXPECT_EQ(textIn(file), L"old");
     compile("a.cat", "5 new, and longer than the old one");
     EXPECT_EQ(catalogue.getText(5), L"old");
-    std::filesystem::remove(Ov::nativePath(file));
+    fs::remove(Ov::nativePath(file));
     EXPECT_EQ(catalogue.getText(5), L"old");
     EXPECT_FALSE(opens(file));
-    EXPECT_EQ(textIn(compile("a.cat", "5 newest")), L"newest");
 }
 
 TEST_F(MessageFile, TheLanguageSetInTheHostComesFirst) {
     const std::wstring file = compile("a.cat", "5 five\n6 six");
     compile("de/a.cat", "5 f\u00fcnf");
     folder.write("fr/a.cat", "no catalogue");
-    const struct {
-        const wchar_t* language;
-        const wchar_t* text;
-    } cases[] = {{L"", L"five"}, {L"de", L"f\u00fcnf"}, {L"it", L"five"}, {L"fr", L"five"}, {L"de", L"f\u00fcnf"}};
-    for (const auto& c : cases) {
-        WendSDK::Util::setLanguage(c.language);
-        EXPECT_EQ(textIn(file), c.text);
+    for (const auto& [language, text] : {std::pair{L"", L"five"}, std::pair{L"it", L"five"},
+                                         std::pair{L"fr", L"five"}, std::pair{L"de", L"f\u00fcnf"}}) {
+        WendSDK::Util::setLanguage(language);
+        EXPECT_EQ(textIn(file), text);
         EXPECT_EQ(catalogue.fileName(), file);
     }
     // A pack stands alone: what it lacks is not looked for elsewhere. It is chosen when the file is opened.
@@ -143,19 +143,15 @@ TEST_F(MessageFile, TheLanguageSetInTheHostComesFirst) {
 }
 
 TEST_F(MessageFile, ANameWithoutAFolderIsOneOfTheCurrentFolder) {
-    compile("elsewhere/a.cat", "5 elsewhere");
-    compile("elsewhere/b.cat", "5 elsewhere");
-    compile("a.cat", "5 here");
-    compile("de/a.cat", "5 hier");
-    const std::filesystem::path before = std::filesystem::current_path();
-    std::filesystem::current_path(folder.path());
+    for (const char* name : {"elsewhere/a.cat", "elsewhere/b.cat", "a.cat", "de/a.cat"})
+        compile(name, std::string("5 ") + name);
+    const fs::path before = fs::current_path();
+    fs::current_path(folder.path());
     setenv("NLSPATH", (folder.path() / "elsewhere/%N").c_str(), 1);
-    EXPECT_EQ(textIn(L"a.cat"), L"here");
+    EXPECT_EQ(textIn(L"a.cat"), L"a.cat");
     EXPECT_FALSE(opens(L"b.cat"));
     WendSDK::Util::setLanguage(L"de");
-    EXPECT_EQ(textIn(L"a.cat"), L"hier");
+    EXPECT_EQ(textIn(L"a.cat"), L"de/a.cat");
     unsetenv("NLSPATH");
-    std::filesystem::current_path(before);
+    fs::current_path(before);
 }
-
-}  // namespace
