@@ -7,7 +7,7 @@
 
 using namespace OvTool;
 
-TEST(ToolDegrees, EveryAngleOfAFileComesBackAsWritten) {
+TEST(ToolNumbers, EveryAngleOfAFileComesBackAsWritten) {
     // Files hold degrees with up to three decimals; each is read into a float first.
     for (int i = -360000; i <= 360000; i += 7) {
         const float written = static_cast<float>(i / 1000.0);
@@ -19,25 +19,13 @@ TEST(ToolDegrees, EveryAngleOfAFileComesBackAsWritten) {
     EXPECT_TRUE(std::isnan(toDegrees(std::numeric_limits<float>::quiet_NaN())));
 }
 
-TEST(ToolNumbers, OnlyWholeFiniteDecimalNumbersAreRead) {
+TEST(ToolNumbers, WholeFiniteDecimalsAreReadAndFiveDigitsShown) {
     EXPECT_EQ(parseFloat("-0.5e2"), -50);
-    for (const char* text : {"", "-", "1 ", " 1", "1,5", "nan", "inf", "0x10", "1e99", "ten"}) {
+    for (const char* text : {"", "-", "1 ", " 1", "1,5", "nan", "inf", "0x10", "1e99"})
         EXPECT_FALSE(parseFloat(text)) << text;
-    }
-}
-
-TEST(ToolNumbers, ShortNumbersKeepFiveDigits) {
-    const std::pair<double, const char*> cases[] = {
-        {0, "0"},
-        {1, "1"},
-        {99.99951, "100"},
-        {1234.56, "1234.6"},
-        {123456.7, "123457"},
-        {-2.5, "-2.5"},
-        {0.012345, "0.01235"},
-        {1e-7, "1e-07"},
-        {2.5e12, "2.5e+12"},
-        {0.5, "0.5"},
-    };
-    for (const auto& [value, text] : cases) EXPECT_EQ(shortNumber(value), text);
+    for (const auto& [value, text] :
+         {std::pair{0.0, "0"}, std::pair{99.99951, "100"}, std::pair{1234.56, "1234.6"},
+          std::pair{123456.7, "123457"}, std::pair{-2.5, "-2.5"}, std::pair{0.012345, "0.01235"},
+          std::pair{1e-7, "1e-07"}, std::pair{2.5e12, "2.5e+12"}})
+        EXPECT_EQ(shortNumber(value), text);
 }

@@ -22,8 +22,7 @@ inline std::string readBytes(const std::filesystem::path& path) {
 
 struct ToolResult {
     int status = -1;
-    std::string out;
-    std::string err;
+    std::string out, err;
 
     std::vector<nlohmann::ordered_json> json() const {
         std::vector<nlohmann::ordered_json> objects;
@@ -52,20 +51,16 @@ inline ToolResult runTool(const std::string& arguments, const TempFolder& folder
 
 /// An IES file; what a test does not set is as plain as can be.
 struct IesFile {
-    std::string tilt = "NONE";
-    std::string lamps = "1 -1";
-    std::string multiplier = "1";
+    std::string tilt = "NONE", lamps = "1 -1", multiplier = "1";
     int type = 1;
     std::string factors = "1 1 0";
-    std::vector<double> verticals{0, 45, 90};
-    std::vector<double> horizontals{0};
+    std::vector<double> verticals{0, 45, 90}, horizontals{0};
     std::function<double(double, double)> candela = [](double, double) { return 100; };
 
     std::string text() const {
         std::ostringstream out;
-        out << "IESNA91\n[TEST] one\nTILT=" << tilt << "\n"
-            << lamps << " " << multiplier << " " << verticals.size();
-        out << " " << horizontals.size() << " " << type << " 2 0 0 0\n" << factors << "\n";
+        out << "IESNA91\n[TEST] one\nTILT=" << tilt << "\n" << lamps << " " << multiplier << " ";
+        out << verticals.size() << " " << horizontals.size() << " " << type << " 2 0 0 0\n" << factors << "\n";
         for (double v : verticals) out << v << "\n";
         for (double h : horizontals) out << h << "\n";
         for (double h : horizontals) {

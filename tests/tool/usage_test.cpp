@@ -2,81 +2,53 @@
 
 #include "tool/toolRun.h"
 
-namespace {
-
-struct UsageCase {
-    const char* name;
-    const char* arguments;
-    int status;
-    const char* text;  // somewhere in the output or the messages
+class ToolUsage : public testing::Test {
+protected:
+    ToolUsage() { folder.write("good.ies", IesFile().text()); }
+    TempFolder folder;
 };
 
-TEST(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
-    const UsageCase cases[] = {
-        {"no command", "", 2, "command is required"},
-        {"unknown command", "frobnicate", 2, "frobnicate"},
-        {"no file", "info", 2, "FILE"},
-        {"unknown option", "info good.ies --frob", 2, "--frob"},
-        {"values without json", "info good.ies --values", 2, "--json"},
-        {"unknown format", "info good.ies --as pdf", 2, "pdf"},
-        {"half a direction", "intensity good.ies 10", 2, "'10'"},
-        {"three angles", "intensity good.ies 1,2,3", 2, "'1,2,3'"},
-        {"direction in words", "intensity good.ies up,0", 2, "'up,0'"},
-        {"direction that is no number", "intensity good.ies 0,nan", 2, "'0,nan'"},
-        {"unknown frame", "intensity good.ies 0,0 --frame upside", 2, "upside"},
-        {"negative flux", "intensity good.ies 0,0 --flux -5", 2, "-5"},
-        {"flux with a unit", "intensity good.ies 0,0 --flux 5lm", 2, "5lm"},
-        {"conversion without its way", "convert good.ies b.ies", 2, "--as-saved"},
-        {"conversion to nowhere", "convert good.ies --as-saved", 2, "OUT"},
-        {"help", "--help", 0, "Exit status"},
-        {"help of a command", "intensity --help", 0, "--frame"},
-        {"version", "--version", 0, "ovphoto 0."},
-        {"any case of a format", "info good.ies --as Ies", 0, "good"},
-        {"option behind the command", "info good.ies --module ./none.so", 1, "none.so"},
+TEST_F(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
+    // Rows of arguments and what the output or the messages say.
+    const auto expectStatus = [&](int status, std::initializer_list<std::string> rows) {
+        for (const std::string& row : rows) {
+            const ToolResult result = runTool(row.substr(0, row.find('|')), folder);
+            EXPECT_EQ(result.status, status) << row << result.err;
+            EXPECT_TRUE(result.says(row.substr(row.find('|') + 1))) << row << result.out << result.err;
+        }
     };
-    TempFolder folder;
-    folder.write("good.ies", IesFile().text());
-    for (const UsageCase& c : cases) {
-        SCOPED_TRACE(c.name);
-        const ToolResult result = runTool(c.arguments, folder);
-        EXPECT_EQ(result.status, c.status) << result.err;
-        EXPECT_TRUE(result.says(c.text)) << result.out << result.err;
-    }
+    expectStatus(2, {"|command is required", "frobnicate|frobnicate", "info|FILE", "info good.ies --frob|--frob",
+                     "info good.ies --values|--json", "info good.ies --as pdf|pdf", "intensity good.ies 10|'10'",
+                     "intensity good.ies 1,2,3|'1,2,3'", "intensity good.ies up,0|'up,0'",
+                     "intensity good.ies 0,nan|'0,nan'", "intensity good.ies 0,0 --frame upside|upside",
+                     "intensity good.ies 0,0 --flux -5|-5", "intensity good.ies 0,0 --flux 5lm|5lm",
+                     "convert good.ies b.ies|--as-saved", "convert good.ies --as-saved|OUT"});
+    expectStatus(0, {"--help|Exit status", "intensity --help|--frame", "--version|ovphoto 0.",
+                     "info good.ies --as Ies|good"});
+    expectStatus(1, {"info good.ies --module ./none.so|none.so"});
 }
 
-TEST(ToolUsage, WhatCannotBeReadIsToldByEveryCommand) {
-    struct BadFile {
-        const char* name;
-        const char* text;
-    };
-    const BadFile files[] = {
-        {"missing.ies", "missing.ies: cannot be opened"},
-        {"folder", "folder: is a folder"},
-        {"/dev/null", "/dev/null: is no regular file"},
-        {"empty.ies", "empty.ies: not a photometric file of a known format"},
-        {"letter.txt", "letter.txt: not a photometric file of a known format"},
-        {"cut.ies", "cut.ies: "},
-    };
-    TempFolder folder;
+TEST_F(ToolUsage, WhatCannotBeReadIsToldByEveryCommand) {
     std::filesystem::create_directory(folder.path() / "folder");
     folder.write("empty.ies", "");
     folder.write("letter.txt", "Dear reader,\n");
     folder.write("cut.ies", "IESNA91\nTILT=NONE\n1 1000\n");
-    for (const BadFile& file : files) {
-        SCOPED_TRACE(file.name);
+    for (const std::string text :
+         {"missing.ies: cannot be opened", "folder: is a folder", "/dev/null: is no regular file",
+          "empty.ies: not a photometric file of a known format",
+          "letter.txt: not a photometric file of a known format", "cut.ies: "}) {
         for (std::string command :
              {"info @", "info --json @", "intensity @ 0,0", "convert --as-saved @ out.ies"}) {
-            const ToolResult result = runTool(command.replace(command.find('@'), 1, file.name), folder);
+            command.replace(command.find('@'), 1, text, 0, text.find(':'));
+            const ToolResult result = runTool(command, folder);
             EXPECT_EQ(result.status, 1) << command;
-            EXPECT_NE(result.err.find(file.text), std::string::npos) << result.err;
+            EXPECT_NE(result.err.find(text), std::string::npos) << command << result.err;
         }
     }
     EXPECT_FALSE(std::filesystem::exists(folder.path() / "out.ies"));
 }
 
-TEST(ToolUsage, OutputThatCannotBeWrittenIsToldAndGivesStatus1) {
-    TempFolder folder;
-    folder.write("good.ies", IesFile().text());
+TEST_F(ToolUsage, OutputThatCannotBeWrittenIsToldAndGivesStatus1) {
     for (const char* command : {"ovphoto formats >/dev/full", "ovphoto info good.ies >&-",
                                 "ovphoto --help >/dev/full", "ovphoto check good.ies >/dev/full"}) {
         const ToolResult result = runShell(command, folder);
@@ -86,9 +58,6 @@ TEST(ToolUsage, OutputThatCannotBeWrittenIsToldAndGivesStatus1) {
     // An endless input ends with its reader.
     const ToolResult closed =
         runShell("{ yes 0,0 | { ovphoto intensity good.ies; echo status $? >&2; } | head -n 1; }", folder);
-    EXPECT_TRUE(closed.says("status 1")) << closed.err;
-    EXPECT_TRUE(closed.says("100 cd"));
+    EXPECT_TRUE(closed.says("status 1") && closed.says("100 cd")) << closed.out << closed.err;
     EXPECT_EQ(runShell("ovphoto intensity good.ies <&-", folder).status, 1);
 }
-
-}  // namespace

@@ -2,8 +2,6 @@
 
 #include "tool/toolRun.h"
 
-namespace {
-
 namespace fs = std::filesystem;
 
 class ToolConvert : public testing::Test {
@@ -30,20 +28,19 @@ TEST_F(ToolConvert, WhatItWritesReadsBackAndSavesTheSameAgain) {
     ASSERT_EQ(run("a.ies a.ies").status, 0);
     EXPECT_EQ(bytes("a.ies"), bytes("b.ies"));
     const auto info = runTool("info --json in.ies a.ies", folder).json();
-    ASSERT_EQ(info.size(), 2U);
-    for (const char* key : {"thetas", "psis", "symmetry"}) EXPECT_EQ(info[0][key], info[1][key]);
+    for (const char* key : {"thetas", "psis", "symmetry"}) EXPECT_EQ(info.at(0).at(key), info.at(1).at(key));
     EXPECT_EQ(fileCount(), 3U);  // nothing is left beside them
 }
 
 TEST_F(ToolConvert, KeepsPermissionsAndFollowsLinks) {
+    const auto real = folder.path() / "real.ies", link = folder.path() / "link.ies";
     folder.write("real.ies", "old");
-    fs::permissions(folder.path() / "real.ies", fs::perms::owner_read | fs::perms::owner_write);
-    fs::create_symlink("real.ies", folder.path() / "link.ies");
+    fs::permissions(real, fs::perms::owner_read | fs::perms::owner_write);
+    fs::create_symlink("real.ies", link);
     ASSERT_EQ(run("in.ies link.ies").status, 0);
-    EXPECT_TRUE(fs::is_symlink(folder.path() / "link.ies"));
+    EXPECT_TRUE(fs::is_symlink(link));
     EXPECT_EQ(bytes("real.ies").substr(0, 5), "IESNA");
-    EXPECT_EQ(fs::status(folder.path() / "real.ies").permissions(),
-              fs::perms::owner_read | fs::perms::owner_write);
+    EXPECT_EQ(fs::status(real).permissions(), fs::perms::owner_read | fs::perms::owner_write);
 }
 
 TEST_F(ToolConvert, AFailureLeavesWhatWasThere) {
@@ -51,20 +48,15 @@ TEST_F(ToolConvert, AFailureLeavesWhatWasThere) {
     folder.write("bad.ies", "IESNA91\nTILT=NONE\n0\n");
     fs::create_directory(folder.path() / "folder");
     const std::size_t before = fileCount();
-    const std::string commands[] = {
-        "ovphoto convert --as-saved bad.ies old.ies",
-        "ovphoto convert --as-saved in.ies none/out.ies",
-        "ovphoto convert --as-saved in.ies in.ies/out.ies",
-        "ovphoto convert --as-saved in.ies folder",
-        "ovphoto convert --as-saved in.ies /dev/full",
-        "(trap '' XFSZ; ulimit -f 0; ovphoto convert --as-saved in.ies old.ies 2>/dev/null)",  // no room to write
-    };
-    for (const std::string& command : commands) {
-        EXPECT_EQ(runShell(command, folder).status, 1) << command;
-        EXPECT_EQ(bytes("old.ies"), "old") << command;
-        EXPECT_EQ(fileCount(), before) << command;
+    for (const std::string rest : {"bad.ies old.ies", "in.ies none/out.ies", "in.ies in.ies/out.ies",
+                                   "in.ies folder", "in.ies /dev/full"}) {
+        const ToolResult result = run(rest);
+        EXPECT_EQ(result.status, 1) << rest;
+        EXPECT_EQ(result.says("/out.ies: cannot be written"), rest.ends_with("/out.ies")) << result.err;
     }
-    EXPECT_TRUE(runShell(commands[1], folder).says("none/out.ies: cannot be written"));
+    // No room to write.
+    const char* full = "(trap '' XFSZ; ulimit -f 0; ovphoto convert --as-saved in.ies old.ies 2>/dev/null)";
+    EXPECT_EQ(runShell(full, folder).status, 1);
+    EXPECT_EQ(bytes("old.ies"), "old");
+    EXPECT_EQ(fileCount(), before);
 }
-
-}  // namespace
