@@ -17,11 +17,20 @@ void post(std::wstring text) {
 }
 
 /// The formatted text of a message, or its number without a catalogue.
-std::wstring messageText(unsigned id, std::va_list args) {
+std::wstring textOf(unsigned id, std::va_list args) {
     try {
         return Ov::messageFile().formatV(id, args);
     } catch (const Ov::RnMessageFileEx&) {
         return L"Message " + std::to_wstring(id) + L".";
+    }
+}
+
+/// Posts a message that holds `detail`, or that alone without a catalogue.
+void postWrapped(const std::wstring& detail, unsigned wrapper, std::va_list args) {
+    try {
+        post(Ov::messageFile().formatV(wrapper, args));
+    } catch (const Ov::RnMessageFileEx&) {
+        post(detail);
     }
 }
 
@@ -30,21 +39,32 @@ std::wstring messageText(unsigned id, std::va_list args) {
 void reportMessage(unsigned id, ...) {
     std::va_list args;
     va_start(args, id);
-    std::wstring text = messageText(id, args);
+    std::wstring text = textOf(id, args);
     va_end(args);
     post(std::move(text));
+}
+
+std::wstring messageText(unsigned id, ...) {
+    std::va_list args;
+    va_start(args, id);
+    std::wstring text = textOf(id, args);
+    va_end(args);
+    return text;
+}
+
+void reportWrapped(const std::wstring& detail, unsigned wrapper, ...) {
+    std::va_list args;
+    va_start(args, wrapper);
+    postWrapped(detail, wrapper, args);
+    va_end(args);
 }
 
 void reportParseMessage(unsigned id, ...) {
     std::va_list args;
     va_start(args, id);
-    const std::wstring detail = messageText(id, args);
+    const std::wstring detail = textOf(id, args);
     va_end(args);
-    try {
-        post(Ov::messageFile().format(messages::fileNotRead, detail.c_str()));
-    } catch (const Ov::RnMessageFileEx&) {
-        post(detail);
-    }
+    reportWrapped(detail, messages::fileNotRead, detail.c_str());
 }
 
 }  // namespace OvPhotometrics
