@@ -46,7 +46,7 @@ bool install(const IesFileRecord& rec, const WebLayout& layout, PhotoWebIES& web
 bool iesRecordToWeb(const IesFileRecord& rec, PhotoWebIES& web, bool loaded, const wchar_t* name,
                     const wchar_t* basePath) {
     WebLayout layout;
-    if (!checkAngleOrder(rec.grid) || !chooseLayout(rec, layout)) return false;
+    if (!chooseLayout(rec, layout)) return false;
     try {
         if (install(rec, layout, web, loaded, name, basePath)) return true;
         reportMessage(messages::webRefused);

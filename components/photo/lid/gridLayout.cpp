@@ -26,33 +26,18 @@ bool refuse(unsigned id, float angle) {
     return false;
 }
 
-}  // namespace
+bool ascend(const std::vector<float>& angles) { return std::is_sorted(angles.begin(), angles.end()); }
 
-bool checkAngleOrder(const CandelaGrid& grid) {
-    const auto ascends = [](const std::vector<float>& angles) {
-        return std::is_sorted(angles.begin(), angles.end());
-    };
-    if (!ascends(grid.verticalAngles)) return refuse(messages::verticalAnglesDecrease);
-    return ascends(grid.horizontalAngles) || refuse(messages::horizontalAnglesDecrease);
+bool checkAngleOrder(const CandelaGrid& grid, bool anyHorizontalOrder) {
+    if (!ascend(grid.verticalAngles)) return refuse(messages::verticalAnglesDecrease);
+    return anyHorizontalOrder || ascend(grid.horizontalAngles) || refuse(messages::horizontalAnglesDecrease);
 }
 
-bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout) {
+/// Planes that start at 0.
+bool layoutFrom0(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout) {
     const Tolerance is{rules.tolerance};
-    const float v0 = grid.verticalAngles.front();
-    const float vn = grid.verticalAngles.back();
-    const bool lower = is.about(v0, 0) && (is.about(vn, 90) || is.about(vn, 180));
-    if (!lower && !(is.about(v0, 90) && is.about(vn, 180))) return refuse(rules.verticalRange);
-
-    const float h0 = grid.horizontalAngles.front();
     const float hn = grid.horizontalAngles.back();
     const int n = grid.horizontalCount;
-    layout = {.columns = n};
-    if (is.about(h0, 90) && is.about(hn, 270)) {
-        layout.symmetry = PhotoWebSymmetry::Half;
-        layout.horizontalShift = -90;
-        return true;
-    }
-    if (!is.about(h0, 0)) return refuse(rules.firstHorizontal, h0);
     if (n == 1 || (n == 2 && is.about(hn, 360))) {
         layout.symmetry = PhotoWebSymmetry::Axial;
         layout.columns = 1;
@@ -69,7 +54,35 @@ bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& la
     return true;
 }
 
+}  // namespace
+
+bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout) {
+    const Tolerance is{rules.tolerance};
+    const float h0 = grid.horizontalAngles.front();
+    const float hn = grid.horizontalAngles.back();
+    const bool from270 = rules.from270 && is.about(h0, 270);
+    if (!checkAngleOrder(grid, from270)) return false;
+
+    const float v0 = grid.verticalAngles.front();
+    const float vn = grid.verticalAngles.back();
+    const bool lower = is.about(v0, 0) && (is.about(vn, 90) || is.about(vn, 180));
+    if (!lower && !(is.about(v0, 90) && is.about(vn, 180))) return refuse(rules.verticalRange);
+
+    layout = {.columns = grid.horizontalCount};
+    if (is.about(h0, 0)) return layoutFrom0(grid, rules, layout);
+    const bool from90 = is.about(h0, 90) && is.about(hn, 270);
+    if (!from90 && !from270) return refuse(rules.firstHorizontal, h0);
+    layout.horizontalShift = from90 ? -90 : -270;
+    if (from90 || is.about(hn, 90)) {
+        layout.symmetry = PhotoWebSymmetry::Half;
+    } else if (is.about(hn, 270)) {
+        --layout.columns;  // the last plane repeats the first
+    }
+    return true;
+}
+
 bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout& layout) {
+    if (!checkAngleOrder(grid, false)) return false;
     const Tolerance is{rules.tolerance};
     const float t = rules.tolerance;
     const float v0 = grid.verticalAngles.front();
@@ -93,12 +106,13 @@ void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout
     // An angle that is not shifted stays as it is, a negative zero included.
     const auto shifted = [](const std::vector<float>& angles, int k, double shift) {
         const double angle = angles[static_cast<std::size_t>(k)];
-        return toRadians(shift != 0 ? angle + shift : angle);
+        return shift != 0 ? angle + shift : angle;
     };
     for (int i = 0; i < grid.verticalCount; ++i)
-        photoWebRecordSetTheta(rec, i, shifted(grid.verticalAngles, i, layout.verticalShift));
+        photoWebRecordSetTheta(rec, i, toRadians(shifted(grid.verticalAngles, i, layout.verticalShift)));
     for (int j = 0; j < layout.columns; ++j) {
-        photoWebRecordSetPsi(rec, j, shifted(grid.horizontalAngles, j, layout.horizontalShift));
+        const double psi = shifted(grid.horizontalAngles, j, layout.horizontalShift);
+        photoWebRecordSetPsi(rec, j, toRadians(psi < -0.5 ? psi + 360 : psi));  // planes from 270 run on through 0
         photoWebRecordSetRow(rec, j, &grid.candelas[grid.index(0, j)], factor);
     }
 }
@@ -110,18 +124,17 @@ GeLinearMatrix3<float> turnedBy(float degrees) {
     return GeLinearMatrix3<float>({c, -s, 0, s, c, 0, 0, 0, 1});
 }
 
-GeLinearMatrix3<float> laidDownBy(float degrees) {
-    const double a = inRadians(-90);
+GeLinearMatrix3<float> laidDownBy(float degrees, double second) {
     const double b = inRadians(degrees + 90.0);
-    const double values[] = {std::cos(a) * std::cos(b),
+    const double values[] = {std::cos(second) * std::cos(b),
                              -std::sin(b),
-                             std::sin(a) * std::cos(b),
-                             std::cos(a) * std::sin(b),
+                             std::sin(second) * std::cos(b),
+                             std::cos(second) * std::sin(b),
                              std::cos(b),
-                             std::sin(a) * std::sin(b),
-                             -std::sin(a),
+                             std::sin(second) * std::sin(b),
+                             -std::sin(second),
                              0,
-                             std::cos(a)};
+                             std::cos(second)};
     std::array<float, 9> rounded;
     std::transform(std::begin(values), std::end(values), rounded.begin(),
                    [](double value) { return static_cast<float>(value); });

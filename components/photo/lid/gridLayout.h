@@ -22,6 +22,7 @@ struct PolarRules {
     unsigned verticalRange;
     unsigned lastHorizontal;   // argument: the angle
     unsigned firstHorizontal;  // argument: the angle
+    bool from270 = false;      // planes may start at 270 and run on through 0
 };
 struct LateralRules {
     float tolerance;
@@ -30,12 +31,13 @@ struct LateralRules {
     unsigned horizontalRange;
 };
 
-/// Angles must not decrease: false after message 12943 or 12944.
-bool checkAngleOrder(const CandelaGrid& grid);
-/// Planes through the vertical axis, planes 0 to 360 or a symmetric part (type C of IES). False after a message.
+// Angles must not decrease (12943, 12944), but for planes from 270.
+
+/// Planes through the vertical axis, planes 0 to 360 or a symmetric part (type C of IES, type 1 of CIBSE). False
+/// after a message.
 bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout);
-/// Planes through a horizontal axis, angles to both sides of 0 or to one (types A and B of IES). False after a
-/// message.
+/// Planes through a horizontal axis, angles to both sides of 0 or to one (types A and B of IES, type 2 of CIBSE).
+/// False after a message.
 bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout& layout);
 
 /// Sets angles and candelas of a record that was started for `layout`, candelas times `factor`.
@@ -43,7 +45,8 @@ void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout
 
 /// The turn about the vertical axis by an angle in degrees.
 GeLinearMatrix3<float> turnedBy(float degrees);
-/// The turn that also lays the axis down: by (degrees + 90) about the vertical, after -90 about the second axis.
-GeLinearMatrix3<float> laidDownBy(float degrees);
+/// The turn that also lays the axis down: by (degrees + 90) about the vertical, after -90 about the second axis,
+/// given in radians as the format rounds it.
+GeLinearMatrix3<float> laidDownBy(float degrees, double second = inRadians(-90));
 
 }  // namespace OvPhotometrics
