@@ -2,11 +2,16 @@
 
 #include <cstdint>
 
+#include "host/componentManager/enumerator.h"
+#include "host/componentManager/stream.h"
+#include "ovphoto/intensityDist.h"
 #include "ovphoto/module.h"
 
-// Functions that the module exports by number alone: calendar, clock and time zones for a host's dialogs. A host
-// reaches them through Ov::Module::byOrdinal, which asks the system where modules have ordinals, and elsewhere
-// reads the table at the end of this file.
+// Functions that the module exports by number alone: calendar, clock and time zones for a host's dialogs, and
+// files in any of the formats. A host reaches them through Ov::Module::byOrdinal, which asks the system where
+// modules have ordinals, and elsewhere reads the table at the end of this file.
+//
+// Calendar, clock and zones (422 to 434).
 //
 // Offsets, meridians and longitudes are positive towards WEST. A year has 365 days, month 1 is January, day 1 is
 // 1 January. An index of a time zone is valid from 0 to one below the count. Null pointers to results are skipped.
@@ -14,6 +19,8 @@
 //
 // Names are in the host's language; their texts are the module's, each valid until its function is called again.
 // The functions that give names take one caller at a time, the others any number.
+//
+// Files (435 to 438 and 440) are described where they stand below.
 
 // clang-format off
 
@@ -31,11 +38,54 @@
     entry(431, getMonthShortName) \
     entry(432, getDaysInMonth) \
     entry(433, dayOfYear) \
-    entry(434, monthAndDay)
+    entry(434, monthAndDay) \
+    entry(435, writeIes) \
+    entry(436, writeCibse) \
+    entry(437, writeNimb) \
+    entry(438, writeTbt) \
+    entry(440, readFileFacts)
 
 // clang-format on
 
 namespace OvPhotometrics {
+
+/// What a distribution is written as.
+enum class FileForm : std::int32_t {
+    /// What a web of the format saves into a host's stream: IES and CIBSE with relative values, grids that do not
+    /// fit sampled coarsely in the web's own frame, orientations dropped. Facts are not used.
+    asSaved = 0,
+    /// A file that is right in other programs: absolute candela (cd per 1000 lm in NIMB and TBT) with six digits
+    /// or more where the format has decimals. The grid is the web's own, orientation included, where the format
+    /// can
+    /// hold it and every angle is a multiple of 0.01 degree; else the distribution in the host frame on an even
+    /// grid, with steps of the web's smallest, 1 degree at the least, that lose less than 0.1 % of the peak where
+    /// they can. What is written has been read back by the format's own reader.
+    faithful = 1
+};
+
+/// One thing that a file says beyond its web. Keys of label lines:
+///
+///     IES      the header's keywords without brackets ("MANUFAC", "MORE"), "line" for other header lines
+///     CIBSE    "label 1" to "label 7"
+///     NIMB     "line 1" to "line 4"
+///     TBT      "title"
+///
+/// and of numbers and choices:
+///
+///     IES      "format", "lamps", "lumensPerLamp", "multiplier", "ballastFactor", "ballastLampFactor", "watts",
+///              "units" (feet, metres), "width", "length", "height", "photometricType" (C, B, A), "tilt" (NONE,
+///              INCLUDE or a file name), "photometry" (absolute, relative)
+///     CIBSE    "leadInteger", "photometricType", "leadValues", "factors", "singleValue", "trailerInteger",
+///              "trailerValues"
+///     NIMB     "identifier", "orientationAngle", "symmetryCode1", "symmetryCode2", "spare1" to "spare3"
+///     TBT      "flux", "referenceFlux", "multiplier", "auxValue1" to "auxValue3", "symmetryCode", "kindCode",
+///              "kindValue1", "kindValue2", "unitTriple"
+///
+/// Numbers are the shortest text that reads back as the same value, several with one blank between them.
+struct FileFact {
+    const wchar_t* key;
+    const wchar_t* text;
+};
 
 /// The functions with their types.
 struct NumberedFunctions {
@@ -67,6 +117,29 @@ struct NumberedFunctions {
     int (*dayOfYear)(int month, int day);
     /// The date of a day of the year; false, and nothing written, outside 1..365.
     bool (*monthAndDay)(int dayOfYear, int* month, int* day);
+
+    /// Write any distribution as the text of a file to a text stream. A faithful file takes its label lines, and
+    /// those of the format's own numbers that do not follow from the light, from `count` facts as `readFileFacts`
+    /// gives them, of any format: lines of another format go where there is room, keywords in front; the name of a
+    /// web distribution's web goes where no fact says what the luminaire is.
+    /// False, and nothing has been written, after messages to the host's reporter; a stream that fails raises
+    /// RnStreamEx. One caller at a time.
+    bool (*writeIes)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
+                     std::int32_t count);
+    bool (*writeCibse)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
+                       std::int32_t count);
+    bool (*writeNimb)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
+                      std::int32_t count);
+    bool (*writeTbt)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
+                     std::int32_t count);
+
+    /// Reads an input and visits what it says beyond its web, label lines first, each in the order of the file.
+    /// The format is that of the web class `format`, or, when that is null, of the first whose content test
+    /// accepts the input. `basePath` (may be null) is where a tilt file is looked for first. The texts are valid
+    /// during the visit. False, and nothing has been visited, when the input is refused (after messages) or of no
+    /// known format. One caller at a time.
+    bool (*readFileFacts)(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t* basePath,
+                          Ov::RnEnumerator<const FileFact&>& visitor);
 };
 
 /// The functions of a loaded module (an Ov::Module); null where it has none.

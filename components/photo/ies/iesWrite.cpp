@@ -2,6 +2,7 @@
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/ies/ies.h"
+#include "components/photo/lid/ownGrid.h"
 #include "components/photo/lid/reportMessage.h"
 #include "components/photo/lid/webDistribution.h"
 
@@ -35,28 +36,6 @@ void writeTilt(const IesFileRecord& rec, Ov::RnStream& out) {
     }
 }
 
-void writeGrid(const CandelaGrid& grid, Ov::RnStream& out) {
-    writeValues(grid.verticalAngles, out);
-    writeValues(grid.horizontalAngles, out);
-    const auto column = static_cast<std::size_t>(grid.verticalCount);
-    for (int j = 0; j < grid.horizontalCount; ++j)
-        writeValueList(column, &grid.candelas[grid.index(0, j)], out, valueLineLimit);
-}
-
-int horizontalSamples(PhotoWebSymmetry symmetry) {
-    switch (symmetry) {
-        case PhotoWebSymmetry::Full:
-            return 36;
-        case PhotoWebSymmetry::Half:
-            return 18;
-        case PhotoWebSymmetry::Quarter:
-            return 9;
-        case PhotoWebSymmetry::Axial:
-            break;
-    }
-    return 1;
-}
-
 }  // namespace
 
 bool iesRecordInitForWriting(IesFileRecord& rec) {
@@ -82,7 +61,21 @@ bool iesRecordFromDistribution(Ov::RnIntensityDist& dist, IesFileRecord& rec) {
 
 bool iesRecordFromSampling(Ov::RnIntensityDist& dist, IesFileRecord& rec) {
     if (!iesRecordInitForWriting(rec)) return false;
-    if (!candelaGridFromSampling(rec.grid, dist, horizontalSamples(dist.getSymmetry()), 1)) return false;
+    if (!candelaGridFromSampling(rec.grid, dist, LastPlane::without, 1)) return false;
+    rec.lumensPerLamp = dist.getFlux();
+    return true;
+}
+
+bool iesRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, IesFileRecord& rec) {
+    constexpr OwnGridRules rules{
+        .tolerance = iesTolerance, .wraps = false, .lateralTruncated = true, .uprightTurned = true};
+    if (!iesRecordInitForWriting(rec)) return false;
+    FileGrid file = faithfulGrid(dist, rules);
+    rec.photometricType = file.frame == GridFrame::polar     ? IesPhotometricType::C
+                          : file.frame == GridFrame::upright ? IesPhotometricType::A
+                                                             : IesPhotometricType::B;
+    rec.grid = std::move(file.grid);
+    rec.candelaMultiplier = scaleForFile(rec.grid, 1);
     rec.lumensPerLamp = dist.getFlux();
     return true;
 }
@@ -100,7 +93,7 @@ bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out) {
     writeLine(out, L"%.16g %.16g %.16g", widened(rec.ballastFactor), widened(rec.ballastLampFactor),
               widened(rec.inputWatts));
     if (real) {
-        writeGrid(grid, out);
+        candelaGridWrite(grid, out, valueLineLimit);
     } else {
         for (const wchar_t* line : {L"0.0 180.0", L"0.0", L"0.0 0.0"}) writeLine(out, L"%s", line);
     }

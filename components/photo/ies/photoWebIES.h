@@ -24,6 +24,9 @@ struct IesFormat {
     static constexpr auto toWeb = iesRecordToWeb;
     static constexpr auto fromDistribution = iesRecordFromDistribution;
     static constexpr auto write = iesWriteRecord;
+    static constexpr auto fromDistributionFaithfully = iesRecordFromDistributionFaithfully;
+    static constexpr auto describe = iesDescribe;
+    static constexpr auto carry = iesCarry;
 };
 
 /// A web record with the tilt file that the web depends on.

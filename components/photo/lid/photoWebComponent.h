@@ -1,11 +1,13 @@
 #pragma once
 
+#include "components/photo/lid/fileFormat.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/numberText.h"
 #include "components/photo/lid/photoWeb.h"
 #include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/webEvaluation.h"
 #include "host/componentManager/castImpl.h"
+#include "host/componentManager/devices.h"
 #include "host/componentManager/stream.h"
 
 // A file format as a component, written once: web class, persistence adapter and builder. A format gives its facts
@@ -24,6 +26,11 @@
 //         static bool toWeb(const Record&, Web&, bool loaded, const wchar_t* name, const wchar_t* basePath);
 //         static bool fromDistribution(RnIntensityDist&, Record&);
 //         static bool write(const Record&, RnStream&);
+//         // For files that other programs read: a record with absolute candela, the facts that a record holds
+//         // beyond its web, and the facts and name that a record to be written takes over.
+//         static bool fromDistributionFaithfully(RnIntensityDist&, Record&);
+//         static void describe(const Record&, FileFacts&);
+//         static void carry(const FileFacts&, const std::wstring& name, Record&);
 //     };
 //
 // The functions report what is wrong and answer false; the adapter turns that into the stream exception.
@@ -73,9 +80,9 @@ public:
 /// Builds webs of a format and imports them.
 template <class Format>
 class PhotoWebBuilder final
-    : public FactsBuilder<
-          typename Format::Web,
-          Ov::RnCastImpl2<LidBuilder, Ov::RnImportBuilder, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
+    : public FactsBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnImportBuilder,
+                                                                Ov::RnComponentBuilder, Ov::RnBuilderDescription>>,
+      public FileFormat {
 public:
     using Ov::RnImportBuilder::canImport;
     using Ov::RnImportBuilder::import;
@@ -95,6 +102,41 @@ public:
         Ov::rnCast<Ov::RnPersistant>(web.get())->load(stream, 0, name, basePath);
         postLoad.finish();
         return web;
+    }
+
+    bool recognises(Ov::RnBufferedIO& io) override { return Format::canImport(io); }
+
+    bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath, FileFacts& facts) override {
+        Ov::RnStream stream(&io, Ov::RnStream::Form::text);
+        Record record;
+        if (!Format::read(record, stream, basePath)) return false;
+        if constexpr (requires { Format::describe(record, facts); }) Format::describe(record, facts);
+        return true;
+    }
+
+    bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) override {
+        Record record;
+        if (form == FileForm::asSaved) return Format::fromDistribution(dist, record) && Format::write(record, out);
+        if constexpr (requires { Format::fromDistributionFaithfully(dist, record); }) {
+            if (!Format::fromDistributionFaithfully(dist, record)) return false;
+            const auto web = webOf(dist);
+            Format::carry(facts, web ? web->getName() : L"", record);
+            return canBeReadBack(record) && Format::write(record, out);
+        }
+        return false;
+    }
+
+private:
+    using Record = typename Format::Record;
+
+    static bool canBeReadBack(const Record& record) {
+        const auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
+        if (!Format::write(record, stream)) return false;
+        text->seek(0, 0);
+        Record again;
+        const auto web = Ov::rnCreate<typename Format::Web>();
+        return Format::read(again, stream, nullptr) && Format::toWeb(again, *web, true, L"", nullptr);
     }
 };
 

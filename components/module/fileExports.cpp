@@ -1,0 +1,58 @@
+#include "components/module/fileExports.h"
+
+#include <cwchar>
+#include <new>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/component.h"
+#include "components/photo/lid/fileFormat.h"
+#include "components/photo/lid/reportMessage.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+FileFormat* formatOf(Ov::RnComponentBuilder* builder) { return dynamic_cast<FileFormat*>(builder); }
+
+/// The format that accepts the input, the first by name of several; or null.
+FileFormat* recognise(Ov::RnBufferedIO& io) {
+    FileFormat* first = nullptr;
+    const wchar_t* firstName = nullptr;
+    for (const auto& [classId, builder] : builderTable()) {
+        FileFormat* const format = formatOf(builder);
+        if (!format || (first && std::wcscmp(builder->getName(), firstName) > 0) || !format->recognises(io))
+            continue;
+        first = format;
+        firstName = builder->getName();
+    }
+    return first;
+}
+
+}  // namespace
+
+bool writeFile(const Ov::RnUid& classId, Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form,
+               const FileFact* facts, std::int32_t count) {
+    FileFormat* const format = formatOf(builderTable().find(classId));
+    if (!format) return false;
+    try {
+        FileFacts given;
+        for (std::int32_t i = 0; i < count; ++i) given.add(facts[i].key, std::wstring(facts[i].text));
+        return format->write(distribution, out, form, given);
+    } catch (const std::bad_alloc&) {
+        reportMessage(messages::outOfMemory);
+        return false;
+    }
+}
+
+bool readFileFacts(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t* basePath,
+                   Ov::RnEnumerator<const FileFact&>& visitor) {
+    FileFormat* const reader = format ? formatOf(builderTable().find(*format)) : recognise(io);
+    FileFacts facts;
+    if (!reader || !reader->readFacts(io, basePath, facts)) return false;
+    for (const auto& [key, text] : facts)
+        if (visitor.visit({key.c_str(), text.c_str()}) != Ov::RnEnum::goOn) return true;
+    visitor.finish();
+    return true;
+}
+
+}  // namespace OvPhotometrics

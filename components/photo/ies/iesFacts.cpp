@@ -1,0 +1,106 @@
+#include <algorithm>
+
+#include "components/photo/ies/ies.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr std::int32_t feet = 1;
+constexpr std::int32_t metres = 2;
+constexpr std::size_t lineLimit = 80;  // what every edition of the format allows
+
+const wchar_t* typeName(IesPhotometricType type) {
+    switch (type) {
+        case IesPhotometricType::C:
+            return L"C";
+        case IesPhotometricType::B:
+            return L"B";
+        case IesPhotometricType::A:
+            break;
+    }
+    return L"A";
+}
+
+const wchar_t* tiltText(const IesFileRecord& rec) {
+    switch (rec.tiltKind) {
+        case IesTiltKind::none:
+            return L"NONE";
+        case IesTiltKind::include:
+            return L"INCLUDE";
+        case IesTiltKind::file:
+            break;
+    }
+    return rec.tiltFile.c_str();
+}
+
+/// "[MANUFAC] Acme" is keyword "MANUFAC"; the length of the keyword, or 0 for a line without one.
+std::size_t keywordLength(std::wstring_view line) {
+    if (!line.starts_with(L'[')) return 0;
+    const std::size_t end = line.find(L']');
+    const std::wstring_view keyword = line.substr(0, end).substr(1);
+    const auto lower = [](wchar_t c) { return c >= L'a' && c <= L'z'; };
+    return end == std::wstring_view::npos || std::any_of(keyword.begin(), keyword.end(), lower) ? 0
+                                                                                                : keyword.size();
+}
+
+void describeLine(const std::wstring& line, bool first, FileFacts& facts) {
+    const std::size_t length = keywordLength(line);
+    if (length > 0) {
+        const std::size_t start = line.find_first_not_of(L" \t", length + 2);
+        facts.add(line.substr(1, length), start == std::wstring::npos ? L"" : line.substr(start));
+    } else {
+        facts.add(first && line.starts_with(L"IESNA") ? L"format" : L"line", line);
+    }
+}
+
+/// Adds a line; what goes beyond the limit follows as lines that continue it.
+void addLine(std::vector<std::wstring>& lines, std::wstring_view line) {
+    static constexpr std::wstring_view more = L"[MORE] ";
+    lines.emplace_back(line.substr(0, lineLimit));
+    for (std::size_t next = lineLimit; next < line.size(); next += lineLimit - more.size())
+        lines.push_back(std::wstring(more).append(line.substr(next, lineLimit - more.size())));
+}
+
+bool hasKeyword(const std::vector<std::wstring>& lines, std::wstring_view start) {
+    return std::any_of(lines.begin(), lines.end(), [&](const auto& line) { return line.starts_with(start); });
+}
+
+}  // namespace
+
+void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
+    for (std::size_t i = 0; i < rec.lines.size(); ++i) describeLine(rec.lines[i], i == 0, facts);
+    facts.add(L"lamps", rec.lampCount);
+    facts.add(L"lumensPerLamp", rec.lumensPerLamp);
+    facts.add(L"photometry", rec.lumensPerLamp < 0 ? L"absolute" : L"relative");
+    facts.add(L"multiplier", rec.candelaMultiplier);
+    facts.add(L"photometricType", typeName(rec.photometricType));
+    facts.add(L"tilt", tiltText(rec));
+    facts.add(L"units", rec.unitsType == feet ? L"feet" : L"metres");
+    facts.add(L"width", rec.width);
+    facts.add(L"length", rec.length);
+    facts.add(L"height", rec.height);
+    facts.add(L"ballastFactor", rec.ballastFactor);
+    facts.add(L"ballastLampFactor", rec.ballastLampFactor);
+    facts.add(L"watts", rec.inputWatts);
+}
+
+void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& rec) {
+    const std::vector<std::wstring> unknown(rec.lines.begin() + 1, rec.lines.end());
+    rec.lines.resize(1);
+    for (const std::wstring& line : facts.textLines())
+        addLine(rec.lines, keywordLength(line) > 0 ? line : L"[OTHER] " + line);
+    if (!name.empty() && !hasKeyword(rec.lines, L"[LUMINAIRE]"))
+        addLine(rec.lines, L"[LUMINAIRE] " + labelText(name, name.size()));
+    // The format wants test and maker named.
+    for (const std::wstring& line : unknown)
+        if (!hasKeyword(rec.lines, line.substr(0, line.find(L']')))) rec.lines.push_back(line);
+
+    if (const std::wstring* units = facts.find(L"units")) rec.unitsType = *units == L"feet" ? feet : metres;
+    facts.read(L"width", rec.width);
+    facts.read(L"length", rec.length);
+    facts.read(L"height", rec.height);
+    facts.read(L"watts", rec.inputWatts);
+}
+
+}  // namespace OvPhotometrics

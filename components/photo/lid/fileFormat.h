@@ -1,0 +1,22 @@
+#pragma once
+
+#include "components/photo/lid/fileFacts.h"
+#include "ovphoto/numberedExports.h"
+
+namespace OvPhotometrics {
+
+/// A file format as the numbered exports see it. The builder of every format's webs is one.
+class FileFormat {
+public:
+    /// Keeps the position.
+    virtual bool recognises(Ov::RnBufferedIO& io) = 0;
+    /// Adds what a file says beyond its web. False after the messages of its reader.
+    virtual bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath, FileFacts& facts) = 0;
+    /// False, and nothing has been written, after messages.
+    virtual bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) = 0;
+
+protected:
+    ~FileFormat() = default;
+};
+
+}  // namespace OvPhotometrics

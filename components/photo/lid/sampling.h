@@ -1,0 +1,55 @@
+#pragma once
+
+#include "components/photo/lid/candelaGrid.h"
+
+// Candelas of any distribution on an even grid, for files that other programs read.
+
+namespace OvPhotometrics {
+
+/// A distribution in the host frame, by angles in degrees. A turn about the axis is made by adding angles, so that
+/// the edges of dark ranges stay where they are.
+class HostView {
+public:
+    explicit HostView(const Ov::RnIntensityDist& dist);
+
+    float intensity(double theta, double psi) const;
+    /// Of the host frame; Full where the axis is laid down.
+    PhotoWebSymmetry symmetry() const { return _symmetry; }
+    /// The part of 0 to 180 degrees that light is in: its upper or lower half, or all of it.
+    double firstTheta() const { return _firstTheta; }
+    double lastTheta() const { return _lastTheta; }
+    bool axisKept() const { return _axisKept; }
+
+private:
+    const Ov::RnIntensityDist& _dist;
+    bool _axisKept = true;
+    double _turn = 0;  // degrees
+    PhotoWebSymmetry _symmetry;
+    double _firstTheta = 0;
+    double _lastTheta = 180;
+};
+
+/// An even grid in degrees, both ends included. Steps divide 90.
+struct SamplingPlan {
+    PhotoWebSymmetry symmetry = PhotoWebSymmetry::Full;
+    double firstTheta = 0;
+    double lastTheta = 180;
+    double thetaStep = 1;
+    double psiStep = 1;
+
+    /// The end of the horizontal range: 0, 90, 180 or 360.
+    double lastPsi() const;
+    int thetaCount() const { return static_cast<int>((lastTheta - firstTheta) / thetaStep + 0.5) + 1; }
+    int psiCount() const { return static_cast<int>(lastPsi() / psiStep + 0.5) + 1; }
+    double theta(int i) const { return firstTheta + i * thetaStep; }
+    double psi(int j) const { return j * psiStep; }
+};
+
+/// A grid for `dist`: its steps are at most the smallest of its web, at least 1 degree, and fine enough to lose
+/// less than 0.1 % of the peak between the angles, where 1 degree can. Throws std::bad_alloc.
+SamplingPlan planSampling(Ov::RnIntensityDist& dist, bool wholeDegrees = false);
+
+/// Candela on a grid as planned.
+CandelaGrid sampledGrid(const Ov::RnIntensityDist& dist, const SamplingPlan& plan);
+
+}  // namespace OvPhotometrics
