@@ -1,10 +1,8 @@
-#include <new>
-
 #include "components/messageFile/messageIds.h"
 #include "components/photo/ies/ies.h"
 #include "components/photo/ies/photoWebIES.h"
 #include "components/photo/lid/gridLayout.h"
-#include "components/photo/lid/reportMessage.h"
+#include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {
 
@@ -47,13 +45,11 @@ bool iesRecordToWeb(const IesFileRecord& rec, PhotoWebIES& web, bool loaded, con
                     const wchar_t* basePath) {
     WebLayout layout;
     if (!chooseLayout(rec, layout)) return false;
-    try {
+    return withinMemory([&] {
         if (install(rec, layout, web, loaded, name, basePath)) return true;
         reportMessage(messages::webRefused);
-    } catch (const std::bad_alloc&) {
-        reportMessage(messages::outOfMemory);
-    }
-    return false;
+        return false;
+    });
 }
 
 }  // namespace OvPhotometrics

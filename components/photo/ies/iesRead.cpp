@@ -5,7 +5,7 @@
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/ies/ies.h"
-#include "components/photo/lid/reportMessage.h"
+#include "components/photo/lid/withinMemory.h"
 #include "host/componentManager/processController.h"
 #include "host/platform/file.h"
 
@@ -89,36 +89,23 @@ bool readTiltAngles(NumberText& in, int pairs, std::vector<float>& angles) {
 }
 
 bool readTiltBlock(IesTilt& tilt, NumberText& in) {
-    in.readInteger(tilt.geometry);
-    if (tilt.geometry < 1 || tilt.geometry > 3) return refuse(messages::tiltGeometry, tilt.geometry);
+    if (!in.readInteger(tilt.geometry, messages::tiltGeometry, 1, 3)) return false;
     std::int32_t pairs = 0;
-    in.readInteger(pairs);
-    if (pairs < 2) return refuse(messages::tiltPairCount, pairs);
+    if (!in.readInteger(pairs, messages::tiltPairCount, 2)) return false;
     return readTiltAngles(in, pairs, tilt.tiltAngles) &&
            (in.readFloats(static_cast<std::size_t>(pairs), tilt.tiltFactors) ||
             refuse(messages::tiltFactors, pairs));
 }
 
-bool readCount(NumberText& in, std::int32_t& count, std::int32_t least, unsigned failure) {
-    in.readInteger(count);
-    return count >= least || refuse(failure, count);
-}
-
-bool readCode(NumberText& in, std::int32_t& code, std::int32_t last, unsigned failure) {
-    in.readInteger(code);
-    return (code >= 1 && code <= last) || refuse(failure, code);
-}
-
 bool readNumbers(IesFileRecord& rec, NumberText& in) {
-    if (!readCount(in, rec.lampCount, 1, messages::lampCount)) return false;
+    if (!in.readInteger(rec.lampCount, messages::lampCount, 1)) return false;
     in.readFloat(rec.lumensPerLamp);
     in.readFloat(rec.candelaMultiplier);
-    if (!readCount(in, rec.grid.verticalCount, 2, messages::verticalCount)) return false;
-    if (!readCount(in, rec.grid.horizontalCount, 1, messages::horizontalCount)) return false;
+    if (!candelaGridReadCounts(rec.grid, in)) return false;
     std::int32_t type = 0;
-    if (!readCode(in, type, 3, messages::photometricType)) return false;
+    if (!in.readInteger(type, messages::photometricType, 1, 3)) return false;
     rec.photometricType = static_cast<IesPhotometricType>(type);
-    if (!readCode(in, rec.unitsType, 2, messages::unitsType)) return false;
+    if (!in.readInteger(rec.unitsType, messages::unitsType, 1, 2)) return false;
     for (float* dimension : {&rec.width, &rec.length, &rec.height}) in.readFloat(*dimension);
     if (in.failed()) return refuse(messages::dimensions);
     for (float* factor : {&rec.ballastFactor, &rec.ballastLampFactor, &rec.inputWatts}) in.readFloat(*factor);
@@ -154,11 +141,7 @@ bool iesReadTilt(IesTilt& tilt, Ov::RnStream& in) {
 
 bool iesReadRecord(IesFileRecord& rec, Ov::RnStream& in, const wchar_t* basePath) {
     rec = IesFileRecord();
-    try {
-        if (readFile(rec, in, basePath)) return true;
-    } catch (const std::bad_alloc&) {
-        reportMessage(messages::outOfMemory);
-    }
+    if (withinMemory([&] { return readFile(rec, in, basePath); })) return true;
     rec = IesFileRecord();
     return false;
 }

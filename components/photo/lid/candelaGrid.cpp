@@ -29,6 +29,21 @@ bool readGroup(NumberText& in, int count, std::vector<float>& values, unsigned f
     return false;
 }
 
+int sampledPlanes(PhotoWebSymmetry symmetry, LastPlane lastPlane) {
+    const int last = lastPlane == LastPlane::with ? 1 : 0;
+    switch (symmetry) {
+        case PhotoWebSymmetry::Full:
+            return 36;
+        case PhotoWebSymmetry::Half:
+            return 18 + last;
+        case PhotoWebSymmetry::Quarter:
+            return 9 + last;
+        case PhotoWebSymmetry::Axial:
+            break;
+    }
+    return 1;
+}
+
 }  // namespace
 
 bool candelaGridAlloc(CandelaGrid& grid, int verticalCount, int horizontalCount) {
@@ -48,6 +63,11 @@ bool candelaGridAlloc(CandelaGrid& grid, int verticalCount, int horizontalCount)
     return false;
 }
 
+bool candelaGridReadCounts(CandelaGrid& grid, NumberText& in) {
+    return in.readInteger(grid.verticalCount, messages::verticalCount, 2) &&
+           in.readInteger(grid.horizontalCount, messages::horizontalCount, 1);
+}
+
 bool candelaGridRead(CandelaGrid& grid, NumberText& in) {
     const std::size_t candelas = product(grid.verticalCount, grid.horizontalCount);
     if (candelas <= std::numeric_limits<std::int32_t>::max()) {
@@ -60,6 +80,14 @@ bool candelaGridRead(CandelaGrid& grid, NumberText& in) {
     }
     reportParseMessage(messages::outOfMemory);
     return false;
+}
+
+void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit) {
+    writeValueList(grid.verticalAngles.size(), grid.verticalAngles.data(), out, limit);
+    writeValueList(grid.horizontalAngles.size(), grid.horizontalAngles.data(), out, limit);
+    const auto row = static_cast<std::size_t>(grid.verticalCount);
+    for (int j = 0; j < grid.horizontalCount; ++j)
+        writeValueList(row, &grid.candelas[grid.index(0, j)], out, limit);
 }
 
 GridFit gridFit(const Ov::RnPhotoWebData& web) {
@@ -91,10 +119,10 @@ bool candelaGridFromWeb(CandelaGrid& grid, const Ov::RnPhotoWebData& web, GridFi
     return true;
 }
 
-bool candelaGridFromSampling(CandelaGrid& grid, const Ov::RnIntensityDist& dist, int horizontalCount,
+bool candelaGridFromSampling(CandelaGrid& grid, const Ov::RnIntensityDist& dist, LastPlane lastPlane,
                              float factor) {
     constexpr int step = 10;  // degrees
-    if (!candelaGridAlloc(grid, 180 / step + 1, horizontalCount)) return false;
+    if (!candelaGridAlloc(grid, 180 / step + 1, sampledPlanes(dist.getSymmetry(), lastPlane))) return false;
     for (int j = 0; j < grid.horizontalCount; ++j) {
         grid.horizontalAngles[static_cast<std::size_t>(j)] = static_cast<float>(step * j);
         for (int i = 0; i < grid.verticalCount; ++i)

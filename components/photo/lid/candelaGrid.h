@@ -32,9 +32,14 @@ struct CandelaGrid {
 /// as it was, after message 12936.
 bool candelaGridAlloc(CandelaGrid& grid, int verticalCount, int horizontalCount);
 
+/// Reads the counts, at least 2 by 1. False after the messages of what is wrong (12960, 12961).
+bool candelaGridReadCounts(CandelaGrid& grid, NumberText& in);
 /// Reads angles and candelas for the counts that stand in `grid`. False after the messages of what failed (12936,
 /// 12966 to 12968).
 bool candelaGridRead(CandelaGrid& grid, NumberText& in);
+
+/// Writes vertical angles, horizontal angles and each row of candelas as value lists.
+void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit);
 
 /// How a web's own grid can stand in a file: as planes through the vertical axis, as angles centred on 0 or to one
 /// side of it, or not at all.
@@ -43,9 +48,11 @@ GridFit gridFit(const Ov::RnPhotoWebData& web);
 /// Copies a web's grid that fits: angles in degrees (a full lateral one centred on 0), relative values times
 /// `factor`. False after message 12936.
 bool candelaGridFromWeb(CandelaGrid& grid, const Ov::RnPhotoWebData& web, GridFit fit, float factor);
-/// Samples a distribution every 10 degrees, 19 vertical angles, with as many planes as `horizontalCount`; candela
-/// times `factor`. False after message 12936.
-bool candelaGridFromSampling(CandelaGrid& grid, const Ov::RnIntensityDist& dist, int horizontalCount,
+/// Whether the last plane of a half or quarter circle, 180 or 90, is sampled too.
+enum class LastPlane { without, with };
+/// Samples a distribution every 10 degrees: 19 vertical angles, planes from 0 over its circle, half or quarter, or
+/// one plane; candela times `factor`. False after message 12936.
+bool candelaGridFromSampling(CandelaGrid& grid, const Ov::RnIntensityDist& dist, LastPlane lastPlane,
                              float factor);
 
 }  // namespace OvPhotometrics

@@ -41,9 +41,9 @@ bool NumberText::fail(unsigned id) {
     return false;
 }
 
-bool NumberText::fail(unsigned id, int character) {
+bool NumberText::fail(unsigned id, int argument) {
     _failed = true;
-    reportParseMessage(id, character);
+    reportParseMessage(id, argument);
     return false;
 }
 
@@ -86,6 +86,11 @@ bool NumberText::readInteger(std::int32_t& value) {
     if (converted && atNumberEnd()) return true;
     value = -1;
     return fail(messages::numberNotConverted);
+}
+
+bool NumberText::readInteger(std::int32_t& value, unsigned failure, std::int32_t least, std::int32_t most) {
+    readInteger(value);
+    return (value >= least && value <= most) || fail(failure, value);
 }
 
 bool NumberText::readFloat(float& value) {

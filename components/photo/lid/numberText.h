@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -32,6 +33,9 @@ public:
 
     /// A fraction of zeros ("73.0") counts as part of an integer.
     bool readInteger(std::int32_t& value);
+    /// An integer from `least` to `most`; another value is reported through `failure`, its argument.
+    bool readInteger(std::int32_t& value, unsigned failure, std::int32_t least,
+                     std::int32_t most = std::numeric_limits<std::int32_t>::max());
     bool readFloat(float& value);
     /// Reads a group to its end, even when a number fails; only the end of the input ends it. Memory is taken as
     /// values arrive. Throws std::bad_alloc.
@@ -45,7 +49,7 @@ private:
     bool findNumber(unsigned unexpected, std::int32_t& instead);
     bool atNumberEnd();
     bool fail(unsigned id);
-    bool fail(unsigned id, int character);
+    bool fail(unsigned id, int argument);
 
     Ov::RnStream& _in;
     AtEnd _atEnd;

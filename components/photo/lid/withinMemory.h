@@ -1,0 +1,21 @@
+#pragma once
+
+#include <new>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/reportMessage.h"
+
+namespace OvPhotometrics {
+
+/// Does `work`, which answers a bool; false after message 12936 where memory runs out.
+template <class Work>
+bool withinMemory(Work&& work) {
+    try {
+        return work();
+    } catch (const std::bad_alloc&) {
+        reportMessage(messages::outOfMemory);
+        return false;
+    }
+}
+
+}  // namespace OvPhotometrics
