@@ -22,14 +22,15 @@ protected:
         Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager())->addRegistry(lidComponent());
     }
 
-    /// Imports text through the IES builder; null when it is refused.
-    RnRef<PhotoWebIES> import(const std::string& text, const wchar_t* name = L"",
-                              const wchar_t* basePath = nullptr) {
+    /// Imports text through a format's builder; null when it is refused.
+    template <class Format = IesFormat>
+    RnRef<typename Format::Web> import(const std::string& text, const wchar_t* name = L"",
+                                       const wchar_t* basePath = nullptr) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
         try {
-            const auto object =
-                immortal<IESBuilder>().import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), name, basePath);
-            return RnRef<PhotoWebIES>::share(dynamic_cast<PhotoWebIES*>(object.get()));
+            const auto object = immortal<PhotoWebBuilder<Format>>().import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()),
+                                                                           name, basePath);
+            return RnRef<typename Format::Web>::share(dynamic_cast<typename Format::Web*>(object.get()));
         } catch (const Ov::RnStreamEx::ExReadError&) {
             return {};
         }
