@@ -38,11 +38,10 @@ PhotoWebSymmetry turned(PhotoWebSymmetry symmetry, double degrees) {
     return kept ? symmetry : PhotoWebSymmetry::Full;
 }
 
-/// The largest step up to `limit` degrees that divides 90.
+/// The largest step up to `limit` degrees that divides 90 and is a multiple of 0.01, or of 1.
 double stepUpTo(double limit, bool wholeDegrees) {
-    static constexpr double steps[] = {90, 45, 30, 22.5, 18, 15, 10, 9, 7.5, 6, 5, 4.5, 3, 2.5, 2, 1.5};
-    for (const double step : steps)
-        if (step <= limit + sameAngle && !(wholeDegrees && step != std::floor(step))) return step;
+    for (int parts = 1; parts < 90; ++parts)
+        if ((wholeDegrees ? 90 : 9000) % parts == 0 && 90.0 / parts <= limit + sameAngle) return 90.0 / parts;
     return finest;
 }
 
