@@ -63,6 +63,27 @@ public:
     static constexpr RnUid iid{0x1a3aa362, 0xb3bd11d1, 0xa3e70060, 0x9707609d};
 };
 
+/// Light in proportion to the cosine of the angle to the axis, and none behind.
+class RnDiffuseIntensityDist : public RnIntensityDist {
+public:
+    static constexpr RnUid iid{0x1a3aa363, 0xb3bd11d1, 0xa3e70060, 0x9707609d};
+};
+
+/// A beam around the axis: a power of the cosine that is down to half at the hotspot angle, and nothing beyond the
+/// falloff angle. A hotspot of less than about 0.1 degree gives no light.
+class RnSpotlightIntensityDist : public RnIntensityDist {
+public:
+    static constexpr RnUid iid{0x1a3aa364, 0xb3bd11d1, 0xa3e70060, 0x9707609d};
+
+    virtual float getHotspotCosine() const = 0;
+    virtual float getFalloffCosine() const = 0;
+    /// Both keep the intensity, so that the flux changes. A cosine outside its limits, or NaN, is stored as a
+    /// limit: hotspots up to about 89 degrees (0.01745328 and more), falloffs from about 0.1 to 90 (0 to
+    /// 0.99999845).
+    virtual void setHotspotCosine(float cosine) = 0;
+    virtual void setFalloffCosine(float cosine) = 0;
+};
+
 /// A photometric web placed in the light's frame. It is dark until it has a web and an intensity or flux.
 class RnWebIntensityDist : public RnIntensityDist {
 public:

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cmath>
+
 #include "host/componentManager/castImpl.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
@@ -42,6 +44,23 @@ public:
     void hook() override {}
 
     float candela = 0;  // the intensity parameter, candela
+};
+
+/// An analytic distribution whose intensity follows from the cosine of the angle to the axis: `Self::law`. A zero
+/// vector has no such angle; its cosine is NaN.
+template <class Self, class Adapter, class Interface>
+class CosineDist : public AnalyticDist<Self, Adapter, Interface> {
+public:
+    float intensity(float theta, float) const override {
+        return self().law(static_cast<float>(std::cos(static_cast<double>(theta))));
+    }
+    float intensityAt(const GeVector3<float>& direction) const override {
+        return self().law(direction.z / direction.length());
+    }
+    float intensityAtUnit(const GeVector3<float>& direction) const override { return self().law(direction.z); }
+
+private:
+    const Self& self() const { return static_cast<const Self&>(*this); }
 };
 
 /// Saves and loads a distribution whose one field is `candela`.

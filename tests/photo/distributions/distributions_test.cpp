@@ -1,4 +1,8 @@
+#include <limits>
+
+#include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
+#include "components/photo/distributions/spotlight.h"
 #include "components/photo/distributions/web.h"
 #include "tests/photo/photoFixture.h"
 
@@ -17,6 +21,115 @@ TEST_F(Distributions, IsotropicFluxAndIntensity) {
     const auto clone = lamp->clone();
     clone->setPeakIntensity(1);
     EXPECT_FLOAT_EQ(lamp->getPeakIntensity(), 79.577469f);
+}
+
+float cosineOf(double degrees) { return static_cast<float>(std::cos(inRadians(degrees))); }
+
+RnRef<Spotlight> makeSpotlight(double hotspot, double falloff, float candela) {
+    const auto spot = Ov::rnCreate<Spotlight>();
+    spot->setHotspotCosine(cosineOf(hotspot));
+    spot->setFalloffCosine(cosineOf(falloff));
+    spot->setPeakIntensity(candela);
+    return spot;
+}
+
+/// The flux of an axial distribution, in rings.
+double integrateSphere(const Ov::RnIntensityDist& dist) {
+    constexpr int rings = 20000;
+    const double step = static_cast<double>(dist.getThetaRange().last) / rings;
+    double sum = 0;
+    for (int k = 0; k < rings; ++k) {
+        const double theta = (k + 0.5) * step;
+        sum += static_cast<double>(dist.intensity(static_cast<float>(theta), 1)) * std::sin(theta);
+    }
+    return sum * step * 2 * 3.14159265358979;
+}
+
+TEST_F(Distributions, AnalyticLaws) {
+    const auto diffuse = Ov::rnCreate<Diffuse>();
+    diffuse->setFlux(31.415927f);
+    const auto spot = Ov::rnCreate<Spotlight>();
+    spot->setPeakIntensity(100);
+    const auto narrowCone = makeSpotlight(60, 30, 8);
+    const struct {
+        const Ov::RnIntensityDist& dist;
+        double theta;
+        double candela;
+    } cases[] = {{*diffuse, 0, 10},   {*diffuse, 60, 5}, {*diffuse, 90, 0},    {*diffuse, 120, 0},
+                 {*spot, 0, 100},     {*spot, 30, 50},   {*spot, 45, 18.8231}, {*spot, 59, 4.08695},
+                 {*spot, 61, 0},      {*spot, 180, 0},   {*narrowCone, 0, 8},  {*narrowCone, 29.9, 6.93517},
+                 {*narrowCone, 31, 0}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.theta);
+        const GeVector3<float> unit = direction(c.theta, 50);
+        const GeVector3<float> longer{7 * unit.x, 7 * unit.y, 7 * unit.z};
+        for (const float candela : {c.dist.intensity(toRadians(c.theta), 2), c.dist.intensityAt(longer),
+                                    c.dist.intensityAtUnit(unit), c.dist.localIntensity(toRadians(c.theta), 2),
+                                    c.dist.localIntensityAt(longer), c.dist.localIntensityAtUnit(unit)})
+            EXPECT_NEAR(candela, c.candela, 1e-6 + c.candela * 1e-5);
+        EXPECT_EQ(c.dist.intensityAt({0, 0, 0}), 0);
+        EXPECT_THROW(c.dist.toLocalNormalized({0, 0, 0}), Ov::ExAssertion);
+    }
+    EXPECT_FLOAT_EQ(spot->getFlux(), 106.0671f);
+    EXPECT_FLOAT_EQ(narrowCone->getThetaRange().last, toRadians(60));  // the wider angle
+}
+
+TEST_F(Distributions, FluxIsTheIntegralOfIntensity) {
+    const auto diffuse = Ov::rnCreate<Diffuse>();
+    diffuse->setFlux(500);
+    EXPECT_NEAR(integrateSphere(*diffuse), 500, 0.5);
+    const double beams[][2] = {{1, 2}, {1, 90}, {2, 1}, {10, 20}, {30, 60}, {45, 45}, {60, 30}, {89, 90}};
+    for (const auto& [hotspot, falloff] : beams) {
+        const auto spot = makeSpotlight(hotspot, falloff, 0);
+        spot->setFlux(500);
+        EXPECT_NEAR(integrateSphere(*spot), 500, 0.5) << hotspot << "/" << falloff;
+        EXPECT_FLOAT_EQ(spot->getFlux(), 500);
+    }
+}
+
+TEST_F(Distributions, SpotlightCosinesStayInTheirLimits) {
+    constexpr float nan = std::numeric_limits<float>::quiet_NaN();
+    const struct {
+        float cosine, hotspot, falloff;
+    } cases[] = {{0, 0.01745328f, 0}, {-0.3f, 0.01745328f, 0}, {nan, 0.01745328f, 0},
+                 {0.5f, 0.5f, 0.5f},  {1, 1, 0.99999845f},     {1.5f, 1.5f, 0.99999845f}};
+    for (const auto& c : cases) {
+        const auto spot = Ov::rnCreate<Spotlight>();
+        spot->setHotspotCosine(c.cosine);
+        spot->setFalloffCosine(c.cosine);
+        EXPECT_EQ(spot->getHotspotCosine(), c.hotspot);
+        EXPECT_EQ(spot->getFalloffCosine(), c.falloff);
+        spot->setFlux(100);
+        const bool lit = c.hotspot <= 0.99999845f;
+        EXPECT_EQ(spot->intensity(0, 0) > 0, lit) << c.cosine;
+        EXPECT_FLOAT_EQ(spot->getFlux(), lit ? 100.0f : 0.0f);
+    }
+}
+
+TEST_F(Distributions, ASpotlightReadsBackExactlyOrStays) {
+    const auto spot = makeSpotlight(12.3, 45.6, 0.1f);
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(saved(*spot));
+    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+    const auto loaded = Ov::rnCreate<Spotlight>();
+    const auto clone = spot->clone();
+    Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(stream, 0, nullptr, nullptr);
+    for (const Ov::RnIntensityDist* copy : {static_cast<Ov::RnIntensityDist*>(loaded.get()), clone.get()}) {
+        EXPECT_EQ(copy->getFlux(), spot->getFlux());
+        EXPECT_EQ(copy->intensity(0.3f, 0), spot->intensity(0.3f, 0));
+        EXPECT_EQ(copy->getThetaRange().last, spot->getThetaRange().last);
+    }
+
+    const auto cut = Ov::rnCreate<Ov::RnMemoryBuffer>("5 0.9");
+    Ov::RnStream cutStream(cut.get(), Ov::RnStream::Form::text);
+    EXPECT_THROW(Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(cutStream, 0, nullptr, nullptr),
+                 Ov::RnStreamEx::ExReadError);
+    EXPECT_EQ(saved(*loaded), saved(*spot));
+
+    const auto beyond = Ov::rnCreate<Ov::RnMemoryBuffer>("5 1 0");  // cosines are not limited: dark
+    Ov::RnStream beyondStream(beyond.get(), Ov::RnStream::Form::text);
+    Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(beyondStream, 0, nullptr, nullptr);
+    EXPECT_EQ(loaded->getHotspotCosine(), 1);
+    EXPECT_EQ(loaded->intensity(0, 0) + loaded->getFlux(), 0);
 }
 
 TEST_F(Distributions, SavedOnesReadBackExactly) {

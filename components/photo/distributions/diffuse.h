@@ -1,0 +1,30 @@
+#pragma once
+
+#include "components/photo/distributions/analytic.h"
+#include "components/photo/lid/lidBuilder.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+class Diffuse;
+using DiffusePersistant = CandelaPersistant<Diffuse>;
+
+/// A Lambertian emitter that faces +Z: candela times the cosine, 0 behind; flux = pi candela.
+class Diffuse final : public CosineDist<Diffuse, DiffusePersistant, Ov::RnDiffuseIntensityDist> {
+public:
+    static constexpr BuilderFacts facts{classIds::diffuse, distributionCategory, L"Diffuse Distribution",
+                                        L"Diffuse Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = facts.classId;
+
+    float law(float cosine) const { return cosine > 0 ? cosine * candela : 0; }
+    float getFlux() const override { return candela * pi; }
+    void setFlux(float lumens) override { candela = lumens / pi; }
+    AngleRange getThetaRange() const override { return {0, 1.5707964f}; }
+
+private:
+    static constexpr float pi = 3.1415927f;
+};
+
+using DiffuseBuilder = ObjectBuilder<Diffuse>;
+
+}  // namespace OvPhotometrics
