@@ -1,5 +1,6 @@
 #include "components/photo/lid/registration.h"
 
+#include "components/photo/cibse/photoWebCIBSE.h"
 #include "components/photo/distributions/isotropic.h"
 #include "components/photo/distributions/web.h"
 #include "components/photo/ies/photoWebIES.h"
@@ -10,6 +11,7 @@ namespace OvPhotometrics {
 
 void registerBuilders() {
     BuilderTable& table = builderTable();
+    table.add(immortal<CIBSEBuilder>());
     table.add(immortal<DaylightBuilder>());
     table.add(immortal<WebBuilder>());
     table.add(immortal<IESBuilder>());

@@ -1,0 +1,130 @@
+#include "components/photo/cibse/cibse.h"
+
+#include <span>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/lid/gridLayout.h"
+#include "components/photo/lid/withinMemory.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr const wchar_t* signature = L"CIBSE/1";
+constexpr int valueLineLimit = 79;  // no value line reaches this many characters
+
+constexpr PolarRules type1{cibseTolerance, messages::cibseType1VerticalRange,
+                           messages::cibseType1LastHorizontalAngle, messages::cibseType1FirstHorizontalAngle,
+                           true};
+constexpr LateralRules type2{cibseTolerance, messages::cibseType2VerticalRange,
+                             messages::cibseType2HorizontalCount, messages::cibseType2HorizontalRange};
+
+bool refuse(unsigned id) {
+    reportParseMessage(id);
+    return false;
+}
+
+/// No line at the end of the input counts as an empty one.
+bool readLabels(CibseRecord& rec, Ov::RnStream& in) {
+    constexpr const wchar_t* line = L"%60[^\r\n]";
+    std::wstring first;
+    readTextLine(in, line, first);
+    if (!first.starts_with(signature)) return refuse(messages::cibseFirstLine);
+    for (std::wstring& label : rec.labels) readTextLine(in, line, label);
+    return true;
+}
+
+bool readGroup(NumberText& in, std::span<float> values, unsigned failure) {
+    for (float& value : values) in.readFloat(value);
+    return !in.failed() || refuse(failure);
+}
+
+bool readNumbers(CibseRecord& rec, NumberText& in) {
+    if (!in.readInteger(rec.leadInteger, messages::lampCount, 1)) return false;
+    std::int32_t type = 0;
+    if (!in.readInteger(type, messages::photometricType, 1, 2)) return false;
+    rec.photometricType = static_cast<CibsePhotometricType>(type);
+    if (!readGroup(in, rec.leadValues, messages::dimensions) || !readGroup(in, rec.factors, messages::factors) ||
+        !readGroup(in, std::span(&rec.singleValue, 1), messages::cibseNinthNumber))
+        return false;
+    if (!candelaGridReadCounts(rec.grid, in) || !candelaGridRead(rec.grid, in)) return false;
+    in.readInteger(rec.trailerInteger);
+    return readGroup(in, rec.trailerValues, messages::cibseTrailer);
+}
+
+bool readFile(CibseRecord& rec, Ov::RnStream& in) {
+    if (!readLabels(rec, in)) return false;
+    NumberText numbers(in, NumberText::AtEnd::unexpectedBlank);
+    return readNumbers(rec, numbers);
+}
+
+bool isType1(const CibseRecord& rec) { return rec.photometricType == CibsePhotometricType::type1; }
+
+bool install(const CibseRecord& rec, const WebLayout& layout, PhotoWebCIBSE& web, bool loaded,
+             const wchar_t* name) {
+    if (layout.columns == 0) return false;  // 270 alone: a last plane that repeats itself
+    PhotoWebRecord webRecord;
+    photoWebRecordInit(webRecord, rec.grid.verticalCount, layout.columns, layout.symmetry, false, loaded, name);
+    fillWebRecord(webRecord, rec.grid, layout, rec.factors[0]);
+    if (layout.horizontalShift != 0)
+        photoWebRecordSetOrientation(webRecord, isType1(rec) ? turnedBy(layout.horizontalShift)
+                                                             : laidDownBy(layout.horizontalShift, -halfPi));
+    return photoWebInstall(web, webRecord);
+}
+
+}  // namespace
+
+bool cibseRead(CibseRecord& rec, Ov::RnStream& in) {
+    rec = CibseRecord();
+    if (withinMemory([&] { return readFile(rec, in); })) return true;
+    rec = CibseRecord();
+    return false;
+}
+
+bool cibseToWeb(const CibseRecord& rec, PhotoWebCIBSE& web, bool loaded, const wchar_t* name) {
+    WebLayout layout;
+    if (!(isType1(rec) ? polarLayout(rec.grid, type1, layout) : lateralLayout(rec.grid, type2, layout)))
+        return false;
+    return withinMemory([&] {
+        if (install(rec, layout, web, loaded, name)) return true;
+        reportMessage(messages::webRefused);
+        return false;
+    });
+}
+
+bool cibseRecordFromDistribution(Ov::RnIntensityDist& dist, CibseRecord& rec) {
+    const float flux = dist.getFlux();
+    const float scale = flux > 0 ? static_cast<float>(1000.0 / flux) : 0;
+    const auto web = webOf(dist);
+    const GridFit fit = web ? gridFit(*web) : GridFit::none;
+    if (fit == GridFit::none) return cibseResample(dist, rec, scale);
+    rec = CibseRecord();
+    rec.photometricType = fit == GridFit::polar ? CibsePhotometricType::type1 : CibsePhotometricType::type2;
+    return candelaGridFromWeb(rec.grid, *web, fit, scale);
+}
+
+bool cibseResample(Ov::RnIntensityDist& dist, CibseRecord& rec, float scale) {
+    rec = CibseRecord();
+    return candelaGridFromSampling(rec.grid, dist, LastPlane::with, scale);
+}
+
+bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out) {
+    const auto writeThree = [&](const std::array<float, 3>& values, const wchar_t* format, auto... before) {
+        writeLine(out, format, before..., values[0], values[1], values[2]);
+    };
+    writeLine(out, L"%s", signature);
+    for (const std::wstring& label : rec.labels)
+        writeLine(out, L"%s", label.empty() ? L" " : labelText(label, cibseLabelLimit).c_str());
+    writeThree(rec.leadValues, L"%d %d %.16g %.16g %.16g", rec.leadInteger, static_cast<int>(rec.photometricType));
+    writeThree(rec.factors, L"%.16g %.16g %.16g");
+    writeLine(out, L"%.2f", rec.singleValue);
+    writeLine(out, L"%d %d", rec.grid.verticalCount, rec.grid.horizontalCount);
+    candelaGridWrite(rec.grid, out, valueLineLimit);
+    writeThree(rec.trailerValues, L"%d %.16g %.16g %.16g", rec.trailerInteger);
+    return true;
+}
+
+bool cibseCanRead(Ov::RnBufferedIO& io) { return matchesAt(io, signature); }
+
+}  // namespace OvPhotometrics

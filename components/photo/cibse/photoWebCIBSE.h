@@ -1,0 +1,37 @@
+#pragma once
+
+#include "components/photo/cibse/cibse.h"
+#include "components/photo/lid/photoWebComponent.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+struct CibseFormat {
+    using Web = PhotoWebCIBSE;
+    using Record = CibseRecord;
+    static constexpr BuilderFacts facts{classIds::cibseWeb, photometricWebCategory, L"CIBSE Web",
+                                        L"CIBSE Photometric Web"};
+    static constexpr const wchar_t* extension = L"cib";
+    static constexpr const char* source = "components/photo/cibse/cibse";
+    static constexpr int saveLine = 218;
+    static constexpr int loadLine = 229;
+    static constexpr const char* streamName = "CIBSE stream";
+
+    static constexpr auto canImport = cibseCanRead;
+    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return cibseRead(rec, in); }
+    static bool toWeb(const Record& rec, Web& web, bool loaded, const wchar_t* name, const wchar_t*) {
+        return cibseToWeb(rec, web, loaded, name);
+    }
+    static constexpr auto fromDistribution = cibseRecordFromDistribution;
+    static constexpr auto write = cibseWrite;
+    static constexpr auto describe = cibseDescribe;
+    static constexpr auto carry = cibseCarry;
+};
+
+/// A web read from a CIBSE file.
+class PhotoWebCIBSE final : public PhotoWebOf<PhotoWebCIBSE, CibseFormat> {};
+
+using PhotoWebCIBSEPersistant = PhotoWebPersistant<CibseFormat>;
+using CIBSEBuilder = PhotoWebBuilder<CibseFormat>;
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,175 @@
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "tests/photo/photoFixture.h"
+
+namespace OvPhotometrics {
+namespace {
+
+using Labels = std::array<std::wstring, 7>;
+
+class Cibse : public Photo {
+protected:
+    RnRef<PhotoWebCIBSE> importCibse(const std::string& text) { return import <CibseFormat>(text); }
+
+    CibseRecord read(const std::string& text) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        CibseRecord rec;
+        EXPECT_TRUE(cibseRead(rec, stream)) << log.take();
+        return rec;
+    }
+};
+
+const std::string head = "CIBSE/1 and more\nMaker\n\n\n\n\n\n\n";
+
+/// A file with values i + 10 j + 1.
+std::string file(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
+    std::string text = head + "1 " + std::to_string(type) + " 0 0 0\n2 0 0\n0\n" +
+                       std::to_string(vertical.size()) + "," + std::to_string(horizontal.size()) + "\r\n" +
+                       joined(vertical) + joined(horizontal);
+    for (std::size_t j = 0; j < horizontal.size(); ++j)
+        for (std::size_t i = 0; i < vertical.size(); ++i) text += std::to_string(i + 10 * j + 1) + " ";
+    return text + "99 0 0 0";
+}
+
+TEST_F(Cibse, EachFaultHasItsMessage) {
+    const struct {
+        std::string text, messages;
+    } cases[] = {
+        {"cibse/1\n", "12945 12989"},
+        {"CIBSE/1\n\n", "12945 12947  ; 12945 12959 0"},
+        {head + "1 3", "12945 12962 3"},
+        {head + "1 1 0 +1 0", "12945 12948 +; 12945 12964"},
+        {head + "1 1 0 0 0 1 0", "12945 12948  ; 12945 12965"},
+        {head + "1 1 0 0 0 1 0 0 a", "12945 12948 a; 12945 12990"},
+        {head + "1 1 0 0 0 1 0 0 0 1", "12945 12960 1"},
+        {head + "1 1 0 0 0 1 0 0 0 40000 40000 0 1", "12945 12948  ; 12945 12966"},
+        {head + "1 1 0 0 0 1 0 0 0 2 1 0 90 0 1 1 99 x 0 1e99", "12945 12948 x; 12945 12946; 12945 12991"},
+        {file(1, {0, 90}, {0, 90, 45}), "12944"},
+        {file(2, {0, 90}, {270, 0, 90}), "12944"},
+        {file(1, {0, 120}, {0}), "12985"},
+        {file(1, {0, 90}, {0, 90.06}), "12986 90.06"},
+        {file(1, {0, 90}, {90, 180}), "12987 90"},
+        {file(1, {0, 90}, {270}), "12935"},
+        {file(1, {0, 90}, {270, 0, 300, 90}), "12926; 12935"},
+        {file(2, {-91, 0}, {0, 90}), "12982"},
+        {file(2, {-90, 90}, {0}), "12983"},
+        {file(2, {-90, 90}, {0, 91}), "12984"},
+    };
+    for (const auto& c : cases) {
+        EXPECT_FALSE(importCibse(c.text)) << c.text;
+        EXPECT_EQ(log.take(), c.messages) << c.text;
+    }
+}
+
+TEST_F(Cibse, PlanesAreLitWhereTheFileSays) {
+    using enum PhotoWebSymmetry;
+    const struct {
+        int type;
+        std::vector<double> horizontal;
+        PhotoWebSymmetry symmetry;
+        int psis;
+        std::vector<double> directions;  // horizontal angles of the values at the middle vertical angle
+    } cases[] = {
+        {1, {0, 45, 90.04}, Quarter, 3, {0, 45, 90}},
+        {1, {0, 90, 180, 270, 360}, Full, 4, {0, 90, 180, 270}},
+        {1, {90, 180, 270}, Half, 3, {90, 180, 270}},
+        {1, {270, 330, 0, 30, 90}, Half, 5, {270, 330, 0, 30, 90}},
+        {1, {270, 0, 90, 180, 270}, Full, 4, {270, 0, 90, 180}},
+        {1, {270, 360, 90, 225}, Full, 4, {270, 0, 90, 225}},
+        {2, {-70, 0, 80}, Full, 3, {-1, -90}},  // turned: the axis lies at -Y
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(joined(c.horizontal));
+        const auto web = importCibse(
+            file(c.type, c.type == 1 ? std::vector<double>{0, 90, 180} : std::vector<double>{-90, 0, 90},
+                 c.horizontal));
+        ASSERT_TRUE(web) << log.take();
+        EXPECT_EQ(web->getSymmetry(), c.symmetry);
+        EXPECT_EQ(web->getPsiCount(), c.psis);
+        const auto light = distributionOf(*web);
+        light->setPeakIntensity(web->getMaxCandela());
+        for (std::size_t j = c.type == 1 ? 0 : 1; j < c.directions.size(); ++j)
+            EXPECT_NEAR(light->intensityAtUnit(direction(90, c.directions[j])), 2 * (10.0 * double(j) + 2), 0.05);
+    }
+}
+
+TEST_F(Cibse, SavesGridsThatFitAndSamplesOthers) {
+    const std::string first = "CIBSE/1\n \n \n \n \n \n \n \n1 ";
+    const std::string factors = " 0 0 0\n1 0 0\n0.00\n";
+    const auto web = importCibse(file(1, {0, 180}, {0, 90}));
+    CibseRecord rec;
+    const auto light = distributionOf(*web);
+    light->setFlux(2000);
+    ASSERT_TRUE(cibseRecordFromDistribution(*light, rec));
+    EXPECT_EQ(rec.grid.candelas, (std::vector<float>{0.5f / 12, 1 / 12.0f, 5.5f / 12, 0.5f}));
+    EXPECT_TRUE(saved(*web).starts_with(first + "1" + factors + "2 2\n 0.00 180.00\n 0.00 90.00\n "));
+    EXPECT_TRUE(saved(*importCibse(file(2, {-30, 30}, {-70, 50})))
+                    .starts_with(first + "2" + factors + "2 2\n 60.00 120.00\n -60.00 60.00\n "));
+    EXPECT_EQ(saved(*immortal<CIBSEBuilder>().create()),
+              first + "2" + factors + "2 1\n 0.00 180.00\n 0.00\n 0.00 0.00\n99 0 0 0\n");
+
+    PhotoWebRecord half;
+    photoWebRecordInit(half, 2, 2, PhotoWebSymmetry::Half, false, false, nullptr);
+    for (int i = 0; i < 2; ++i) {
+        photoWebRecordSetTheta(half, i, toRadians(20 + 100 * i));
+        photoWebRecordSetPsi(half, i, toRadians(180 * i));
+        for (int j = 0; j < 2; ++j) photoWebRecordSetCandela(half, i, j, 8);
+    }
+    ASSERT_TRUE(photoWebInstall(*web, half));
+    const auto again = importCibse(saved(*web));
+    ASSERT_TRUE(again) << log.take();
+    EXPECT_EQ(again->getSymmetry(), PhotoWebSymmetry::Half);
+    EXPECT_EQ(again->getPsiCount() * 100 + again->getThetaCount(), 1919);
+    EXPECT_NEAR(again->getMaxCandela(), 8000 / web->getLumens(), 0.01);
+}
+
+TEST_F(Cibse, RecordsAndFactsReadBackAsWritten) {
+    CibseRecord rec;
+    ASSERT_TRUE(candelaGridAlloc(rec.grid, 46, 3));
+    std::fill(rec.grid.candelas.begin(), rec.grid.candelas.end(), -1.5f);  // 13 in a line
+    rec.labels = {L"Maker", L"", std::wstring(70, L'x'), L"two\r\nlines", L" z"};
+    rec.leadInteger = 7;
+    rec.leadValues = {0.1f, 2, 3};
+    rec.factors = {4, 5, 6};
+    rec.singleValue = 7.25f;
+    rec.trailerInteger = -8;
+    rec.trailerValues = {9, 10, 11};
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+    cibseWrite(rec, stream);
+    const CibseRecord again = read(io->bytes());
+    EXPECT_EQ(again.labels, (Labels{L"Maker", L" ", std::wstring(60, L'x'), L"two  lines", L" z", L" ", L" "}));
+    EXPECT_EQ(again.grid.candelas, rec.grid.candelas);
+    std::size_t longest = 0;  // a line of angles would have 79
+    for (std::size_t end = 0, next; (next = io->bytes().find('\n', end)) != std::string::npos; end = next + 1)
+        longest = std::max(longest, next - end);
+    EXPECT_EQ(longest, 78u);
+
+    FileFacts facts;
+    cibseDescribe(again, facts);
+    CibseRecord carried;
+    cibseCarry(facts, L"name", carried);
+    EXPECT_EQ(carried.labels, (Labels{L"Maker", L"", std::wstring(60, L'x'), L"two  lines", L" z"}));
+    EXPECT_EQ(carried.factors[0], 1);
+    FileFacts again2;
+    carried.factors[0] = 4;
+    cibseDescribe(carried, again2);
+    EXPECT_TRUE(std::equal(facts.begin(), facts.end(), again2.begin(), again2.end(),
+                           [](auto& a, auto& b) { return a.key == b.key && a.text == b.text; }));
+}
+
+TEST_F(Cibse, LabelsAreLinesOrPiecesOfThem) {
+    const CibseRecord rec =
+        read("CIBSE/1\r\na\r\n\r\n" + std::string(70, 'x') + "\n\n\n\n1 1 0 0 0 1 0 0 0 2 1 0 90 0 1 1 0 0 0 0");
+    EXPECT_EQ(rec.labels, (Labels{L"a", L"", std::wstring(60, L'x'), std::wstring(10, L'x')}));
+    FileFacts other;
+    for (int i = 0; i < 9; ++i) other.add(i == 0 ? L"MANUFAC" : L"line", std::to_wstring(i));
+    CibseRecord named, unnamed;
+    cibseCarry(other, L"name", named);
+    EXPECT_EQ(named.labels, (Labels{L"name", L"[MANUFAC] 0", L"1", L"2", L"3", L"4", L"5"}));
+    cibseCarry(other, L"MANU", unnamed);
+    EXPECT_EQ(unnamed.labels[0], L"[MANUFAC] 0");
+}
+
+}  // namespace
+}  // namespace OvPhotometrics
