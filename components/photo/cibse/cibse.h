@@ -15,9 +15,8 @@
 //                horizontal count; vertical angles, horizontal angles, and the candelas of each horizontal angle;
 //                trailer integer, three trailer values
 //
-// Units:    degrees and, with the first factor, candela per 1000 lumens in the file; radians and values relative
-// to
-//           the peak in an installed web.
+// Units:    degrees and candela in the file, candela being value times the first factor; radians and values
+//           relative to the peak in an installed web.
 // Errors:   false, after reported messages (12935, 12936, 12943 to 12948, 12959 to 12962, 12964 to 12968, 12982 to
 //           12991); only a host without its services raises, ExBadCast.
 // Threads:  one at a time, as messages are reported.
