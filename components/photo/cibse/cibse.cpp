@@ -5,6 +5,7 @@
 #include "components/messageFile/messageIds.h"
 #include "components/photo/cibse/photoWebCIBSE.h"
 #include "components/photo/lid/gridLayout.h"
+#include "components/photo/lid/ownGrid.h"
 #include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {
@@ -107,6 +108,19 @@ bool cibseRecordFromDistribution(Ov::RnIntensityDist& dist, CibseRecord& rec) {
 bool cibseResample(Ov::RnIntensityDist& dist, CibseRecord& rec, float scale) {
     rec = CibseRecord();
     return candelaGridFromSampling(rec.grid, dist, LastPlane::with, scale);
+}
+
+bool cibseRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, CibseRecord& rec) {
+    constexpr OwnGridRules rules{
+        .tolerance = cibseTolerance, .wraps = true, .lateralTruncated = false, .uprightTurned = false};
+    rec = CibseRecord();
+    FileGrid file = faithfulGrid(dist, rules);
+    rec.photometricType =
+        file.frame == GridFrame::polar ? CibsePhotometricType::type1 : CibsePhotometricType::type2;
+    rec.grid = std::move(file.grid);
+    const float flux = dist.getFlux();
+    rec.factors[0] = scaleForFile(rec.grid, flux > 0 ? 1000.0 / flux : 1);
+    return true;
 }
 
 bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out) {

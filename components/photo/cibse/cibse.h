@@ -59,6 +59,9 @@ bool cibseToWeb(const CibseRecord& rec, PhotoWebCIBSE& web, bool loaded, const w
 bool cibseRecordFromDistribution(Ov::RnIntensityDist& dist, CibseRecord& rec);
 /// The sampled record; candela times `scale`.
 bool cibseResample(Ov::RnIntensityDist& dist, CibseRecord& rec, float scale);
+/// A record to write as a file for other programs: with the first factor absolute candela, on the web's own grid
+/// where type 1 or 2 can hold it with its orientation. Throws std::bad_alloc.
+bool cibseRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, CibseRecord& rec);
 /// Writes the record as text, labels cut at their 60 characters. True; a stream's failure raises.
 bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out);
 

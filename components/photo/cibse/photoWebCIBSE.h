@@ -24,6 +24,7 @@ struct CibseFormat {
     }
     static constexpr auto fromDistribution = cibseRecordFromDistribution;
     static constexpr auto write = cibseWrite;
+    static constexpr auto fromDistributionFaithfully = cibseRecordFromDistributionFaithfully;
     static constexpr auto describe = cibseDescribe;
     static constexpr auto carry = cibseCarry;
 };
