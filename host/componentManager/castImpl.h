@@ -97,7 +97,7 @@ RnRef<T> rnCreate(Args&&... args) {
 template <class T>
 RnRef<RnCastable> rnCreateOrNull() noexcept {
     try {
-        return rnCreate<T>();
+        return RnRef<RnCastable>::share(rnCreate<T>()->getCastable());
     } catch (const std::bad_alloc&) {
         return {};
     }

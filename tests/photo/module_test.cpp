@@ -52,14 +52,21 @@ TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
     auto visitor = Ov::rnVisitor<Ov::RnPtr<Ov::RnComponentBuilder>>(
         [&](Ov::RnPtr<Ov::RnComponentBuilder> builder) { names.insert(builder->getName()); });
     EXPECT_EQ(registry.enumerateBuilders(visitor), Ov::RnEnum::goOn);
-    EXPECT_EQ(names, (std::set<std::wstring>{L"CIBSE Web", L"IES Web", L"Isotropic Distribution",
-                                             L"Natural Lighting", L"Web Distribution"}));
+    EXPECT_EQ(names,
+              (std::set<std::wstring>{L"CIBSE Web", L"Diffuse Distribution", L"IES Web", L"Isotropic Distribution",
+                                      L"LID Importer", L"NIMB Web", L"Natural Lighting", L"Spotlight Distribution",
+                                      L"Web Distribution"}));
     EXPECT_EQ(registry.getBuilderCount(), names.size());
-    for (Ov::RnUid id : {ids::cibseWeb, ids::iesWeb, ids::isotropic, ids::naturalLight, ids::webDistribution}) {
+    const auto imports = [](const Ov::RnUid& id) {
+        return id == ids::cibseWeb || id == ids::iesWeb || id == ids::nimbWeb;
+    };
+    for (Ov::RnUid id : {ids::cibseWeb, ids::diffuse, ids::iesWeb, ids::importer, ids::isotropic,
+                         ids::naturalLight, ids::nimbWeb, ids::spotlight, ids::webDistribution}) {
         const auto builder = registry.getBuilder(id);
         ASSERT_TRUE(builder);
         EXPECT_TRUE(builder->hasInterface(Ov::RnBuilderDescription::iid));
-        EXPECT_EQ(builder->hasInterface(Ov::RnImportBuilder::iid), id == ids::cibseWeb || id == ids::iesWeb);
+        EXPECT_EQ(builder->hasInterface(Ov::RnImportBuilder::iid), imports(id));
+        EXPECT_EQ(builder->isCreatable(), id != ids::importer);
         EXPECT_TRUE(builder->create());
         for (std::uint32_t* word : {&id.w0, &id.w1, &id.w2, &id.w3}) {
             ++*word;

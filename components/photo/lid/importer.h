@@ -1,0 +1,23 @@
+#pragma once
+
+#include "components/photo/lid/lidBuilder.h"
+#include "host/componentManager/importer.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+/// Imports photometric files without being told their format. The one in the registry is not counted; those that
+/// `create` makes are.
+class LidImporter
+    : public FactsBuilder<
+          Ov::RnCastHeap<LidImporter>,
+          Ov::RnCastImpl2<LidBuilder, Ov::RnBaseImporter, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
+public:
+    static constexpr BuilderFacts facts{classIds::importer, photometricWebCategory, L"LID Importer",
+                                        L"Photometric file importer."};
+
+    bool isCreatable() const override { return false; }
+    const wchar_t* getImportCategory() const override { return facts.category; }
+};
+
+}  // namespace OvPhotometrics

@@ -1,0 +1,133 @@
+#include <algorithm>
+#include <cmath>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/gridLayout.h"
+#include "components/photo/lid/withinMemory.h"
+#include "components/photo/nimb/nimb.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+PhotoWebSymmetry symmetryOf(int psiMax) {
+    switch (psiMax) {
+        case 0:
+            return PhotoWebSymmetry::Axial;
+        case 90:
+            return PhotoWebSymmetry::Quarter;
+        case 180:
+            return PhotoWebSymmetry::Half;
+        default:
+            return PhotoWebSymmetry::Full;
+    }
+}
+
+void fillWebRecord(PhotoWebRecord& webRecord, const NimbRecord& rec) {
+    auto value = rec.values.begin();
+    for (int i = 0; i < rec.psiCount(); ++i) photoWebRecordSetPsi(webRecord, i, toRadians(i * rec.psiStep));
+    for (int j = 0; j < rec.thetaCount(); ++j) {
+        photoWebRecordSetTheta(webRecord, j, toRadians(j * rec.thetaStep));
+        for (int i = 0; i < rec.psiCount(); ++i) photoWebRecordSetCandela(webRecord, j, i, *value++);
+    }
+    if (rec.orientationAngle != 90)
+        photoWebRecordSetOrientation(webRecord, turnedBy(static_cast<float>(90 - rec.orientationAngle)));
+}
+
+/// How many angles there are on one axis, and the smallest step between them in radians.
+struct Spacing {
+    int count;
+    float step;
+};
+
+Spacing spacingOf(AngleRange range) {
+    const float width = range.last - range.first;
+    const float tens = width / 0.17453292f;  // 10 degrees
+    const int count = std::fabs(tens) < 1000 ? static_cast<int>(tens) : 0;
+    return {count, width / static_cast<float>(count)};
+}
+
+template <class Angle>
+Spacing spacingOf(int count, float widest, Angle angle) {
+    Spacing spacing{count, widest};
+    for (int k = 1; k < count; ++k) spacing.step = std::min(spacing.step, angle(k) - angle(k - 1));
+    return spacing;
+}
+
+/// The step to write, degrees: a divisor of 90, at least `least`; 90 where one angle or none leaves no quotient.
+int stepInDegrees(const Spacing& spacing, int least) {
+    const float degrees = static_cast<float>(inDegrees(spacing.step));
+    const double step = degrees / static_cast<float>(spacing.count - 1) + 0.5;
+    if (!std::isfinite(step) || step >= 90) return 90;
+    if (step < least + 1) return least;
+    int whole = static_cast<int>(step);
+    while (90 % whole != 0) --whole;
+    return whole;
+}
+
+void chooseSteps(Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    Spacing thetas = {};
+    Spacing psis = {};
+    if (const auto holder = Ov::rnQuery<Ov::RnWebIntensityDist>(&dist)) {
+        const auto web = Ov::rnCast<Ov::RnPhotoWebData>(holder->getWeb());
+        thetas = spacingOf(web->getThetaCount(), pi, [&](int k) { return web->getTheta(k); });
+        psis = spacingOf(web->getPsiCount(), twoPi, [&](int k) { return web->getPsi(k); });
+    } else {
+        thetas = spacingOf(dist.getThetaRange());
+        psis = spacingOf(dist.getPsiRange());
+    }
+    rec.thetaStep = stepInDegrees(thetas, 1);
+    rec.psiStep = stepInDegrees(psis, 5);
+}
+
+void chooseRanges(const Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    rec.thetaMax = compareAngles(dist.getThetaRange().last, halfPi) > 0 ? 180 : 90;
+    const float lastPsi = dist.getPsiRange().last;
+    const auto about = [&](float angle) { return compareAngles(lastPsi, angle) == 0; };
+    rec.psiMax = about(0) ? 0 : about(halfPi) ? 90 : about(pi) ? 180 : 360 - rec.psiStep;
+}
+
+std::int16_t rounded(float value) {
+    if (value > 9999) return 9999;
+    if (value < -999) return -999;
+    return value == value ? static_cast<std::int16_t>(value + 0.5) : 0;
+}
+
+void sample(const Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    rec.values.assign(static_cast<std::size_t>(rec.valueCount()), 0);
+    const float flux = dist.getFlux();
+    if (!(flux > 0) || !std::isfinite(flux)) return;
+    const float scale = static_cast<float>(1000 / static_cast<double>(flux));
+    auto value = rec.values.begin();
+    for (int j = 0; j < rec.thetaCount(); ++j)
+        for (int i = 0; i < rec.psiCount(); ++i)
+            *value++ = rounded(dist.intensity(toRadians(j * rec.thetaStep), toRadians(i * rec.psiStep)) * scale);
+}
+
+}  // namespace
+
+bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
+    return withinMemory([&] {
+        PhotoWebRecord webRecord;
+        photoWebRecordInit(webRecord, rec.thetaCount(), rec.psiCount(), symmetryOf(rec.psiMax), false, loaded,
+                           name);
+        fillWebRecord(webRecord, rec);
+        if (photoWebInstall(web, webRecord)) return true;
+        reportMessage(messages::webRefused);
+        return false;
+    });
+}
+
+bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    return withinMemory([&] {
+        rec = NimbRecord();
+        rec.lines = {L"Measurement unknown", L"Manufacturing company unknown", L"Type of luminaire unknown", L""};
+        chooseSteps(dist, rec);
+        chooseRanges(dist, rec);
+        rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(dist.getSymmetry());
+        sample(dist, rec);
+        return true;
+    });
+}
+
+}  // namespace OvPhotometrics

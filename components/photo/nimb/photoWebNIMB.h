@@ -1,0 +1,40 @@
+#pragma once
+
+#include "components/photo/lid/photoWebComponent.h"
+#include "components/photo/nimb/nimb.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+class PhotoWebNIMB;
+
+struct NimbFormat {
+    using Web = PhotoWebNIMB;
+    using Record = NimbRecord;
+    static constexpr BuilderFacts facts{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
+                                        L"NIMB Photometric Web"};
+    static constexpr const wchar_t* extension = L"nmb";
+    static constexpr const char* source = "components/photo/nimb/nimb";
+    static constexpr int saveLine = 237;
+    static constexpr int loadLine = 248;
+    static constexpr const char* streamName = "NIMB stream";
+
+    static constexpr auto canImport = nimbCanRead;
+    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return nimbRead(rec, in); }
+    static bool toWeb(const Record& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name,
+                      const wchar_t*) {
+        return nimbToWeb(rec, web, loaded, name);
+    }
+    static constexpr auto fromDistribution = nimbRecordFromDistribution;
+    static constexpr auto write = nimbWrite;
+    static constexpr auto describe = nimbDescribe;
+    static constexpr auto carry = nimbCarry;
+};
+
+/// A web read from a NIMB file.
+class PhotoWebNIMB final : public PhotoWebOf<PhotoWebNIMB, NimbFormat> {};
+
+using PhotoWebNIMBPersistant = PhotoWebPersistant<NimbFormat>;
+using NIMBBuilder = PhotoWebBuilder<NimbFormat>;
+
+}  // namespace OvPhotometrics
