@@ -41,8 +41,9 @@ struct NimbRecord {
     std::int32_t spare1 = 0;  // kept, never interpreted
     std::int32_t spare2 = 0;
     std::int32_t spare3 = 0;
-    std::array<std::wstring, 4> lines;
-    std::vector<std::int16_t> values;  // candela; vertical index j, horizontal index i: element j * psiCount + i
+    std::array<std::wstring, 4> lines = {};
+    /// Candela; that of vertical index j and horizontal index i is element j * psiCount + i.
+    std::vector<std::int16_t> values = {};
 
     int psiCount() const { return psiMax / psiStep + 1; }
     int thetaCount() const { return thetaMax / thetaStep + 1; }
@@ -64,6 +65,8 @@ bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, cons
 /// A record to write for a distribution: candela per 1000 lumens in the host frame, mostly every degree by 5
 /// degrees. Without a flux every value is 0.
 bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec);
+/// A record to write as a file for other programs, with steps as fine as the light wants. Throws std::bad_alloc.
+bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord& rec);
 /// Writes the record as text. Header fields must fit their four characters.
 bool nimbWrite(const NimbRecord& rec, Ov::RnStream& s);
 

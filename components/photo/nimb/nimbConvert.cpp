@@ -3,6 +3,7 @@
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/lid/gridLayout.h"
+#include "components/photo/lid/sampling.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/nimb/nimb.h"
 
@@ -93,15 +94,21 @@ std::int16_t rounded(float value) {
     return value == value ? static_cast<std::int16_t>(value + 0.5) : 0;
 }
 
-void sample(const Ov::RnIntensityDist& dist, NimbRecord& rec) {
+NimbRecord recordToWrite() {
+    return {
+        .lines = {L"Measurement unknown", L"Manufacturing company unknown", L"Type of luminaire unknown", L""}};
+}
+
+/// Fills the grid with what `intensity` answers by degrees, scaled to 1000 of `flux` lumens.
+template <class Intensity>
+void sample(NimbRecord& rec, float flux, Intensity intensity) {
     rec.values.assign(static_cast<std::size_t>(rec.valueCount()), 0);
-    const float flux = dist.getFlux();
     if (!(flux > 0) || !std::isfinite(flux)) return;
     const float scale = static_cast<float>(1000 / static_cast<double>(flux));
     auto value = rec.values.begin();
     for (int j = 0; j < rec.thetaCount(); ++j)
         for (int i = 0; i < rec.psiCount(); ++i)
-            *value++ = rounded(dist.intensity(toRadians(j * rec.thetaStep), toRadians(i * rec.psiStep)) * scale);
+            *value++ = rounded(intensity(j * rec.thetaStep, i * rec.psiStep) * scale);
 }
 
 }  // namespace
@@ -120,14 +127,28 @@ bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, cons
 
 bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec) {
     return withinMemory([&] {
-        rec = NimbRecord();
-        rec.lines = {L"Measurement unknown", L"Manufacturing company unknown", L"Type of luminaire unknown", L""};
+        rec = recordToWrite();
         chooseSteps(dist, rec);
         chooseRanges(dist, rec);
         rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(dist.getSymmetry());
-        sample(dist, rec);
+        sample(rec, dist.getFlux(),
+               [&](int theta, int psi) { return dist.intensity(toRadians(theta), toRadians(psi)); });
         return true;
     });
+}
+
+bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    const SamplingPlan plan = planSampling(dist, true);
+    rec = recordToWrite();
+    rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
+    rec.thetaMax = static_cast<std::int32_t>(plan.lastTheta);
+    rec.psiStep = static_cast<std::int32_t>(plan.psiStep);
+    rec.psiMax = static_cast<std::int32_t>(plan.lastPsi());
+    if (plan.symmetry == PhotoWebSymmetry::Full) rec.psiMax -= rec.psiStep;  // plane 360 is plane 0
+    rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(plan.symmetry);
+    const HostView view(dist);
+    sample(rec, dist.getFlux(), [&](int theta, int psi) { return view.intensity(theta, psi); });
+    return true;
 }
 
 }  // namespace OvPhotometrics

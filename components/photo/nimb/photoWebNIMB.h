@@ -26,6 +26,7 @@ struct NimbFormat {
         return nimbToWeb(rec, web, loaded, name);
     }
     static constexpr auto fromDistribution = nimbRecordFromDistribution;
+    static constexpr auto fromDistributionFaithfully = nimbRecordFromDistributionFaithfully;
     static constexpr auto write = nimbWrite;
     static constexpr auto describe = nimbDescribe;
     static constexpr auto carry = nimbCarry;
