@@ -24,4 +24,11 @@ inline int lastAtMost(const float* angles, int n, float angle) {
     return static_cast<int>(std::upper_bound(angles, angles + n, angle) - angles) - 1;
 }
 
+/// The smallest step from one to the next of `count` angles, `angle(k)` each, at most `widest`.
+template <class Angle>
+float smallestStep(int count, float widest, Angle angle) {
+    for (int k = 1; k < count; ++k) widest = std::min(widest, angle(k) - angle(k - 1));
+    return widest;
+}
+
 }  // namespace OvPhotometrics

@@ -10,6 +10,7 @@
 #include "components/photo/lid/importer.h"
 #include "components/photo/naturallight/daylightData.h"
 #include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
 
 namespace OvPhotometrics {
 
@@ -25,6 +26,7 @@ void registerBuilders() {
     lidComponent();
     table.add(immortal<NIMBBuilder>());
     table.add(immortal<SpotlightBuilder>());
+    table.add(immortal<TBTBuilder>());
 }
 
 }  // namespace OvPhotometrics

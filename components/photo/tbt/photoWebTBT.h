@@ -1,0 +1,41 @@
+#pragma once
+
+#include "components/photo/lid/photoWebComponent.h"
+#include "components/photo/tbt/tbt.h"
+#include "ovphoto/classIds.h"
+
+namespace OvPhotometrics {
+
+class PhotoWebTBT;
+
+struct TbtFormat {
+    using Web = PhotoWebTBT;
+    using Record = TbtFileRecord;
+    static constexpr BuilderFacts facts{classIds::tbtWeb, photometricWebCategory, L"TBT Web",
+                                        L"TBT Photometric Web"};
+    static constexpr const wchar_t* extension = L"tbt";
+    static constexpr const char* source = "components/photo/tbt/tbt";
+    static constexpr int saveLine = 230;
+    static constexpr int loadLine = 241;
+    static constexpr const char* streamName = "TBT stream";
+
+    static constexpr auto canImport = tbtCanRead;
+    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return tbtRead(rec, in); }
+    static bool toWeb(const Record& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name,
+                      const wchar_t*) {
+        return tbtToWeb(rec, web, loaded, name);
+    }
+    static constexpr auto fromDistribution = tbtRecordFromDistribution;
+    static constexpr auto fromDistributionFaithfully = tbtRecordFromDistributionFaithfully;
+    static constexpr auto write = tbtWrite;
+    static constexpr auto describe = tbtDescribe;
+    static constexpr auto carry = tbtCarry;
+};
+
+/// A web read from a TBT file.
+class PhotoWebTBT final : public PhotoWebOf<PhotoWebTBT, TbtFormat> {};
+
+using PhotoWebTBTPersistant = PhotoWebPersistant<TbtFormat>;
+using TBTBuilder = PhotoWebBuilder<TbtFormat>;
+
+}  // namespace OvPhotometrics

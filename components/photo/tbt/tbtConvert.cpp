@@ -1,0 +1,130 @@
+#include <algorithm>
+#include <cmath>
+
+#include "components/messageFile/messageIds.h"
+#include "components/photo/lid/angleSearch.h"
+#include "components/photo/lid/sampling.h"
+#include "components/photo/lid/withinMemory.h"
+#include "components/photo/tbt/tbt.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr double exactPi = 3.14159265358979323846;
+constexpr int mostVertical = 90;
+constexpr int mostHorizontal = 180;
+
+/// File codes count the other way.
+PhotoWebSymmetry symmetryOf(std::int32_t code) { return static_cast<PhotoWebSymmetry>(4 - code); }
+std::int32_t codeOf(PhotoWebSymmetry symmetry) { return 4 - static_cast<std::int32_t>(symmetry); }
+
+/// The horizontal angles run from 0 to this.
+float rangeOf(PhotoWebSymmetry symmetry) {
+    switch (symmetry) {
+        case PhotoWebSymmetry::Full:
+            return twoPi;
+        case PhotoWebSymmetry::Half:
+            return pi;
+        case PhotoWebSymmetry::Quarter:
+            return halfPi;
+        case PhotoWebSymmetry::Axial:
+            break;
+    }
+    return 0;
+}
+
+float verticalAngle(int v, int count) { return static_cast<float>(v * exactPi / (count - 1)); }
+
+float horizontalAngle(int h, int count, float range) {
+    return h == 0 ? 0 : static_cast<float>(h) * range / static_cast<float>(count - 1);
+}
+
+/// How many angles cover a range evenly, both ends included, in steps of about `step`.
+int countFor(double range, float step, int most) {
+    if (!(step > 0)) return most;
+    const double count = std::floor(range / step + 0.5) + 1;
+    return static_cast<int>(std::clamp<double>(count, 2, most));
+}
+
+void chooseGrid(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
+    const PhotoWebSymmetry symmetry = dist.getSymmetry();
+    rec.symmetryCode = codeOf(symmetry);
+    rec.verticalCount = mostVertical;
+    rec.horizontalCount = mostHorizontal;
+    if (const auto holder = Ov::rnQuery<Ov::RnWebIntensityDist>(&dist)) {
+        const auto web = Ov::rnCast<Ov::RnPhotoWebData>(holder->getWeb());
+        const float range = rangeOf(symmetry);
+        const float vertical = smallestStep(web->getThetaCount(), pi, [&](int i) { return web->getTheta(i); });
+        const float horizontal = smallestStep(web->getPsiCount(), range, [&](int j) { return web->getPsi(j); });
+        rec.verticalCount = countFor(exactPi, vertical, mostVertical);
+        rec.horizontalCount = countFor(range, horizontal, mostHorizontal);
+    }
+    if (symmetry == PhotoWebSymmetry::Axial) rec.horizontalCount = 1;
+}
+
+/// Fills the grid with what `intensity` answers by radians, scaled to 1000 of `flux` lumens.
+template <class Intensity>
+void sample(TbtFileRecord& rec, float flux, Intensity intensity) {
+    rec.values.assign(static_cast<std::size_t>(rec.verticalCount) * static_cast<std::size_t>(rec.horizontalCount),
+                      0);
+    rec.flux = flux;
+    rec.multiplier = flux / 1000;
+    const float scale = 1 / rec.multiplier;
+    if (!std::isfinite(scale)) return;  // no flux, no light
+    const float range = rangeOf(symmetryOf(rec.symmetryCode));
+    auto value = rec.values.begin();
+    for (int h = 0; h < rec.horizontalCount; ++h) {
+        const float psi = horizontalAngle(h, rec.horizontalCount, range);
+        for (int v = 0; v < rec.verticalCount; ++v)
+            *value++ = intensity(verticalAngle(v, rec.verticalCount), psi) * scale;
+    }
+}
+
+void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
+    const float range = rangeOf(webRecord.symmetry);
+    for (int v = 0; v < rec.verticalCount; ++v)
+        photoWebRecordSetTheta(webRecord, v, verticalAngle(v, rec.verticalCount));
+    const float* row = rec.values.data();
+    for (int h = 0; h < rec.horizontalCount; ++h, row += rec.verticalCount) {
+        photoWebRecordSetPsi(webRecord, h, horizontalAngle(h, rec.horizontalCount, range));
+        photoWebRecordSetRow(webRecord, h, row, 1);
+    }
+    photoWebRecordSetLumens(webRecord, rec.flux);
+}
+
+}  // namespace
+
+bool tbtToWeb(const TbtFileRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
+    return withinMemory([&] {
+        PhotoWebRecord webRecord;
+        photoWebRecordInit(webRecord, rec.verticalCount, rec.horizontalCount, symmetryOf(rec.symmetryCode), false,
+                           loaded, name);
+        fillWebRecord(webRecord, rec);
+        if (photoWebInstall(web, webRecord)) return true;
+        reportMessage(messages::webRefused);
+        return false;
+    });
+}
+
+bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
+    return withinMemory([&] {
+        rec = TbtFileRecord();
+        chooseGrid(dist, rec);
+        sample(rec, dist.getFlux(), [&](float theta, float psi) { return dist.intensity(theta, psi); });
+        return true;
+    });
+}
+
+bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
+    const SamplingPlan plan = planSampling(dist);
+    const HostView view(dist);
+    rec = TbtFileRecord();
+    rec.symmetryCode = codeOf(plan.symmetry);
+    rec.verticalCount = static_cast<std::int32_t>(std::lround(180 / plan.thetaStep)) + 1;
+    rec.horizontalCount = plan.psiCount();
+    sample(rec, dist.getFlux(), [&](float theta, float psi) { return view.intensity(theta, psi); });
+    return true;
+}
+
+}  // namespace OvPhotometrics

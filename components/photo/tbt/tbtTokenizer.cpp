@@ -1,0 +1,121 @@
+#include "components/photo/tbt/tbtTokenizer.h"
+
+#include <algorithm>
+#include <charconv>
+#include <limits>
+
+#include "components/photo/tbt/tbt.h"
+#include "host/base/textClass.h"
+#include "host/base/textNumber.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+constexpr std::size_t longestToken = 80;
+
+constexpr std::int32_t largest = std::numeric_limits<std::int32_t>::max();
+
+}  // namespace
+
+std::wstring TbtTokenizer::readTitle() {
+    skipBlank();
+    std::wstring title;
+    for (int c = take(); c >= 0 && c != '\r' && c != '\n'; c = take())
+        if (title.size() < tbtTitleLength) title.push_back(static_cast<wchar_t>(c));
+    return title;
+}
+
+TbtToken TbtTokenizer::next() {
+    skipBlank();
+    _text.clear();
+    _tooLong = false;
+    const int c = _in.peekChar();
+    _kind = c < 0 ? TbtToken::endOfFile : Ov::isDigit(c) || c == '.' ? takeNumber() : takeMark();
+    return _kind;
+}
+
+std::wstring TbtTokenizer::text() const {
+    std::wstring wide(_text.size(), L'\0');
+    std::transform(_text.begin(), _text.end(), wide.begin(),
+                   [](char c) { return static_cast<wchar_t>(static_cast<unsigned char>(c)); });
+    return wide;
+}
+
+bool TbtTokenizer::number(float& value) {
+    // The zero makes a number of a lone point, too.
+    if (_kind == TbtToken::number && !Ov::convertReal("0" + _text, value)) _kind = TbtToken::other;
+    return _kind == TbtToken::number;
+}
+
+bool TbtTokenizer::integer(std::int32_t& value) const {
+    value = 0;
+    const auto error = std::from_chars(_text.data(), _text.data() + _text.size(), value).ec;
+    if (error != std::errc::result_out_of_range) return true;
+    value = largest;
+    return false;
+}
+
+std::int32_t TbtTokenizer::lineFeeds() const {
+    return static_cast<std::int32_t>(std::min<std::int64_t>(_lineFeeds, largest));
+}
+
+int TbtTokenizer::take() {
+    const int c = _in.getChar();
+    if (c == '\n') ++_lineFeeds;
+    return c;
+}
+
+void TbtTokenizer::takeToken() {
+    const int c = take();
+    _tooLong = _text.size() == longestToken;
+    if (!_tooLong) _text.push_back(static_cast<char>(c));
+}
+
+bool TbtTokenizer::takeIf(char c) {
+    if (_in.peekChar() != c) return false;
+    takeToken();
+    return true;
+}
+
+void TbtTokenizer::takeDigits() {
+    while (Ov::isDigit(_in.peekChar())) takeToken();
+}
+
+TbtToken TbtTokenizer::takeNumber() {
+    takeDigits();
+    if (takeIf('.')) takeDigits();
+    if (takeIf('e') || takeIf('E')) {
+        if (!takeIf('+')) takeIf('-');
+        takeDigits();
+    }
+    return _tooLong ? TbtToken::other : TbtToken::number;
+}
+
+TbtToken TbtTokenizer::takeMark() {
+    takeToken();
+    const char c = _text.front();
+    if ((c == 'z' || c == 'Z') && takeIf('0')) return TbtToken::zeroFill;
+    if (c == '-' && takeIf('1')) return TbtToken::end;
+    return TbtToken::other;
+}
+
+void TbtTokenizer::skipBlank() {
+    for (int c = _in.peekChar(); c == '/' ? skipComment() : Ov::isWhiteSpace(c); c = _in.peekChar())
+        if (c != '/') take();
+}
+
+/// Skips the comment that starts with the slash ahead; false, and nothing is consumed, when none does.
+bool TbtTokenizer::skipComment() {
+    take();
+    if (_in.peekChar() != '*') {
+        _in.ungetChar('/');
+        return false;
+    }
+    take();
+    int previous = 0;
+    for (int c = take(); c >= 0 && !(previous == '*' && c == '/'); c = take()) previous = c;
+    return true;
+}
+
+}  // namespace OvPhotometrics

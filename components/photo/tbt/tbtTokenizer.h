@@ -1,0 +1,59 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+#include "components/messageFile/messageIds.h"
+#include "host/componentManager/stream.h"
+
+namespace OvPhotometrics {
+
+/// The kinds of tokens, valued as the messages that describe one.
+enum class TbtToken : unsigned {
+    number = messages::tbtTokenNumber,      // digits, fraction and exponent, no sign
+    zeroFill = messages::tbtTokenZeroFill,  // "Z0" or "z0"
+    end = messages::tbtTokenEnd,            // "-1"
+    endOfFile = messages::tbtTokenEndOfFile,
+    other = messages::tbtTokenOther,  // any other character, or a number of more than 80
+};
+
+/// Takes TBT text apart: a title line, then tokens between white space and /* comments */. A comment that is not
+/// closed ends the input.
+class TbtTokenizer {
+public:
+    explicit TbtTokenizer(Ov::RnStream& in) : _in(in) {}
+
+    /// The rest of the line with the next token: up to 80 characters, those behind them dropped.
+    std::wstring readTitle();
+    TbtToken next();
+
+    TbtToken kind() const { return _kind; }
+    /// The text of the current token, up to 80 characters of it.
+    std::wstring text() const;
+    /// The value of the current token. False for one that is no number; one that a float cannot hold is no number
+    /// from then on. What is too small is 0.
+    bool number(float& value);
+    /// The whole number that the current token starts with. False, with the largest, when that is too large.
+    bool integer(std::int32_t& value) const;
+
+    /// Line feeds consumed so far.
+    std::int32_t lineFeeds() const;
+
+private:
+    int take();
+    void takeToken();
+    bool takeIf(char c);
+    void takeDigits();
+    TbtToken takeNumber();
+    TbtToken takeMark();
+    void skipBlank();
+    bool skipComment();
+
+    Ov::RnStream& _in;
+    std::int64_t _lineFeeds = 0;
+    TbtToken _kind = TbtToken::endOfFile;
+    std::string _text;
+    bool _tooLong = false;
+};
+
+}  // namespace OvPhotometrics

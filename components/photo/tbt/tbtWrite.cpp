@@ -1,0 +1,106 @@
+#include <algorithm>
+#include <cmath>
+#include <string_view>
+
+#include "components/photo/lid/numberText.h"
+#include "components/photo/tbt/tbt.h"
+#include "host/base/textClass.h"
+
+namespace OvPhotometrics {
+
+namespace {
+
+double widened(float value) { return value; }
+
+/// Writes a row up to its last value that is not 0, but at least one; the zeros behind it in short.
+void writeRow(const float* row, int count, Ov::RnStream& out) {
+    constexpr int fullLine = 68;  // a line of more characters takes no further value
+    int written = count;
+    while (written > 1 && row[written - 1] == 0) --written;
+    int length = 0;
+    for (int v = 0; v < written; ++v) {
+        if (length > fullLine) {
+            out.endLine();
+            length = 0;
+        }
+        length += out.formattedWrite(L" %.2f", widened(row[v]));
+    }
+    const int zeros = count - written;
+    writeLine(out, zeros == 0 ? L"" : zeros == 1 ? L" 0." : L" Z0");
+}
+
+void writeKind(const TbtFileRecord& rec, Ov::RnStream& out) {
+    writeLine(out, L"%d", rec.kindCode);
+    const int values = tbtKindValues(rec.kindCode);
+    if (values == 1) out.formattedWrite(L"%.16g  ", widened(rec.kindValue1));
+    if (values == 2) out.formattedWrite(L"%.16g %.16g  ", widened(rec.kindValue1), widened(rec.kindValue2));
+    writeLine(out, L"%.4f %.4f %.4f", widened(rec.unitTriple[0]), widened(rec.unitTriple[1]),
+              widened(rec.unitTriple[2]));
+}
+
+/// Whether the reader takes all of a line as the title.
+bool canBeTitle(std::wstring_view text) { return !text.empty() && text[0] != L' ' && !text.starts_with(L"/*"); }
+
+/// The first text that can be the title, or an empty one.
+std::wstring chooseTitle(const FileFacts& facts, const std::wstring& name) {
+    std::vector<std::wstring> texts;
+    for (const wchar_t* key : {L"title", L"LUMINAIRE"})
+        if (const std::wstring* text = facts.find(key)) texts.push_back(*text);
+    texts.push_back(name);
+    for (std::wstring& line : facts.textLines()) texts.push_back(std::move(line));
+    for (const std::wstring& text : texts)
+        if (std::wstring title = labelText(text, tbtTitleLength); canBeTitle(title)) return title;
+    return {};
+}
+
+bool isReadable(float value) { return std::isfinite(value) && !std::signbit(value); }
+bool isReadableShare(float value) { return isReadable(value) && value <= 1; }
+
+void carryValue(const FileFacts& facts, const wchar_t* key, float& value) {
+    if (float carried = 0; facts.read(key, carried) && isReadable(carried)) value = carried;
+}
+
+}  // namespace
+
+bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out) {
+    writeLine(out, L"%s", rec.title.c_str());
+    writeKind(rec, out);
+    writeLine(out, L"%.2f %.2f %.16g %.16g %.16g %.16g", widened(rec.flux), widened(rec.referenceFlux),
+              widened(rec.multiplier), widened(rec.auxValue1), widened(rec.auxValue2), widened(rec.auxValue3));
+    writeLine(out, L"%d %d %d", rec.symmetryCode, rec.verticalCount, rec.horizontalCount);
+    const float* row = rec.values.data();
+    for (int h = 0; h < rec.horizontalCount; ++h, row += rec.verticalCount) writeRow(row, rec.verticalCount, out);
+    writeLine(out, L"-1");
+    return true;
+}
+
+void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts) {
+    facts.add(L"title", rec.title);
+    facts.add(L"kindCode", rec.kindCode);
+    const int values = tbtKindValues(rec.kindCode);
+    if (values >= 1) facts.add(L"kindValue1", rec.kindValue1);
+    if (values == 2) facts.add(L"kindValue2", rec.kindValue2);
+    facts.add(L"unitTriple", rec.unitTriple);
+    facts.add(L"flux", rec.flux);
+    facts.add(L"referenceFlux", rec.referenceFlux);
+    facts.add(L"multiplier", rec.multiplier);
+    facts.add(L"auxValue1", rec.auxValue1);
+    facts.add(L"auxValue2", rec.auxValue2);
+    facts.add(L"auxValue3", rec.auxValue3);
+    facts.add(L"symmetryCode", rec.symmetryCode);
+}
+
+void tbtCarry(const FileFacts& facts, const std::wstring& name, TbtFileRecord& rec) {
+    if (std::wstring title = chooseTitle(facts, name); !title.empty()) rec.title = std::move(title);
+    if (std::int32_t code = 0; facts.read(L"kindCode", code) && tbtKindValues(code) >= 0) rec.kindCode = code;
+    carryValue(facts, L"kindValue1", rec.kindValue1);
+    carryValue(facts, L"kindValue2", rec.kindValue2);
+    carryValue(facts, L"auxValue1", rec.auxValue1);
+    carryValue(facts, L"auxValue2", rec.auxValue2);
+    carryValue(facts, L"auxValue3", rec.auxValue3);
+    if (std::array<float, 3> triple{}; facts.read(L"unitTriple", std::span<float>(triple)) &&
+                                       std::all_of(triple.begin(), triple.end(), isReadableShare))
+        rec.unitTriple = triple;
+}
+
+}  // namespace OvPhotometrics
