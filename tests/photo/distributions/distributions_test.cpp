@@ -107,27 +107,22 @@ TEST_F(Distributions, SpotlightCosinesStayInTheirLimits) {
 }
 
 TEST_F(Distributions, ASpotlightReadsBackExactlyOrStays) {
+    const auto load = [](Spotlight& spot, const std::string& text) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        Ov::rnCast<Ov::RnPersistant>(&spot)->load(stream, 0, nullptr, nullptr);
+    };
     const auto spot = makeSpotlight(12.3, 45.6, 0.1f);
-    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(saved(*spot));
-    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
     const auto loaded = Ov::rnCreate<Spotlight>();
+    load(*loaded, saved(*spot));
+    EXPECT_THROW(load(*loaded, "5 0.9"), Ov::RnStreamEx::ExReadError);
     const auto clone = spot->clone();
-    Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(stream, 0, nullptr, nullptr);
     for (const Ov::RnIntensityDist* copy : {static_cast<Ov::RnIntensityDist*>(loaded.get()), clone.get()}) {
         EXPECT_EQ(copy->getFlux(), spot->getFlux());
         EXPECT_EQ(copy->intensity(0.3f, 0), spot->intensity(0.3f, 0));
         EXPECT_EQ(copy->getThetaRange().last, spot->getThetaRange().last);
     }
-
-    const auto cut = Ov::rnCreate<Ov::RnMemoryBuffer>("5 0.9");
-    Ov::RnStream cutStream(cut.get(), Ov::RnStream::Form::text);
-    EXPECT_THROW(Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(cutStream, 0, nullptr, nullptr),
-                 Ov::RnStreamEx::ExReadError);
-    EXPECT_EQ(saved(*loaded), saved(*spot));
-
-    const auto beyond = Ov::rnCreate<Ov::RnMemoryBuffer>("5 1 0");  // cosines are not limited: dark
-    Ov::RnStream beyondStream(beyond.get(), Ov::RnStream::Form::text);
-    Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(beyondStream, 0, nullptr, nullptr);
+    load(*loaded, "5 1 0");  // loaded cosines have no limits: dark
     EXPECT_EQ(loaded->getHotspotCosine(), 1);
     EXPECT_EQ(loaded->intensity(0, 0) + loaded->getFlux(), 0);
 }
