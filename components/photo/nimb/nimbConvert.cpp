@@ -2,6 +2,7 @@
 #include <cmath>
 
 #include "components/messageFile/messageIds.h"
+#include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/gridLayout.h"
 #include "components/photo/lid/sampling.h"
 #include "components/photo/lid/withinMemory.h"
@@ -50,9 +51,7 @@ Spacing spacingOf(AngleRange range) {
 
 template <class Angle>
 Spacing spacingOf(int count, float widest, Angle angle) {
-    Spacing spacing{count, widest};
-    for (int k = 1; k < count; ++k) spacing.step = std::min(spacing.step, angle(k) - angle(k - 1));
-    return spacing;
+    return {count, smallestStep(count, widest, angle)};
 }
 
 /// The step to write, degrees: a divisor of 90, at least `least`; 90 where one angle or none leaves no quotient.
