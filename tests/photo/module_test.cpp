@@ -55,13 +55,13 @@ TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
     EXPECT_EQ(names,
               (std::set<std::wstring>{L"CIBSE Web", L"Diffuse Distribution", L"IES Web", L"Isotropic Distribution",
                                       L"LID Importer", L"NIMB Web", L"Natural Lighting", L"Spotlight Distribution",
-                                      L"Web Distribution"}));
+                                      L"TBT Web", L"Web Distribution"}));
     EXPECT_EQ(registry.getBuilderCount(), names.size());
     const auto imports = [](const Ov::RnUid& id) {
-        return id == ids::cibseWeb || id == ids::iesWeb || id == ids::nimbWeb;
+        return id == ids::cibseWeb || id == ids::iesWeb || id == ids::nimbWeb || id == ids::tbtWeb;
     };
     for (Ov::RnUid id : {ids::cibseWeb, ids::diffuse, ids::iesWeb, ids::importer, ids::isotropic,
-                         ids::naturalLight, ids::nimbWeb, ids::spotlight, ids::webDistribution}) {
+                         ids::naturalLight, ids::nimbWeb, ids::spotlight, ids::tbtWeb, ids::webDistribution}) {
         const auto builder = registry.getBuilder(id);
         ASSERT_TRUE(builder);
         EXPECT_TRUE(builder->hasInterface(Ov::RnBuilderDescription::iid));

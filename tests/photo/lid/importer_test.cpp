@@ -1,6 +1,9 @@
 #include "components/photo/lid/importer.h"
 
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/distributions/diffuse.h"
 #include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
 #include "tests/photo/photoFixture.h"
 
 namespace OvPhotometrics {
@@ -10,30 +13,36 @@ class Importer : public Photo {
 protected:
     Importer() : importer(Ov::rnCast<Ov::RnImporter>(immortal<LidImporter>().create().get())) {}
 
-    RnRef<Ov::RnImporter> importer;
-};
-
-const std::string nimb =
-    "   1   0  90  90  90  90   0   0   0NIMB\n" + std::string(72, 'x') + "\n\n\n\n   1   2\n";
-
-TEST_F(Importer, KnowsAFormatByItsContent) {
-    const std::pair<std::string, bool (*)(Ov::RnCastable*)> files[] = {
-        {IesText{}.text(), [](Ov::RnCastable* web) { return dynamic_cast<PhotoWebIES*>(web) != nullptr; }},
-        {nimb, [](Ov::RnCastable* web) { return dynamic_cast<PhotoWebNIMB*>(web) != nullptr; }}};
-    const TempFolder folder;
-    for (const auto& [text, isOfFormat] : files) {
-        const std::wstring path = folder.write("lamp.any", text);
+    /// A file of a format is imported as such, by path and from a device.
+    template <class Format>
+    void imports() {
+        SCOPED_TRACE(Format::extension);
+        const auto lamp = Ov::rnCreate<Diffuse>();
+        lamp->setFlux(1000);
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        ASSERT_TRUE(immortal<PhotoWebBuilder<Format>>().write(*lamp, stream, FileForm::asSaved, {}));
+        const std::wstring path = folder.write("lamp.any", io->bytes());
+        io->seek(0, 0);
         bool recognised = false;
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
-        const RnRef<Ov::RnCastable> webs[] = {
-            importer->import(path.c_str(), nullptr, recognised), importer->import(path.c_str(), nullptr),
-            importer->import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), L"lamp", nullptr)};
-        EXPECT_TRUE(recognised);
-        for (const auto& web : webs) {
-            EXPECT_TRUE(isOfFormat(web.get()));
+        for (const auto& web :
+             {importer->import(path.c_str(), nullptr, recognised), importer->import(path.c_str(), nullptr),
+              importer->import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), L"lamp", nullptr)}) {
+            EXPECT_TRUE(dynamic_cast<typename Format::Web*>(web.get()));
             EXPECT_STREQ(Ov::rnCast<Ov::RnPhotoWebData>(web.get())->getName(), L"lamp");
         }
+        EXPECT_TRUE(recognised);
     }
+
+    RnRef<Ov::RnImporter> importer;
+    TempFolder folder;
+};
+
+TEST_F(Importer, KnowsAFormatByItsContent) {
+    imports<CibseFormat>();
+    imports<IesFormat>();
+    imports<NimbFormat>();
+    imports<TbtFormat>();
     bool recognised = true;
     EXPECT_FALSE(importer->import(folder.write("no.ies", "neither").c_str(), nullptr, recognised));
     EXPECT_FALSE(recognised);
@@ -50,9 +59,8 @@ TEST_F(Importer, OffersThePhotometricWebs) {
     }
     EXPECT_FALSE(importer->hasInterface(Ov::RnImportBuilder::iid));
     EXPECT_FALSE(importer->getInterface(Ov::RnImportBuilder::iid));
-    const std::wstring patterns = importer->getDefaultSearch();
-    for (const wchar_t* pattern : {L"*.ies", L"*.nmb"}) EXPECT_NE(patterns.find(pattern), std::wstring::npos);
-    EXPECT_TRUE(std::wstring(importer->getFileTypes()).starts_with(L"All (" + patterns + L")|" + patterns + L"|"));
+    EXPECT_STREQ(importer->getDefaultSearch(), L"*.cib;*.ies;*.nmb;*.tbt");
+    EXPECT_TRUE(std::wstring(importer->getFileTypes()).starts_with(L"All (*.cib;*.ies;*.nmb;*.tbt)|*.cib;"));
 }
 
 }  // namespace
