@@ -1,4 +1,5 @@
 ovphoto_add_test(photo/lid/photoWeb_test)
+ovphoto_add_test(photo/lid/faithful_test)
 ovphoto_add_test(photo/lid/importer_test)
 ovphoto_add_test(photo/ies/iesRead_test)
 ovphoto_add_test(photo/ies/iesConvert_test)

@@ -44,6 +44,14 @@ std::size_t keywordLength(std::wstring_view line) {
                                                                                                 : keyword.size();
 }
 
+/// The line of index `next`, and what follows of a longer line that the reader has cut.
+std::wstring wholeLine(const std::vector<std::wstring>& lines, std::size_t& next) {
+    std::wstring line = lines[next];
+    while (lines[next++].size() == lineLimit && next < lines.size() && !lines[next].starts_with(L'['))
+        line += lines[next];
+    return line;
+}
+
 void describeLine(const std::wstring& line, bool first, FileFacts& facts) {
     const std::size_t length = keywordLength(line);
     if (length > 0) {
@@ -69,7 +77,10 @@ bool hasKeyword(const std::vector<std::wstring>& lines, std::wstring_view start)
 }  // namespace
 
 void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
-    for (std::size_t i = 0; i < rec.lines.size(); ++i) describeLine(rec.lines[i], i == 0, facts);
+    for (std::size_t i = 0; i < rec.lines.size();) {
+        const bool first = i == 0;
+        describeLine(wholeLine(rec.lines, i), first, facts);
+    }
     facts.add(L"lamps", rec.lampCount);
     facts.add(L"lumensPerLamp", rec.lumensPerLamp);
     facts.add(L"photometry", rec.lumensPerLamp < 0 ? L"absolute" : L"relative");

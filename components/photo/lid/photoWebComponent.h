@@ -110,20 +110,17 @@ public:
         Ov::RnStream stream(&io, Ov::RnStream::Form::text);
         Record record;
         if (!Format::read(record, stream, basePath)) return false;
-        if constexpr (requires { Format::describe(record, facts); }) Format::describe(record, facts);
+        Format::describe(record, facts);
         return true;
     }
 
     bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) override {
         Record record;
         if (form == FileForm::asSaved) return Format::fromDistribution(dist, record) && Format::write(record, out);
-        if constexpr (requires { Format::fromDistributionFaithfully(dist, record); }) {
-            if (!Format::fromDistributionFaithfully(dist, record)) return false;
-            const auto web = webOf(dist);
-            Format::carry(facts, web ? web->getName() : L"", record);
-            return canBeReadBack(record) && Format::write(record, out);
-        }
-        return false;
+        if (!Format::fromDistributionFaithfully(dist, record)) return false;
+        const auto web = webOf(dist);
+        Format::carry(facts, web ? web->getName() : L"", record);
+        return canBeReadBack(record) && Format::write(record, out);
     }
 
 private:

@@ -57,10 +57,9 @@ double smallestStep(int count, auto angleAt) {
 /// The web that a file of a plan's grid gives.
 class PlannedWeb final : public Ov::RnCastImpl<RnBasePhotoWebData, Ov::RnPhotoWebData> {
 public:
-    PlannedWeb(const HostView& view, const SamplingPlan& plan) {
+    PlannedWeb(const HostView& view, const SamplingPlan& plan, bool planeKept) {
         const int nthetas = plan.thetaCount();
-        // Readers drop the plane that closes the circle.
-        const int npsis = plan.psiCount() - (plan.symmetry == PhotoWebSymmetry::Full ? 1 : 0);
+        const int npsis = plan.psiCount() - (plan.symmetry == PhotoWebSymmetry::Full && !planeKept ? 1 : 0);
         PhotoWebRecord rec;
         photoWebRecordInit(rec, nthetas, npsis, plan.symmetry, false, true, L"");
         for (int i = 0; i < nthetas; ++i) photoWebRecordSetTheta(rec, i, toRadians(plan.theta(i)));
@@ -82,7 +81,8 @@ public:
 /// Whether a plan keeps what lies midway between its angles, in one direction or the other.
 class LossCheck {
 public:
-    LossCheck(const HostView& view, const SamplingPlan& plan) : _view(view), _plan(plan), _web(view, plan) {}
+    LossCheck(const HostView& view, const SamplingPlan& plan, bool planeKept)
+        : _view(view), _plan(plan), _web(view, plan, planeKept) {}
 
     bool thetasFine() const {
         for (int j = 0; j < _plan.psiCount(); ++j)
@@ -109,7 +109,7 @@ private:
     PlannedWeb _web;
 };
 
-SamplingPlan coarsestPlan(Ov::RnIntensityDist& dist, const HostView& view, bool wholeDegrees) {
+SamplingPlan coarsestPlan(Ov::RnIntensityDist& dist, const HostView& view, const SamplingRules& rules) {
     double thetaStep = stepOfFormulas;
     double psiStep = 90;
     if (const auto web = webOf(dist)) {
@@ -117,8 +117,9 @@ SamplingPlan coarsestPlan(Ov::RnIntensityDist& dist, const HostView& view, bool 
         psiStep = smallestStep(web->getPsiCount(), [&](int j) { return web->getPsi(j); });
         if (!view.axisKept()) thetaStep = psiStep = std::min(thetaStep, psiStep);
     }
-    return {view.symmetry(), view.firstTheta(), view.lastTheta(), stepUpTo(thetaStep, wholeDegrees),
-            stepUpTo(psiStep, wholeDegrees)};
+    return {view.symmetry(), rules.fromPole || rules.wholeSphere ? 0 : view.firstTheta(),
+            rules.wholeSphere ? 180 : view.lastTheta(), stepUpTo(thetaStep, rules.wholeDegrees),
+            stepUpTo(psiStep, rules.wholeDegrees)};
 }
 
 }  // namespace
@@ -129,10 +130,10 @@ HostView::HostView(const Ov::RnIntensityDist& dist) : _dist(dist), _symmetry(Pho
     if (!_axisKept) return;
     _turn = std::round(inDegrees(std::atan2(orientation[1], orientation[0])) * 100) / 100;
     _symmetry = turned(dist.getSymmetry(), _turn);
-    const AngleRange thetas = dist.getThetaRange();
-    if (inDegrees(thetas.last) <= 90 + sameAngle)
+    _thetas = dist.getThetaRange();
+    if (compareAngles(_thetas.last, halfPi) <= 0)
         _lastTheta = 90;
-    else if (inDegrees(thetas.first) >= 90 - sameAngle)
+    else if (compareAngles(_thetas.first, halfPi) >= 0)
         _firstTheta = 90;
 }
 
@@ -140,21 +141,24 @@ float HostView::intensity(double theta, double psi) const {
     if (!_axisKept) return _dist.intensity(toRadians(theta), toRadians(psi));
     double local = std::fmod(psi + _turn, 360);
     if (local < 0) local += 360;
-    return _dist.localIntensity(toRadians(theta), toRadians(local));
+    float inRange = toRadians(theta);
+    for (const float end : {_thetas.first, _thetas.last})
+        if (compareAngles(inRange, end) == 0) inRange = std::clamp(inRange, _thetas.first, _thetas.last);
+    return _dist.localIntensity(inRange, toRadians(local));
 }
 
 double SamplingPlan::lastPsi() const { return endOf(symmetry); }
 
-SamplingPlan planSampling(Ov::RnIntensityDist& dist, bool wholeDegrees) {
+SamplingPlan planSampling(Ov::RnIntensityDist& dist, const SamplingRules& rules) {
     const HostView view(dist);
-    SamplingPlan plan = coarsestPlan(dist, view, wholeDegrees);
+    SamplingPlan plan = coarsestPlan(dist, view, rules);
     for (;;) {
-        const LossCheck check(view, plan);
+        const LossCheck check(view, plan, rules.planeKept);
         const bool refineThetas = plan.thetaStep > finest && !check.thetasFine();
         const bool refinePsis = plan.psiStep > finest && !check.psisFine();
         if (!refineThetas && !refinePsis) return plan;
-        if (refineThetas) plan.thetaStep = stepUpTo(plan.thetaStep * 0.7, wholeDegrees);
-        if (refinePsis) plan.psiStep = stepUpTo(plan.psiStep * 0.7, wholeDegrees);
+        if (refineThetas) plan.thetaStep = stepUpTo(plan.thetaStep * 0.7, rules.wholeDegrees);
+        if (refinePsis) plan.psiStep = stepUpTo(plan.psiStep * 0.7, rules.wholeDegrees);
     }
 }
 

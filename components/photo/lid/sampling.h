@@ -7,7 +7,7 @@
 namespace OvPhotometrics {
 
 /// A distribution in the host frame, by angles in degrees. A turn about the axis is made by adding angles, so that
-/// the edges of dark ranges stay where they are.
+/// the edges of dark ranges stay where they are; light that ends within 0.25 degree of an angle reaches it.
 class HostView {
 public:
     explicit HostView(const Ov::RnIntensityDist& dist);
@@ -24,6 +24,7 @@ private:
     const Ov::RnIntensityDist& _dist;
     bool _axisKept = true;
     double _turn = 0;  // degrees
+    AngleRange _thetas;
     PhotoWebSymmetry _symmetry;
     double _firstTheta = 0;
     double _lastTheta = 180;
@@ -45,9 +46,17 @@ struct SamplingPlan {
     double psi(int j) const { return j * psiStep; }
 };
 
+/// What a format's even grids are like.
+struct SamplingRules {
+    bool wholeDegrees = false;  // of steps
+    bool fromPole = false;      // theta starts at 0
+    bool wholeSphere = false;   // theta runs from 0 to 180
+    bool planeKept = false;     // readers keep the plane that closes the circle
+};
+
 /// A grid for `dist`: its steps are at most the smallest of its web, at least 1 degree, and fine enough to lose
 /// less than 0.1 % of the peak between the angles, where 1 degree can. Throws std::bad_alloc.
-SamplingPlan planSampling(Ov::RnIntensityDist& dist, bool wholeDegrees = false);
+SamplingPlan planSampling(Ov::RnIntensityDist& dist, const SamplingRules& rules = {});
 
 /// Candela on a grid as planned.
 CandelaGrid sampledGrid(const Ov::RnIntensityDist& dist, const SamplingPlan& plan);

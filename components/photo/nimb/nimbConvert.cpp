@@ -137,7 +137,7 @@ bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec) {
 }
 
 bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord& rec) {
-    const SamplingPlan plan = planSampling(dist, true);
+    const SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
     rec = recordToWrite();
     rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
     rec.thetaMax = static_cast<std::int32_t>(plan.lastTheta);

@@ -38,7 +38,7 @@ inline constexpr std::int64_t tbtMostValues = 1 << 20;
 
 /// A file as it was read, or as it is to be written.
 struct TbtFileRecord {
-    std::wstring title = L"QRT photometric web";
+    std::wstring title;
     float flux = 0;  // lumens
     float referenceFlux = 1000;
     float multiplier = 0;  // written as flux / 1000
@@ -67,6 +67,8 @@ bool tbtRead(TbtFileRecord& rec, Ov::RnStream& in);
 /// Installs the web, its values as they stand in the file. On failure it is as it was.
 bool tbtToWeb(const TbtFileRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name);
 
+/// The defaults and the title of what the library writes. Throws std::bad_alloc.
+void tbtRecordInit(TbtFileRecord& rec);
 /// A record to write for a distribution: candela per 1000 lumens in the host frame, on an even grid with the
 /// smallest steps of its web, at most 90 by 180 angles. Without a flux every value is 0.
 bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec);

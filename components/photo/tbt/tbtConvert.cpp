@@ -63,7 +63,7 @@ void chooseGrid(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     if (symmetry == PhotoWebSymmetry::Axial) rec.horizontalCount = 1;
 }
 
-/// Fills the grid with what `intensity` answers by radians, scaled to 1000 of `flux` lumens.
+/// Fills the grid with what `intensity` answers by vertical and horizontal index, scaled to 1000 of `flux` lumens.
 template <class Intensity>
 void sample(TbtFileRecord& rec, float flux, Intensity intensity) {
     rec.values.assign(static_cast<std::size_t>(rec.verticalCount) * static_cast<std::size_t>(rec.horizontalCount),
@@ -72,13 +72,9 @@ void sample(TbtFileRecord& rec, float flux, Intensity intensity) {
     rec.multiplier = flux / 1000;
     const float scale = 1 / rec.multiplier;
     if (!std::isfinite(scale)) return;  // no flux, no light
-    const float range = rangeOf(symmetryOf(rec.symmetryCode));
     auto value = rec.values.begin();
-    for (int h = 0; h < rec.horizontalCount; ++h) {
-        const float psi = horizontalAngle(h, rec.horizontalCount, range);
-        for (int v = 0; v < rec.verticalCount; ++v)
-            *value++ = intensity(verticalAngle(v, rec.verticalCount), psi) * scale;
-    }
+    for (int h = 0; h < rec.horizontalCount; ++h)
+        for (int v = 0; v < rec.verticalCount; ++v) *value++ = intensity(v, h) * scale;
 }
 
 void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
@@ -107,23 +103,32 @@ bool tbtToWeb(const TbtFileRecord& rec, RnBasePhotoWebData& web, bool loaded, co
     });
 }
 
+void tbtRecordInit(TbtFileRecord& rec) {
+    rec = TbtFileRecord();
+    rec.title = L"QRT photometric web";
+}
+
 bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     return withinMemory([&] {
-        rec = TbtFileRecord();
+        tbtRecordInit(rec);
         chooseGrid(dist, rec);
-        sample(rec, dist.getFlux(), [&](float theta, float psi) { return dist.intensity(theta, psi); });
+        const float range = rangeOf(dist.getSymmetry());
+        sample(rec, dist.getFlux(), [&](int v, int h) {
+            return dist.intensity(verticalAngle(v, rec.verticalCount),
+                                  horizontalAngle(h, rec.horizontalCount, range));
+        });
         return true;
     });
 }
 
 bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
-    const SamplingPlan plan = planSampling(dist);
+    const SamplingPlan plan = planSampling(dist, {.wholeSphere = true, .planeKept = true});
     const HostView view(dist);
-    rec = TbtFileRecord();
+    tbtRecordInit(rec);
     rec.symmetryCode = codeOf(plan.symmetry);
-    rec.verticalCount = static_cast<std::int32_t>(std::lround(180 / plan.thetaStep)) + 1;
+    rec.verticalCount = plan.thetaCount();
     rec.horizontalCount = plan.psiCount();
-    sample(rec, dist.getFlux(), [&](float theta, float psi) { return view.intensity(theta, psi); });
+    sample(rec, dist.getFlux(), [&](int v, int h) { return view.intensity(v * plan.thetaStep, plan.psi(h)); });
     return true;
 }
 

@@ -1,0 +1,226 @@
+#include <cmath>
+#include <limits>
+
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/distributions/diffuse.h"
+#include "components/photo/distributions/isotropic.h"
+#include "components/photo/distributions/spotlight.h"
+#include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
+#include "tests/photo/photoFixture.h"
+
+// Files for other programs: what every format writes faithfully.
+
+namespace OvPhotometrics {
+namespace {
+
+class Faithful : public Photo {
+protected:
+    /// The text of a faithful file; empty when it is refused.
+    template <class Format>
+    std::string written(Ov::RnIntensityDist& dist, const FileFacts& facts = {}) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        const bool well = immortal<PhotoWebBuilder<Format>>().write(dist, stream, FileForm::faithful, facts);
+        EXPECT_EQ(well, !io->bytes().empty());
+        return io->bytes();
+    }
+
+    /// The largest difference of what a format's file gives, of the peak, over the sphere in the host frame. Where
+    /// the source jumps to dark or back within `rim` degrees there is none.
+    template <class Format>
+    double loss(Ov::RnIntensityDist& dist, double peak, double candelaPerValue = 1, double rim = 1.5) {
+        const auto web = import <Format>(written<Format>(dist), L"", L"");
+        if (!web) return std::numeric_limits<double>::infinity();
+        const auto again = distributionOf(*web);
+        again->setPeakIntensity(static_cast<float>(web->getMaxCandela() * candelaPerValue));
+        double worst = 0;
+        for (double theta = 0.3; theta < 180; theta += 2.9)
+            for (double psi = 0.3; psi < 360; psi += 4.7) {
+                if (nearRim(dist, theta, psi, rim)) continue;
+                const auto d = direction(theta, psi);
+                worst = std::max(worst, std::fabs(double(dist.intensityAt(d)) - again->intensityAt(d)));
+            }
+        return worst / peak;
+    }
+
+    static bool nearRim(const Ov::RnIntensityDist& dist, double theta, double psi, double rim) {
+        const double sine = std::max(std::sin(inRadians(theta)), 0.02);
+        int lit = 0;
+        for (const auto& [t, p] : {std::pair(-1, 0), {1, 0}, {0, -1}, {0, 1}, {0, 0}})
+            lit += dist.intensityAt(direction(theta + t * rim, psi + p * rim / sine)) > 0;
+        return lit != 0 && lit != 5;
+    }
+};
+
+/// What stands in a file's grid.
+template <class Record>
+std::string gridOf(const Record& rec) {
+    return std::to_string(static_cast<int>(rec.photometricType)) + ": " +
+           joined({rec.grid.verticalAngles.begin(), rec.grid.verticalAngles.end()}) + "| " +
+           joined({rec.grid.horizontalAngles.begin(), rec.grid.horizontalAngles.end()});
+}
+
+std::string cibseText(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
+    std::string text = "CIBSE/1\n\n\n\n\n\n\n\n1 " + std::to_string(type) + " 0 0 0 2 0 0 0 " +
+                       joined({double(vertical.size()), double(horizontal.size())}) + joined(vertical) +
+                       joined(horizontal);
+    for (std::size_t k = 0; k < vertical.size() * horizontal.size(); ++k)
+        text += std::to_string(100 + 7 * k) + " ";
+    return text + "99 0 0 0";
+}
+
+/// The grid that a record made faithfully of a source's web has.
+template <class Target, class Source>
+std::string copied(Source& web) {
+    typename Target::Record rec;
+    const auto dist = makeWebDistribution(web);
+    return Target::fromDistributionFaithfully(*dist, rec) ? gridOf(rec) : "";
+}
+
+TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
+    const std::vector<double> up{0, 22.5, 45, 90};
+    const std::string v = ": 0 22.5 45 90 | ";
+    const struct {
+        IesText source;
+        std::string ies, cibse;  // beginnings
+    } cases[] = {
+        {{.vertical = up, .horizontal = {0}}, "1" + v + "0 ", "1" + v + "0 "},
+        {{.vertical = up, .horizontal = {0, 45, 90}}, "1" + v + "0 45 90 ", "1" + v + "0 45 90 "},
+        {{.vertical = up, .horizontal = {90, 180, 270}}, "1" + v + "90 180 270 ", "1" + v + "90 180 270 "},
+        {{.vertical = up, .horizontal = {0, 90, 210}}, "1" + v + "0 90 210 360 ", "1" + v + "0 90 210 360 "},
+        {{.vertical = {0, 45, 90.1}, .horizontal = {0}}, "1: 0 45 90.0999985 | 0 ", "1: 0 45 90 | 0 "},
+        {{.vertical = {0, 2.8125, 90}, .horizontal = {0}}, "1: 0 1 2 ", "1: 0 1 2 "},
+        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {0, 60}}, "3: -90 0 30 | 0 60 ", "1: 0 1 2 "},
+        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {-20, 0, 60}},
+         "3: -90 0 30 | -20 0 60 ",
+         "1: 0 1 2 "},
+        {{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-45, 0, 90}},
+         "2: -90 0 90 | -45 0 90 ",
+         "1: 0 1 2 "},
+    };
+    for (const auto& c : cases) {
+        const auto web = import(c.source.text());
+        ASSERT_TRUE(web);
+        EXPECT_TRUE(copied<IesFormat>(*web).starts_with(c.ies)) << copied<IesFormat>(*web);
+        EXPECT_TRUE(copied<CibseFormat>(*web).starts_with(c.cibse)) << copied<CibseFormat>(*web);
+    }
+    const struct {
+        int type;
+        std::vector<double> vertical, horizontal;
+        std::string grid;
+    } cibseCases[] = {
+        {1, {0, 90}, {270, 300, 0, 90}, "1: 0 90 | 270 300 0 90 "},
+        {1, {0, 90}, {270, 0, 90, 180, 270}, "1: 0 90 | 270 0 90 180 270 "},
+        {1, {0, 90}, {270, 0, 100}, "1: 0 90 | 270 0 100 270 "},
+        {2, {-90, 0, 90}, {0, 45, 90}, "2: -90 0 90 | 0 45 90 "},
+        {2, {-90, 0, 90}, {-30, 0, 60.5}, "2: -90 0 90 | -30 0 60.5 "},
+    };
+    for (const auto& c : cibseCases) {
+        const auto web = import <CibseFormat>(cibseText(c.type, c.vertical, c.horizontal));
+        ASSERT_TRUE(web) << c.grid << log.take();
+        EXPECT_EQ(copied<CibseFormat>(*web), c.grid);
+        EXPECT_TRUE(copied<IesFormat>(*web).starts_with("1: ")) << copied<IesFormat>(*web);
+    }
+}
+
+TEST_F(Faithful, EveryFormatGivesTheSameLight) {
+    const std::vector<double> down{0, 15, 30, 45, 60, 75, 90};
+    const IesText sources[] = {
+        {.lumens = 800, .vertical = down, .horizontal = {0}},
+        {.lumens = 800, .vertical = down, .horizontal = {0, 45, 90}},
+        {.lumens = -1, .vertical = down, .horizontal = {90, 180, 270}},
+        {.lumens = 3000, .vertical = {90, 120, 180}, .horizontal = {0, 120, 240}},
+        {.type = 3, .lumens = 500, .vertical = {-40, 0, 40}, .horizontal = {0, 30, 60}},
+        {.type = 2,
+         .lumens = 500,
+         .vertical = {-90, 0, 90},
+         .horizontal = {-90, -45, 0, 45, 90},
+         .values = "5 20 5 5 30 5 5 40 5 5 30 5 5 20 5"},
+    };
+    for (const IesText& source : sources) {
+        const auto web = import(source.text());
+        ASSERT_TRUE(web);
+        const auto dist = distributionOf(*web);
+        const double peak = web->getMaxCandela();
+        const double perThousand = web->getLumens() / 1000;
+        EXPECT_LT(loss<IesFormat>(*dist, peak), 5e-6) << source.text();
+        EXPECT_LT(loss<CibseFormat>(*dist, peak), 0.003) << source.text();
+        EXPECT_LT(loss<NimbFormat>(*dist, peak, perThousand), 0.003 + 0.75 * perThousand / peak) << source.text();
+        EXPECT_LT(loss<TbtFormat>(*dist, peak, perThousand), 0.003 + 0.005 * perThousand / peak) << source.text();
+    }
+}
+
+TEST_F(Faithful, FormulasBecomeFiles) {
+    const auto isotropic = Ov::rnCreate<Isotropic>();
+    const auto diffuse = Ov::rnCreate<Diffuse>();
+    const auto spotlight = Ov::rnCreate<Spotlight>();
+    spotlight->setHotspotCosine(0.99f);
+    for (Ov::RnIntensityDist* dist :
+         {static_cast<Ov::RnIntensityDist*>(isotropic.get()), static_cast<Ov::RnIntensityDist*>(diffuse.get()),
+          static_cast<Ov::RnIntensityDist*>(spotlight.get())}) {
+        dist->setFlux(1200);
+        EXPECT_LT(loss<IesFormat>(*dist, dist->getPeakIntensity()), 0.001);
+        EXPECT_LT(loss<CibseFormat>(*dist, dist->getPeakIntensity()), 0.001);
+        const auto web = import(written<IesFormat>(*dist));
+        EXPECT_EQ(web->getLumens(), 1200);
+        EXPECT_EQ(web->getThetaRange().last, dist == isotropic.get() ? pi : halfPi);
+    }
+}
+
+TEST_F(Faithful, PeaksOfAnySizeKeepSixDigits) {
+    for (const float candela : {2e-30f, 0.00123456f, 1.23456f, 1999.99f, 123456.0f, 3e20f}) {
+        const auto light = Ov::rnCreate<Isotropic>();
+        light->setPeakIntensity(candela);
+        for (const auto& web : {RnRef<Ov::RnPhotoWebData>(import(written<IesFormat>(*light))),
+                                RnRef<Ov::RnPhotoWebData>(import <CibseFormat>(written<CibseFormat>(*light)))})
+            EXPECT_NEAR(web->getMaxCandela() / candela, 1, 5e-6);
+    }
+}
+
+TEST_F(Faithful, NothingIsWrittenThatItsReaderRefuses) {
+    const auto light = Ov::rnCreate<Isotropic>();
+    light->setPeakIntensity(std::numeric_limits<float>::infinity());
+    EXPECT_EQ(written<IesFormat>(*light), "");
+    EXPECT_EQ(written<CibseFormat>(*light), "");
+    EXPECT_NE(log.take(), "");
+    FileFacts facts;
+    facts.add(L"leadInteger", -4);
+    facts.add(L"kindCode", 9);
+    facts.add(L"identifier", 123456789);
+    facts.add(L"title", L" /* no title\n7");
+    light->setPeakIntensity(80);
+    EXPECT_TRUE(import <CibseFormat>(written<CibseFormat>(*light, facts)));
+    EXPECT_TRUE(import <NimbFormat>(written<NimbFormat>(*light, facts)));
+    EXPECT_TRUE(import <TbtFormat>(written<TbtFormat>(*light, facts)));
+    EXPECT_EQ(log.take(), "");
+}
+
+TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
+    const IesText source{.header = "IESNA:LM-63-2002\n[TEST] 77\n[MANUFAC] Alder\n[LUMCAT] 5\nplain\n[LAMP] " +
+                                   std::string(72, 'x') + "yz\n"};
+    const auto web = import(source.text(), L"lantern");
+    const auto dist = distributionOf(*web);
+    const auto describe = []<class Format>(PhotoWebBuilder<Format>& builder, const std::string& text) {
+        FileFacts facts;
+        EXPECT_TRUE(builder.readFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), nullptr, facts));
+        return facts;
+    };
+    const FileFacts facts = describe(immortal<IESBuilder>(), source.text());
+    const std::string ies = written<IesFormat>(*dist, facts);
+    EXPECT_TRUE(ies.starts_with("IESNA91\n[TEST] 77\n[MANUFAC] Alder\n[LUMCAT] 5\n[OTHER] plain\n[LAMP] " +
+                                std::string(72, 'x') + "y\n[MORE] z\n[LUMINAIRE] lantern\nTILT=NONE\n"))
+        << ies;
+    const FileFacts cibse = describe(immortal<CIBSEBuilder>(), written<CibseFormat>(*dist, facts));
+    EXPECT_EQ(*cibse.find(L"label 1"), L"lantern");
+    EXPECT_EQ(*cibse.find(L"label 3"), L"[MANUFAC] Alder");
+    const FileFacts nimb = describe(immortal<NIMBBuilder>(), written<NimbFormat>(*dist, facts));
+    EXPECT_EQ(*nimb.find(L"line 2"), L"Alder");
+    EXPECT_EQ(*nimb.find(L"line 3"), L"lantern");
+    EXPECT_TRUE(written<TbtFormat>(*dist, facts).starts_with("lantern\n3\n"));
+    // And back: the keywords are known again.
+    EXPECT_NE(written<IesFormat>(*dist, cibse).find("\n[MANUFAC] Alder\n"), std::string::npos);
+}
+
+}  // namespace
+}  // namespace OvPhotometrics
