@@ -38,7 +38,7 @@ inline constexpr std::int64_t tbtMostValues = 1 << 20;
 
 /// A file as it was read, or as it is to be written.
 struct TbtFileRecord {
-    std::wstring title;
+    std::wstring title = {};
     float flux = 0;  // lumens
     float referenceFlux = 1000;
     float multiplier = 0;  // written as flux / 1000
