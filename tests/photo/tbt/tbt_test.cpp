@@ -137,7 +137,7 @@ TEST_F(Tbt, RowsAreWrittenInShortAndReadBack) {
          " 123456.75 123456.75 123456.75 123456.75 123456.75 123456.75 123456.75\n 123456.75\n"},
     };
     for (const auto& [row, lines] : cases) {
-        rec = TbtFileRecord{.symmetryCode = 1, .horizontalCount = 1, .values = row};
+        rec = TbtFileRecord{.title = L"Spot", .symmetryCode = 1, .horizontalCount = 1, .values = row};
         rec.verticalCount = static_cast<std::int32_t>(row.size());
         const std::string text = written();
         EXPECT_TRUE(text.ends_with("\n1 " + std::to_string(row.size()) + " 1\n" + lines + "-1\n")) << text;
