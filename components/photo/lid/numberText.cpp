@@ -76,13 +76,17 @@ bool NumberText::atNumberEnd() {
     return c < 0 || isBetween(c) || c == ctrlZ || c == 0;
 }
 
+/// Skips a point and the zeros behind it; a point that other digits follow stays.
+void NumberText::skipZeroFraction() {
+    _in.getChar();
+    if (_in.peekChar() != '0' && !atNumberEnd()) _in.ungetChar('.');
+    while (_in.peekChar() == '0') _in.getChar();
+}
+
 bool NumberText::readInteger(std::int32_t& value) {
     if (!findNumber(messages::integerExpected, value)) return false;
     const bool converted = _in.formattedRead(L"%d", &value) == 1;
-    if (converted && _in.peekChar() == '.') {
-        do _in.getChar();
-        while (_in.peekChar() == '0');
-    }
+    if (converted && _in.peekChar() == '.') skipZeroFraction();
     if (converted && atNumberEnd()) return true;
     value = -1;
     return fail(messages::numberNotConverted);

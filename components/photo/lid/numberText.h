@@ -48,6 +48,7 @@ public:
 private:
     bool findNumber(unsigned unexpected, std::int32_t& instead);
     bool atNumberEnd();
+    void skipZeroFraction();
     bool fail(unsigned id);
     bool fail(unsigned id, int argument);
 

@@ -37,15 +37,17 @@ TbtToken TbtTokenizer::next() {
 
 std::wstring TbtTokenizer::text() const {
     std::wstring wide(_text.size(), L'\0');
+    // A NUL would end the message that shows it.
     std::transform(_text.begin(), _text.end(), wide.begin(),
-                   [](char c) { return static_cast<wchar_t>(static_cast<unsigned char>(c)); });
+                   [](char c) { return c ? static_cast<wchar_t>(static_cast<unsigned char>(c)) : L' '; });
     return wide;
 }
 
-bool TbtTokenizer::number(float& value) {
+bool TbtTokenizer::number(float& value) const {
+    if (_kind != TbtToken::number) return false;
     // The zero makes a number of a lone point, too.
-    if (_kind == TbtToken::number && !Ov::convertReal("0" + _text, value)) _kind = TbtToken::other;
-    return _kind == TbtToken::number;
+    if (!Ov::convertReal("0" + _text, value)) value = std::numeric_limits<float>::infinity();
+    return true;
 }
 
 bool TbtTokenizer::integer(std::int32_t& value) const {

@@ -30,9 +30,9 @@ public:
     TbtToken kind() const { return _kind; }
     /// The text of the current token, up to 80 characters of it.
     std::wstring text() const;
-    /// The value of the current token. False for one that is no number; one that a float cannot hold is no number
-    /// from then on. What is too small is 0.
-    bool number(float& value);
+    /// The value of the current token. False for one that is no number. What is too large is infinite, what is too
+    /// small 0.
+    bool number(float& value) const;
     /// The whole number that the current token starts with. False, with the largest, when that is too large.
     bool integer(std::int32_t& value) const;
 

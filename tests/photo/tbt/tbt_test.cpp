@@ -91,7 +91,7 @@ TEST_F(Tbt, EachFaultHasItsMessage) {
         {"too few values", values("1 2 3 4 5\n6 7 8 9"), "12998 7 13024 12995 -1"},
         {"too many values", values("1 2 3 4 5 Z0 7"), "12998 5 13025 12993 7"},
         {"two points", values("1.2.3 4 Z0 5 Z0 z0"), "12998 5 13025 12994 z0"},
-        {"a float cannot hold it", values("3.5e38"), "12998 5 13024 12997 3.5e38"},
+        {"a float cannot hold it", values("3.5e38 Z0 Z0"), "12935"},
         {"90 digits", values("Z0 0." + nines), "12998 5 13024 "},
         {"the longest description", values("Z0 Z0 " + nines.substr(33)),
          "12998 5 13025 12993 " + nines.substr(33)},
