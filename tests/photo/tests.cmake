@@ -1,5 +1,6 @@
 ovphoto_add_test(photo/lid/photoWeb_test)
 ovphoto_add_test(photo/lid/faithful_test)
+ovphoto_add_test(photo/lid/memory_test)
 ovphoto_add_test(photo/lid/importer_test)
 ovphoto_add_test(photo/ies/iesRead_test)
 ovphoto_add_test(photo/ies/iesConvert_test)

@@ -45,11 +45,7 @@ bool iesRecordToWeb(const IesFileRecord& rec, PhotoWebIES& web, bool loaded, con
                     const wchar_t* basePath) {
     WebLayout layout;
     if (!chooseLayout(rec, layout)) return false;
-    return withinMemory([&] {
-        if (install(rec, layout, web, loaded, name, basePath)) return true;
-        reportMessage(messages::webRefused);
-        return false;
-    });
+    return installed([&] { return install(rec, layout, web, loaded, name, basePath); });
 }
 
 }  // namespace OvPhotometrics

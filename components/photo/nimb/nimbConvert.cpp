@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <cmath>
 
-#include "components/messageFile/messageIds.h"
 #include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/gridLayout.h"
 #include "components/photo/lid/sampling.h"
@@ -113,14 +112,12 @@ void sample(NimbRecord& rec, float flux, Intensity intensity) {
 }  // namespace
 
 bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
-    return withinMemory([&] {
+    return installed([&] {
         PhotoWebRecord webRecord;
         photoWebRecordInit(webRecord, rec.thetaCount(), rec.psiCount(), symmetryOf(rec.psiMax), false, loaded,
                            name);
         fillWebRecord(webRecord, rec);
-        if (photoWebInstall(web, webRecord)) return true;
-        reportMessage(messages::webRefused);
-        return false;
+        return photoWebInstall(web, webRecord);
     });
 }
 

@@ -1,7 +1,6 @@
 #include <algorithm>
 #include <cmath>
 
-#include "components/messageFile/messageIds.h"
 #include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/sampling.h"
 #include "components/photo/lid/withinMemory.h"
@@ -92,14 +91,12 @@ void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
 }  // namespace
 
 bool tbtToWeb(const TbtFileRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
-    return withinMemory([&] {
+    return installed([&] {
         PhotoWebRecord webRecord;
         photoWebRecordInit(webRecord, rec.verticalCount, rec.horizontalCount, symmetryOf(rec.symmetryCode), false,
                            loaded, name);
         fillWebRecord(webRecord, rec);
-        if (photoWebInstall(web, webRecord)) return true;
-        reportMessage(messages::webRefused);
-        return false;
+        return photoWebInstall(web, webRecord);
     });
 }
 
