@@ -44,12 +44,15 @@ TEST(ToolInfo, TellsTheWebInJson) {
         const double candela = file.candela(file.verticals[i % 4], file.horizontals[i / 4]);
         EXPECT_EQ(info["values"][i / 4][i % 4].get<float>(), static_cast<float>(candela) / 360.0F) << i;
     }
-    for (const char* key : {"file", "lumens", "orientation", "files", "values"})
+    const Json facts = info["facts"];
+    EXPECT_EQ(facts.at(1).dump(), R"({"key":"TEST","value":"one"})");
+    EXPECT_EQ(facts.back().dump(), R"({"key":"watts","value":"0"})");
+    for (const char* key : {"file", "lumens", "orientation", "files", "values", "facts"})
         EXPECT_EQ(info.erase(key), 1U) << key;
     EXPECT_EQ(info.dump(),
               "{\"format\":\"IES\",\"name\":\"a \u00E4 \uFFFD\","  // the odd byte became U+FFFD
               R"("symmetry":"Half","thetas":[0.0,0.1,33.3,90.0],"psis":[0.0,90.0,180.0],"maxCandela":360.0,)"
-              R"("identityOrientation":false,"psiTruncated":false})");
+              R"("identityOrientation":false,"psiTruncated":false,"unit":"cd"})");
 }
 
 TEST(ToolInfo, ARefusedFileStopsNothingAndHasItsLine) {

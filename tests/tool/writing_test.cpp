@@ -49,7 +49,7 @@ TEST_F(ToolConvert, AFailureLeavesWhatWasThere) {
     fs::create_directory(folder.path() / "folder");
     const std::size_t before = fileCount();
     for (const std::string rest : {"bad.ies old.ies", "in.ies none/out.ies", "in.ies in.ies/out.ies",
-                                   "in.ies folder", "in.ies /dev/full"}) {
+                                   "in.ies folder --to ies", "in.ies /dev/full --to ies"}) {
         const ToolResult result = run(rest);
         EXPECT_EQ(result.status, 1) << rest;
         EXPECT_EQ(result.says("/out.ies: cannot be written"), rest.ends_with("/out.ies")) << result.err;

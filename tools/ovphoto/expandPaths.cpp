@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "host/platform/path.h"
+#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
@@ -48,12 +49,6 @@ std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths) {
     return files;
 }
 
-bool hasPhotometricExtension(const std::string& path) {
-    std::string extension = fs::path(path).extension().string();
-    for (char& c : extension) {
-        if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
-    }
-    return extension == ".ies" || extension == ".cib" || extension == ".nmb" || extension == ".tbt";
-}
+bool hasPhotometricExtension(const std::string& path) { return targetOf(path) != nullptr; }
 
 }  // namespace OvTool

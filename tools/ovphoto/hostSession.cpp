@@ -2,6 +2,7 @@
 
 #include <filesystem>
 
+#include "host/componentManager/devices.h"
 #include "host/componentManager/streamEx.h"
 #include "host/platform/file.h"
 #include "host/platform/path.h"
@@ -52,6 +53,15 @@ HostSession::HostSession(const std::string& modulePath)
     _module = &_manager->loadModule(path.c_str());
 }
 
+OvPhotometrics::NumberedFunctions HostSession::functions() const {
+    const auto functions = OvPhotometrics::numberedFunctions(*_module);
+#define OVPHOTO_CHECK_EXPORT(number, name) \
+    if (!functions.name) throw ExModule("the module lacks its function " #number);
+    OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_CHECK_EXPORT)
+#undef OVPHOTO_CHECK_EXPORT
+    return functions;
+}
+
 std::vector<RnRef<RnComponentBuilder>> HostSession::webImporters() const {
     auto all = _manager->builders(webCategory);
     std::erase_if(all, [](const auto& builder) { return !builder->hasInterface(RnImportBuilder::iid); });
@@ -63,10 +73,21 @@ std::vector<RnRef<RnComponentBuilder>> HostSession::webImportersFor(RnBufferedIO
 }
 
 ReadResult HostSession::read(const std::string& file, const std::string& as) const {
-    ReadResult result{file, {}, {}, {}, {}};
+    return readFrom(file, as, [&](std::string& error) { return openFile(file, error); });
+}
+
+ReadResult HostSession::readBytes(const std::string& bytes, const std::string& file, const std::string& as) const {
+    return readFrom(file, as,
+                    [&](std::string&) -> RnRef<RnBufferedIO> { return rnCreate<RnMemoryBuffer>(bytes); });
+}
+
+template <class Open>
+ReadResult HostSession::readFrom(const std::string& file, const std::string& as, Open open) const {
+    ReadResult result;
+    result.file = file;
     try {
         const MessageCollector collector(result.messages);
-        import(result, as);
+        if (const RnRef<RnBufferedIO> io = open(result.error)) import(*io, result, as);
     } catch (const RnStreamEx::ExReadError& refusal) {
         // A reader that refuses a file has reported why; a failing device has not.
         if (result.messages.empty()) result.error = std::string("cannot be read: ") + refusal.getReason();
@@ -76,18 +97,17 @@ ReadResult HostSession::read(const std::string& file, const std::string& as) con
     return result;
 }
 
-void HostSession::import(ReadResult& result, const std::string& as) const {
-    const RnRef<RnBufferedIO> io = openFile(result.file, result.error);
-    if (!io) return;
-    const RnRef<RnComponentBuilder> builder = chooseBuilder(*this, *io, as);
+void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string& as) const {
+    const RnRef<RnComponentBuilder> builder = chooseBuilder(*this, io, as);
     if (!builder) {
         result.error = as.empty() ? unknownFormat : "the module has no reader for " + as + " files";
         return;
     }
     result.format = formatName(*builder);
+    result.classId = builder->getClassId();
     const std::wstring path = fromUtf8(result.file);
     const auto importer = rnCast<RnImportBuilder>(builder.get());
-    const auto object = importer->import(io.get(), pathStem(path).c_str(), pathFolder(path).c_str());
+    const auto object = importer->import(&io, pathStem(path).c_str(), pathFolder(path).c_str());
     result.web = rnCast<RnPhotoWebData>(object.get());
 }
 

@@ -6,6 +6,7 @@
 #include "host/componentManager/componentManager.h"
 #include "host/platform/module.h"
 #include "ovphoto/intensityDist.h"
+#include "ovphoto/numberedExports.h"
 
 namespace OvTool {
 
@@ -13,6 +14,7 @@ namespace OvTool {
 struct ReadResult {
     std::string file;                   // as the user gave it
     std::string format;                 // name of the reader's format ("IES"); empty when none was found
+    Ov::RnUid classId{};                // of the format's webs
     Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
     std::vector<std::string> messages;  // texts that the reader reported, in order
     std::string error;                  // what the tool itself has to say; empty when there is a web
@@ -29,8 +31,9 @@ public:
     explicit HostSession(const std::string& modulePath);
 
     Ov::RnComponentManager& manager() const { return *_manager; }
-    /// For what the module exports by number.
     const Ov::Module& module() const { return *_module; }
+    /// What the module exports by number. Raises ExModule when one is missing.
+    OvPhotometrics::NumberedFunctions functions() const;
 
     /// The builders that import photometric webs, in order of their names.
     std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImporters() const;
@@ -40,12 +43,16 @@ public:
     /// Reads a file, with the reader of the format `as` ("IES") or, when that is empty, of the one whose content
     /// test accepts it. Never throws for what a file holds or because it cannot be read.
     ReadResult read(const std::string& file, const std::string& as) const;
+    /// The same of bytes that are, or are to be, those of the file.
+    ReadResult readBytes(const std::string& bytes, const std::string& file, const std::string& as) const;
 
     /// A web distribution of the web that gives off `lumens`.
     Ov::RnRef<Ov::RnWebIntensityDist> distribute(Ov::RnPhotoWebData& web, float lumens) const;
 
 private:
-    void import(ReadResult& result, const std::string& as) const;
+    template <class Open>
+    ReadResult readFrom(const std::string& file, const std::string& as, Open open) const;
+    void import(Ov::RnBufferedIO& io, ReadResult& result, const std::string& as) const;
 
     Ov::RnRef<Ov::RnComponentManager> _manager;
     const Ov::Module* _module;

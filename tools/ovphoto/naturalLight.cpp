@@ -99,13 +99,4 @@ std::string dateText(const RnNaturalLight& light, const OvPhotometrics::Numbered
     return std::to_string(light.getDayOfMonth()) + " " + month + ", " + day;
 }
 
-OvPhotometrics::NumberedFunctions findFunctions(const HostSession& session) {
-    const auto functions = OvPhotometrics::numberedFunctions(session.module());
-#define OVPHOTO_CHECK_EXPORT(number, name) \
-    if (!functions.name) throw ExModule("the module lacks its function " #number);
-    OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_CHECK_EXPORT)
-#undef OVPHOTO_CHECK_EXPORT
-    return functions;
-}
-
 }  // namespace OvTool

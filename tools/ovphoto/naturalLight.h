@@ -26,7 +26,4 @@ std::vector<std::string> outOfRange(const Ov::RnNaturalLight& light);
 /// "21 June, day 172".
 std::string dateText(const Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions);
 
-/// The module's numbered functions. Raises ExModule when one is missing.
-OvPhotometrics::NumberedFunctions findFunctions(const HostSession& session);
-
 }  // namespace OvTool

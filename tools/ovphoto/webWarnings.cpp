@@ -1,13 +1,8 @@
 #include "tools/ovphoto/webWarnings.h"
 
 #include <algorithm>
-#include <fstream>
-#include <iterator>
-#include <numbers>
 #include <optional>
 
-#include "host/platform/path.h"
-#include "tools/ovphoto/iesFacts.h"
 #include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
@@ -17,13 +12,6 @@ using namespace Ov;
 namespace {
 
 constexpr float tolerance = 0.25F;  // degrees: nearer angles count as the same
-
-std::optional<IesFacts> factsOf(const ReadResult& result) {
-    if (result.format != "IES") return {};
-    std::ifstream file(nativePath(fromUtf8(result.file)), std::ios::binary);
-    const std::string bytes(std::istreambuf_iterator<char>(file), {});
-    return readIesFacts(bytes);
-}
 
 std::optional<std::string> negativeValues(const RnPhotoWebData& web) {
     const int psis = web.getPsiCount();
@@ -36,18 +24,33 @@ std::optional<std::string> negativeValues(const RnPhotoWebData& web) {
     return std::to_string(negative) + (negative == 1 ? " candela value is" : " candela values are") + " negative";
 }
 
-const char* zeroFactor(const IesFacts& facts) {
-    if (facts.candelaMultiplier == 0) return "candela multiplier";
-    if (facts.ballastFactor == 0) return "ballast factor";
-    if (facts.ballastLampFactor == 0) return "ballast-lamp factor (future use)";
+/// The factor of an IES file, if any, that makes all of its values 0.
+const char* zeroFactor(const std::vector<Fact>& facts) {
+    static constexpr std::pair<const wchar_t*, const char*> factors[] = {
+        {L"multiplier", "candela multiplier"},
+        {L"ballastFactor", "ballast factor"},
+        {L"ballastLampFactor", "ballast-lamp factor (future use)"}};
+    for (const auto& [key, name] : factors)
+        if (factNumber(facts, key) == 0.0F) return name;
     return nullptr;
 }
 
-std::optional<std::string> darkness(const RnPhotoWebData& web, const std::optional<IesFacts>& facts) {
-    if (web.getMaxCandela() > 0) return {};
-    const char* factor = facts ? zeroFactor(*facts) : nullptr;
+std::optional<std::string> darkness(const ReadResult& result, const std::vector<Fact>& facts) {
+    if (result.web->getMaxCandela() > 0) return {};
+    const char* factor = result.format == "IES" ? zeroFactor(facts) : nullptr;
     if (factor) return std::string("all values are 0, because the ") + factor + " is 0";
     return "no value is above 0: the light is dark";
+}
+
+bool hasTilt(const std::vector<Fact>& facts) {
+    const std::wstring* tilt = findFact(facts, L"tilt");
+    return tilt && *tilt != L"NONE";
+}
+
+/// Whether a type B file lies as its angles do, its axis not laid down: its horizontal angles start at 0.
+bool isUnturnedTypeB(const RnPhotoWebData& web, const std::vector<Fact>& facts) {
+    const std::wstring* type = findFact(facts, L"photometricType");
+    return type && *type == L"B" && web.hasIdentityOrientation() && web.getSymmetry() == PhotoWebSymmetry::Half;
 }
 
 /// How far the light's last plane lies from where the symmetry wants it, beyond what a step may be.
@@ -72,18 +75,16 @@ std::optional<std::string> earlyEnd(const RnPhotoWebData& web) {
 
 }  // namespace
 
-std::vector<std::string> webWarnings(const ReadResult& result) {
+std::vector<std::string> webWarnings(const ReadResult& result, const std::vector<Fact>& facts) {
     std::vector<std::string> warnings;
     const auto add = [&warnings](std::optional<std::string> warning) {
         if (warning) warnings.push_back(std::move(*warning));
     };
-    const std::optional<IesFacts> facts = factsOf(result);
     add(negativeValues(*result.web));
-    add(darkness(*result.web, facts));
-    if (facts && facts->hasTilt) add("the tilt data is read but not applied");
-    if (facts && facts->photometricType == 2 && facts->firstHorizontalAngle > -tolerance) {
+    add(darkness(result, facts));
+    if (hasTilt(facts)) add("the tilt data is read but not applied");
+    if (isUnturnedTypeB(*result.web, facts))
         add("type B with horizontal angles from 0 stays unturned: its axis lies at the host's +X, not at -Y");
-    }
     add(earlyEnd(*result.web));
     return warnings;
 }

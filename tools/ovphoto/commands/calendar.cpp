@@ -18,7 +18,7 @@ namespace {
 float hoursOf(float meridian) { return static_cast<float>(std::round(meridian * 1200 / std::numbers::pi) / 100); }
 
 int listZones(const HostSession& session, bool json) {
-    const auto functions = findFunctions(session);
+    const auto functions = session.functions();
     Table table;
     table.add({"index", "offset", "meridian", "name"});
     for (int i = 0; i < functions.getTimeZoneCount(); ++i) {
@@ -41,7 +41,7 @@ int listZones(const HostSession& session, bool json) {
 }
 
 int listMonths(const HostSession& session, bool json) {
-    const auto functions = findFunctions(session);
+    const auto functions = session.functions();
     Table table;
     table.add({"month", "name", "short", "days", "first day"});
     for (int month = 1; functions.getDaysInMonth(month) > 0; ++month) {

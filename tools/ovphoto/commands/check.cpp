@@ -5,7 +5,7 @@
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/expandPaths.h"
 #include "tools/ovphoto/json.h"
-#include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/progress.h"
 #include "tools/ovphoto/webWarnings.h"
 
 namespace OvTool {
@@ -23,28 +23,6 @@ struct Totals {
     int withWarnings = 0;  // of those that are well
     int refused = 0;
     int skipped = 0;  // in folders, of no known format
-};
-
-/// A line on the terminal that tells how far the work is; nothing when standard error is no terminal.
-class Progress {
-public:
-    explicit Progress(std::size_t total) : _total(total), _shown(standardErrorIsTerminal()) {}
-    ~Progress() { clear(); }
-    Progress(const Progress&) = delete;
-    Progress& operator=(const Progress&) = delete;
-
-    void next() {
-        ++_done;
-        if (_shown) std::cerr << "\r" << _done << " of " << _total << std::flush;
-    }
-    void clear() const {
-        if (_shown) std::cerr << "\r\x1b[K" << std::flush;
-    }
-
-private:
-    std::size_t _total;
-    std::size_t _done = 0;
-    bool _shown;
 };
 
 void printJson(const ReadResult& result, const std::vector<std::string>& warnings) {
@@ -85,16 +63,24 @@ void printSummary(const Totals& totals) {
     std::cout << '\n';
 }
 
+ReadResult readFound(const FoundFile& file, const CheckOptions& options, const HostSession& session) {
+    if (file.error.empty()) return session.read(file.path, options.as);
+    ReadResult result;
+    result.file = file.path;
+    result.error = file.error;
+    return result;
+}
+
 void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, Totals& totals,
                const Progress& progress) {
-    const ReadResult result =
-        file.error.empty() ? session.read(file.path, options.as) : ReadResult{file.path, {}, {}, {}, file.error};
+    const ReadResult result = readFound(file, options, session);
     const bool foreign = file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
     if (foreign) {
         ++totals.skipped;
         return;
     }
-    const std::vector<std::string> warnings = result.web ? webWarnings(result) : std::vector<std::string>();
+    const std::vector<std::string> warnings =
+        result.web ? webWarnings(result, readFacts(session, result)) : std::vector<std::string>();
     ++(result.web ? totals.well : totals.refused);
     if (!warnings.empty()) ++totals.withWarnings;
     progress.clear();

@@ -13,7 +13,8 @@ constexpr Command allCommands[] = {
     {"formats", "List what the module builds, or tell the format of a file", declareFormats},
     {"info", "Show what is in photometric files", declareInfo},
     {"intensity", "Print the candela towards given directions", declareIntensity},
-    {"convert", "Write a photometric file anew", declareConvert},
+    {"convert", "Write photometric files in another format", declareConvert},
+    {"make", "Write an isotropic, diffuse or spotlight distribution as a photometric file", declareMake},
     {"check", "Read files and folders and list their faults", declareCheck},
     {"sun", "Show where the sun stands and what light it and the sky give", declareSun},
     {"sky", "Show the sky's luminance in a direction, or its light on a surface", declareSky},
@@ -28,10 +29,35 @@ std::span<const Command> commands() { return allCommands; }
 
 void addJsonFlag(CLI::App& app, bool& json) { app.add_flag("--json", json, "Print JSON, one object a line"); }
 
+namespace {
+
+CLI::Validator formatNames() {
+    return CLI::IsMember({"IES", "CIBSE", "NIMB", "TBT"}, CLI::ignore_case).description("");
+}
+
+}  // namespace
+
 void addAsOption(CLI::App& app, std::string& as) {
     app.add_option("--as", as, "Read as ies, cibse, nimb or tbt, whatever the content looks like")
         ->type_name("FORMAT")
-        ->transform(CLI::IsMember({"IES", "CIBSE", "NIMB", "TBT"}, CLI::ignore_case).description(""));
+        ->transform(formatNames());
+}
+
+CLI::Option* addToOption(CLI::App& app, const TargetFormat*& target) {
+    const auto take = [&target](const std::string& name) { target = targetNamed(name); };
+    return app
+        .add_option_function<std::string>(
+            "--to", take,
+            "Write as ies, cibse, nimb or tbt; without it the output's extension says "
+            "which (ies, cib, nmb, tbt)")
+        ->type_name("FORMAT")
+        ->transform(formatNames());
+}
+
+const TargetFormat* targetForOutput(const std::string& out) {
+    if (const TargetFormat* target = targetOf(out)) return target;
+    throw CLI::ValidationError("OUT",
+                               "'" + out + "' does not end in .ies, .cib, .nmb or .tbt; --to names the format");
 }
 
 void showReasons(const std::string& file, const std::vector<std::string>& reasons) {

@@ -5,10 +5,12 @@
 #include <string>
 
 #include "tools/ovphoto/hostSession.h"
+#include "tools/ovphoto/targetFormat.h"
 
 namespace CLI {
 class App;
-}
+class Option;
+}  // namespace CLI
 
 // The tool's commands, one file each, and what they share.
 
@@ -37,6 +39,7 @@ Action declareFormats(CLI::App& app);
 Action declareInfo(CLI::App& app);
 Action declareIntensity(CLI::App& app);
 Action declareConvert(CLI::App& app);
+Action declareMake(CLI::App& app);
 Action declareCheck(CLI::App& app);
 Action declareSun(CLI::App& app);
 Action declareSky(CLI::App& app);
@@ -47,6 +50,11 @@ Action declareMonths(CLI::App& app);
 /// Options that several commands have: --json, and --as FORMAT (kept in capitals: "IES").
 void addJsonFlag(CLI::App& app, bool& json);
 void addAsOption(CLI::App& app, std::string& as);
+
+/// The option --to FORMAT.
+CLI::Option* addToOption(CLI::App& app, const TargetFormat*& target);
+/// The format that a file's extension asks for; wrong usage where it asks for none.
+const TargetFormat* targetForOutput(const std::string& out);
 
 /// Shows on standard error, as `FILE: text`, what was reported while the file was read and why it was refused.
 void showReasons(const std::string& file, const std::vector<std::string>& reasons);

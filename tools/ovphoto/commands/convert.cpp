@@ -1,62 +1,66 @@
 #include <CLI/CLI.hpp>
-#include <iostream>
+#include <charconv>
 #include <memory>
 
-#include "host/componentManager/devices.h"
-#include "host/componentManager/persistant.h"
-#include "host/componentManager/stream.h"
 #include "tools/ovphoto/commands/commands.h"
-#include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/commands/convertFolder.h"
+#include "tools/ovphoto/commands/parsedOption.h"
+#include "tools/ovphoto/conversion.h"
 
 namespace OvTool {
 
-using namespace Ov;
-
 namespace {
 
-struct ConvertOptions {
-    std::string in;
-    std::string out;
-    std::string as;
-    bool asSaved = false;
-};
+constexpr std::size_t mostJobs = 64;
 
-/// What the web's own save writes into a text stream.
-std::string savedBytes(RnPhotoWebData& web) {
-    const auto buffer = rnCreate<RnMemoryBuffer>();
-    RnStream stream(buffer.get(), RnStream::Form::text);
-    rnCast<RnPersistant>(&web)->save(stream);
-    return buffer->bytes();
+std::optional<std::size_t> parseJobs(const std::string& text) {
+    std::size_t jobs = 0;
+    const char* const end = text.data() + text.size();
+    const bool whole = std::from_chars(text.data(), end, jobs).ptr == end;
+    return whole && jobs >= 1 && jobs <= mostJobs ? std::optional(jobs) : std::nullopt;
 }
 
-/// Writes the web to the output file; empty, or why that failed.
-std::string writeSaved(RnPhotoWebData& web, const std::string& out) {
-    try {
-        return writeFile(out, savedBytes(web));
-    } catch (...) {
-        return "cannot be written: " + currentExceptionText();
-    }
+int convertOne(const ConvertOptions& options, const HostSession& session) {
+    const Conversion conversion{options.paths[0], options.paths[1], options.as, options.target, options.asSaved};
+    const Json report = convertFile(conversion, session);
+    printReport(report, conversion, options.json);
+    return report["ok"].get<bool>() ? exitWell : exitFailed;
 }
 
-int runConvert(const ConvertOptions& options, const HostSession& session) {
-    const ReadResult result = session.read(options.in, options.as);
-    showReasons(result);
-    if (!result.web) return exitFailed;
-    const std::string error = writeSaved(*result.web, options.out);
-    if (error.empty()) return exitWell;
-    std::cerr << options.out << ": " << error << '\n';
-    return exitFailed;
+/// What depends on more than one argument.
+void checkArguments(ConvertOptions& options) {
+    if (!options.folder.empty()) return;
+    if (options.paths.size() != 2) throw CLI::ValidationError("IN OUT", "two files are wanted, or --into FOLDER");
+    if (!options.target) options.target = targetForOutput(options.paths[1]);
 }
 
 }  // namespace
 
 Action declareConvert(CLI::App& app) {
     auto options = std::make_shared<ConvertOptions>();
-    app.add_option("IN", options->in, "Photometric file to read")->required();
-    app.add_option("OUT", options->out, "File to write, in the format of the one that was read")->required();
-    app.add_flag("--as-saved", options->asSaved, "Write what the web's own save writes")->required();
+    app.add_option(
+           "PATH", options->paths,
+           "IN and OUT, the file to read and the file to write; with --into, any number of files, or folders "
+           "to search for them")
+        ->required();
+    CLI::Option* to = addToOption(app, options->target);
+    CLI::Option* into = app.add_option("--into", options->folder,
+                                       "Write into this folder, under the names of the files with the format's "
+                                       "extension; no file is written twice or over one that is read")
+                            ->type_name("FOLDER")
+                            ->needs(to);
+    addParsed(app, {"--jobs", "1..64", "Convert that many files at a time, each in a process of its own"},
+              parseJobs, [options](std::size_t jobs) { options->jobs = jobs; })
+        ->needs(into);
+    app.add_flag("--as-saved", options->asSaved,
+                 "Write what a web's own save writes, relative values as a rule, instead of candela for other "
+                 "programs");
     addAsOption(app, options->as);
-    return [options](const HostSession& session) { return runConvert(*options, session); };
+    addJsonFlag(app, options->json);
+    app.callback([options] { checkArguments(*options); });
+    return [options](const HostSession& session) {
+        return options->folder.empty() ? convertOne(*options, session) : convertIntoFolder(*options, session);
+    };
 }
 
 }  // namespace OvTool

@@ -60,7 +60,8 @@ void printDetection(const std::string& file, const std::string& taken, const Jso
 }
 
 int detect(const FormatsOptions& options, const HostSession& session) {
-    ReadResult result{options.detect, {}, {}, {}, {}};
+    ReadResult result;
+    result.file = options.detect;
     const RnRef<RnBufferedIO> io = openFile(options.detect, result.error);
     if (!io) {
         showReasons(result);

@@ -7,6 +7,7 @@
 #include "host/platform/path.h"
 #include "tools/ovphoto/beamAngles.h"
 #include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/fileFacts.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/table.h"
@@ -72,7 +73,12 @@ Json valuesOf(const RnPhotoWebData& web) {
     return rows;
 }
 
-void printJson(const ReadResult& result, bool withValues) {
+/// What the values of the file are; webs hold them as they stand there.
+const char* unitOf(const ReadResult& result) {
+    return result.format == "NIMB" || result.format == "TBT" ? "cd/klm" : "cd";
+}
+
+void printJson(const ReadResult& result, const HostSession& session, bool withValues) {
     const RnPhotoWebData& web = *result.web;
     Json object{{"file", result.file},
                 {"format", result.format},
@@ -85,7 +91,9 @@ void printJson(const ReadResult& result, bool withValues) {
                 {"identityOrientation", web.hasIdentityOrientation()},
                 {"orientation", web.getOrientation().values()},
                 {"psiTruncated", web.isPsiTruncated()},
-                {"files", filesOf(web)}};
+                {"files", filesOf(web)},
+                {"unit", unitOf(result)},
+                {"facts", factsToJson(readFacts(session, result))}};
     if (withValues) object["values"] = valuesOf(web);
     printLine(object);
 }
@@ -133,6 +141,14 @@ void printBeamAngles(const RnPhotoWebData& web, const RnWebIntensityDist& light)
     table.print(2);
 }
 
+void printFacts(const std::vector<Fact>& facts) {
+    if (facts.empty()) return;
+    std::cout << "  In the file\n";
+    Table table;
+    for (const Fact& fact : facts) table.add({toUtf8(fact.key), toUtf8(fact.text)});
+    table.print(4);
+}
+
 void printText(const ReadResult& result, const HostSession& session) {
     const RnPhotoWebData& web = *result.web;
     const SymmetryText symmetry = symmetryText(web.getSymmetry());
@@ -142,13 +158,14 @@ void printText(const ReadResult& result, const HostSession& session) {
     table.add({"Symmetry", std::string(symmetry.name) + ": " + symmetry.meaning});
     table.add({"Vertical", rangeText(thetasOf(web))});
     table.add({"Horizontal", rangeText(psisOf(web)) + (web.isPsiTruncated() ? ", dark beyond" : "")});
-    table.add({"Peak", shortNumber(web.getMaxCandela()) + " cd at " + peakPlace(web)});
+    table.add({"Peak", shortNumber(web.getMaxCandela()) + " " + unitOf(result) + " at " + peakPlace(web)});
     table.add({"Total flux", shortNumber(web.getLumens()) + " lm"});
     table.add({"Orientation", orientationText(web)});
     for (const std::string& file : filesOf(web)) table.add({"Needs file", file});
     std::cout << result.file << '\n';
     table.print(2);
     printBeamAngles(web, *session.distribute(*result.web, web.getLumens()));
+    printFacts(readFacts(session, result));
 }
 
 int runInfo(const InfoOptions& options, const HostSession& session) {
@@ -161,7 +178,7 @@ int runInfo(const InfoOptions& options, const HostSession& session) {
             status = exitFailed;
             if (options.json) printRefusal(result);
         } else if (options.json) {
-            printJson(result, options.values);
+            printJson(result, session, options.values);
         } else {
             std::cout << separator;
             printText(result, session);

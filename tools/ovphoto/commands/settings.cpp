@@ -100,7 +100,7 @@ int runShow(const SettingsOptions& options, const HostSession& session) {
         printLine(recordJson(settings));
     } else {
         std::cout << options.file << '\n';
-        printText(*light, settings, findFunctions(session));
+        printText(*light, settings, session.functions());
     }
     return exitWell;
 }

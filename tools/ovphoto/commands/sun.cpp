@@ -172,7 +172,7 @@ int runSun(const SunOptions& options, const HostSession& session) {
     const auto light = makeLight(session, options.light, options.json);
     if (!light) return exitFailed;
     showOutOfRange(*light);
-    const NumberedFunctions functions = findFunctions(session);
+    const NumberedFunctions functions = session.functions();
     if (options.dayTable) {
         printDayTable(*light, functions, options.json);
     } else if (options.yearTable) {

@@ -1,0 +1,193 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+
+#include "tool/toolRun.h"
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+namespace fs = std::filesystem;
+
+class ToolConversion : public testing::Test {
+protected:
+    ToolConversion() {
+        IesFile file;  // 2000 lm; NIMB's whole candela per 1000 lm stand for even candela
+        file.lamps = "1 2000";
+        file.candela = [](double v, double) { return v == 0 ? 201 : v == 45 ? 100 : 0; };
+        folder.write("in.ies", file.text());
+    }
+    Json convert(const std::string& arguments) {
+        const ToolResult result = runTool("convert --json " + arguments, folder);
+        EXPECT_EQ(result.status, 0) << arguments << result.err;
+        return result.json().at(0);
+    }
+    Json info(const std::string& file) { return runTool("info --json --values " + file, folder).json().at(0); }
+    static std::string texts(const Json& array) { return array.dump(); }
+
+    TempFolder folder;
+};
+
+TEST_F(ToolConversion, EveryFormatComesBackAsTheLightThatItHolds) {
+    const struct {
+        const char* target;
+        double scale;  // of what comes back: NIMB holds the candela for 1000 lm
+        double tolerance;
+        const char* unit;
+    } cases[] = {
+        {"ies", 1, 1e-3, "cd"}, {"cib", 1, 1e-3, "cd"}, {"nmb", 0.5, 0.51, "cd/klm"}, {"tbt", 1, 0.011, "cd/klm"}};
+    for (const auto& c : cases) {
+        const std::string file = std::string("out.") + c.target;
+        const Json there = convert("in.ies " + file);
+        EXPECT_TRUE(there["ok"] && there["messages"].empty()) << there;
+        EXPECT_EQ(info(file)["unit"], c.unit);
+        convert(file + " back.IES");  // the extension in any letter case
+        for (const auto& [theta, candela] : {std::pair{"0,0", 201.0}, {"45,0", 100.0}, {"90,0", 0.0}}) {
+            const auto found = runTool(std::string("intensity --json back.IES ") + theta, folder).json().at(0);
+            EXPECT_NEAR(found["candela"].get<double>(), candela * c.scale, c.tolerance) << file << theta;
+        }
+    }
+}
+
+TEST_F(ToolConversion, TellsWhatWasLost) {
+    // 201 cd are 100.5 cd per 1000 lm: 1 cd is lost by rounding either way.
+    const Json nimb = convert("in.ies out --to nimb");
+    EXPECT_EQ(nimb["target"], "NIMB");
+    EXPECT_NEAR(nimb["maxCandelaDifference"].get<double>(), 1, 1e-4);
+    EXPECT_NEAR(nimb["maxCandelaDifferencePercent"].get<double>(), 100 / 201.0, 1e-4);
+    EXPECT_NE(texts(nimb["warnings"]).find("NIMB holds no flux"), std::string::npos);
+    // 100 cd over half the sphere are 628.3 lm of the 1000 lm that the file gives.
+    folder.write("even.ies", IesFile{.lamps = "1 1000"}.text());
+    const Json cibse = convert("even.ies out.cib");
+    EXPECT_NEAR(cibse["fluxDifferencePercent"].get<double>(), 62.83 - 100, 0.05);
+    EXPECT_NE(texts(cibse["warnings"]).find("628.3"), std::string::npos);
+    EXPECT_LT(cibse["maxCandelaDifference"], 1e-3);
+    // A save holds relative values: 201 cd became 1.
+    const Json saved = convert("in.ies --as-saved out.ies");
+    EXPECT_NEAR(saved["maxCandelaDifference"].get<double>(), 200, 1e-3);
+    EXPECT_EQ(saved["fluxDifferencePercent"], 0);
+    EXPECT_TRUE(runTool("convert in.ies out.tbt", folder).says("largest difference 0"));
+}
+
+TEST_F(ToolConversion, ALossAtTheRimOfADarkRangeIsNone) {
+    IesFile flood;
+    flood.verticals = angles(-60, 60, 20);
+    flood.horizontals = angles(-70, 70, 10);
+    for (int type : {2, 3}) {
+        flood.type = type;
+        folder.write("flood.ies", flood.text());
+        EXPECT_LT(convert("flood.ies out.ies")["maxCandelaDifferencePercent"], 1e-3) << type;
+        // Type A has its edges on whole degrees of the host frame, type B between them.
+        const Json even = convert("flood.ies out.tbt");
+        EXPECT_EQ(even["maxCandelaDifferencePercent"] < 0.01, type == 3) << even;
+        EXPECT_EQ(even["warnings"].empty(), type == 3) << even;
+    }
+}
+
+TEST_F(ToolConversion, TellsWhichFactsAreDropped) {
+    std::string text = IesFile{.tilt = "INCLUDE\n1\n2\n0 90\n1 1"}.text();
+    text.replace(text.find("[TEST]"), 10,
+                 "[TEST] one\n[MORE]\n[OTHER] a line that goes far beyond what one of sixty or seventy or even "
+                 "eighty characters can hold\n[LUMINAIRE] a lamp");
+    text.replace(text.find(" 2 0 0 0\n"), 9, " 1 0 3 0\n");
+    folder.write("rich.ies", text);
+    const auto dropped = [&](const std::string& out) { return texts(convert("rich.ies " + out)["dropped"]); };
+    const std::string tilt = R"({"key":"tilt","value":"INCLUDE"})";
+    EXPECT_EQ(dropped("out.ies"), "[" + tilt + "]");
+    const std::string size = tilt + R"(,{"key":"units","value":"feet"},{"key":"length","value":"3"}])";
+    const std::string inTbt = dropped("out.tbt");
+    EXPECT_EQ(inTbt.find(R"([{"key":"TEST","value":"one"},{"key":"OTHER")"), 0U) << inTbt;
+    EXPECT_TRUE(inTbt.ends_with(size)) << inTbt;
+    EXPECT_EQ(inTbt.find("LUMINAIRE"), std::string::npos) << "it is the title";
+    EXPECT_TRUE(runTool("convert rich.ies out.tbt", folder).says("; dropped TEST, OTHER, tilt, units, length"));
+}
+
+TEST_F(ToolConversion, ASaveThatItsReaderRefusesIsWrittenWithAWarning) {
+    // Vertical angles to 120 degrees are sampled, in planes that end 10 degrees before the half.
+    folder.write("half.nmb",
+                 "   0 180 120  90  30  90   0   0   0NIMB\nA\nB\nC\nD, a line to make it 72 bytes long\n"
+                 "  90  90  90  80  85  88  50  60  70  20  30  40   0   0   0\n");
+    const ToolResult saved = runTool("convert half.nmb --as-saved out.ies", folder);
+    EXPECT_EQ(saved.status, 0) << saved.err;
+    EXPECT_TRUE(saved.says("cannot be read back") && saved.says("no readable IES file")) << saved.out << saved.err;
+    EXPECT_EQ(runTool("info out.ies", folder).status, 1);
+    EXPECT_LT(convert("half.nmb out.ies")["maxCandelaDifferencePercent"], 0.1);
+}
+
+TEST_F(ToolConversion, GoesThroughFoldersInOrderWithAnyNumberOfJobs) {
+    folder.write("lib/a.ies", IesFile().text());
+    folder.write("lib/b.ies", "IESNA91\nTILT=NONE\nx\n");
+    folder.write("lib/c.dxf", "no light");
+    folder.write("lib/c.ies", IesFile{.candela = [](double, double) { return 7; }}.text());
+    folder.write("lib/deep/-a.ies", IesFile().text());
+    folder.write("lib/deep/a.IES", IesFile().text());
+    folder.write("lib/deep/d e.txt", IesFile().text());
+    folder.write("lib/deep/readme.txt", "no light");
+    const std::string rest = " lib gone.ies --to cibse --into new/out";
+    const ToolResult one = runTool("convert --json" + rest, folder);
+    EXPECT_EQ(one.status, 1);
+    std::string seen;
+    for (const Json& report : one.json())
+        seen += report["file"].get<std::string>() + (report["ok"] ? " ok;" : ";");
+    EXPECT_EQ(
+        seen,
+        "lib/a.ies ok;lib/b.ies;lib/c.ies ok;lib/deep/-a.ies ok;lib/deep/a.IES;lib/deep/d e.txt ok;gone.ies;");
+    EXPECT_TRUE(one.says("lib/deep/a.IES: new/out/a.cib is not written: it is made of lib/a.ies")) << one.err;
+    const auto outputs = [&] {
+        std::string bytes;
+        for (const std::string name : {"a", "c", "-a", "d e"})
+            bytes += readBytes(folder.path() / "new/out" / (name + ".cib"));
+        return bytes;
+    };
+    const std::string written = outputs();
+    EXPECT_EQ(written.substr(0, 7), "CIBSE/1");
+
+    fs::remove_all(folder.path() / "new");
+    const ToolResult many = runTool("convert --json --jobs 3" + rest, folder);
+    EXPECT_EQ(many.out, one.out);
+    EXPECT_EQ(many.err, one.err);
+    EXPECT_EQ(many.status, 1);
+    EXPECT_EQ(outputs(), written);
+    EXPECT_TRUE(runTool("convert --jobs 2" + rest, folder)
+                    .says("7 files: 4 converted, 3 failed; 2 more of no known format"));
+}
+
+TEST_F(ToolConversion, NeverWritesOverAFileThatItReads) {
+    fs::create_directory(folder.path() / "out");
+    fs::create_symlink("../in.ies", folder.path() / "out/in.ies");
+    const std::string before = readBytes(folder.path() / "in.ies");
+    for (const std::string into : {".", "out"}) {
+        const ToolResult result = runTool("convert ./in.ies --to ies --into " + into, folder);
+        EXPECT_EQ(result.status, 1);
+        EXPECT_TRUE(result.says(into + "/in.ies is not written: it is one of the files to read")) << result.err;
+        EXPECT_EQ(readBytes(folder.path() / "in.ies"), before);
+    }
+    EXPECT_EQ(runTool("convert in.ies --to ies --into in.ies", folder).status, 1);  // no folder
+}
+
+TEST_F(ToolConversion, MakesDistributionsThatReadBack) {
+    const double pi = std::acos(-1);
+    const struct {
+        const char* arguments;
+        double candela;
+        double flux;
+    } cases[] = {{"isotropic", 1000 / (4 * pi), 1000},
+                 {"isotropic --candela 10", 10, 40 * pi},
+                 {"diffuse --flux 500", 500 / pi, 500},
+                 {"spotlight --candela 800 --hotspot 60 --falloff 90", 800, 800 * pi}};
+    for (const auto& c : cases) {
+        for (const std::string out : {"out.ies", "out.cib", "out.tbt"}) {
+            ASSERT_EQ(runTool("make " + (c.arguments + (" " + out)), folder).status, 0) << c.arguments;
+            const Json light = info(out);
+            const double unit = out == "out.tbt" ? c.flux / 1000 : 1;
+            EXPECT_NEAR(light["maxCandela"].get<double>() * unit, c.candela, c.candela * 1e-4)
+                << c.arguments << out;
+            EXPECT_NEAR(light["lumens"].get<double>(), c.flux, c.flux * 1e-3) << c.arguments << out;
+        }
+    }
+    // Whole degrees cannot hold so narrow a beam, nor four characters its peak.
+    EXPECT_TRUE(
+        runTool("make spotlight --hotspot 1 --falloff 3 out.nmb", folder).says("warning: the candela differ"));
+}
+
+}  // namespace

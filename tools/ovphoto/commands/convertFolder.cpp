@@ -1,0 +1,177 @@
+#include "tools/ovphoto/commands/convertFolder.h"
+
+#include <filesystem>
+#include <iostream>
+#include <map>
+#include <memory>
+#include <set>
+
+#include "host/platform/path.h"
+#include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/conversion.h"
+#include "tools/ovphoto/expandPaths.h"
+#include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/progress.h"
+
+namespace OvTool {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+/// A file that is to be converted, or why it is not.
+struct Job {
+    Conversion conversion;
+    std::string refusal;
+};
+
+struct Plan {
+    std::vector<Job> jobs;
+    int skipped = 0;  // in folders, of no known format
+};
+
+struct Totals {
+    int converted = 0;
+    int withWarnings = 0;  // of those
+    int failed = 0;
+};
+
+/// The place that a path leads to.
+fs::path placeOf(const std::string& path) {
+    std::error_code error;
+    const fs::path native = Ov::nativePath(Ov::fromUtf8(path));
+    const fs::path place = fs::weakly_canonical(fs::absolute(native, error), error);
+    return place.empty() ? native : place;
+}
+
+/// Whether a file that was found in a folder is none of ours.
+bool isForeign(const FoundFile& file, const ConvertOptions& options, const HostSession& session) {
+    if (!file.fromFolder || !options.as.empty() || hasPhotometricExtension(file.path)) return false;
+    std::string error;
+    const auto io = openFile(file.path, error);
+    return !io || session.webImportersFor(*io).empty();
+}
+
+/// Gives every file its output, and none to two.
+class Planner {
+public:
+    Planner(const ConvertOptions& options, const std::vector<FoundFile>& files) : _options(options) {
+        for (const FoundFile& file : files) _inputs.insert(placeOf(file.path));
+    }
+
+    Job plan(const FoundFile& file) {
+        const std::string name = fs::path(file.path).stem().string() + "." + _options.target->extension;
+        const std::string out = (fs::path(_options.folder) / name).string();
+        return {{file.path, out, _options.as, _options.target, _options.asSaved},
+                file.error.empty() ? refusal(file.path, out) : file.error};
+    }
+
+private:
+    std::string refusal(const std::string& in, const std::string& out) {
+        const fs::path place = placeOf(out);
+        if (_inputs.contains(place)) return out + " is not written: it is one of the files to read";
+        const auto [taken, isNew] = _outputs.emplace(place, in);
+        return isNew ? "" : out + " is not written: it is made of " + taken->second;
+    }
+
+    const ConvertOptions& _options;
+    std::set<fs::path> _inputs;
+    std::map<fs::path, std::string> _outputs;
+};
+
+Plan makePlan(const ConvertOptions& options, const HostSession& session) {
+    const std::vector<FoundFile> files = expandPaths(options.paths);
+    Planner planner(options, files);
+    Plan plan;
+    for (const FoundFile& file : files) {
+        if (isForeign(file, options, session)) {
+            ++plan.skipped;
+        } else {
+            plan.jobs.push_back(planner.plan(file));
+        }
+    }
+    return plan;
+}
+
+/// The arguments with which the tool converts one file as this run would.
+std::vector<std::string> argumentsFor(const Conversion& conversion, const HostSession& session) {
+    std::vector<std::string> arguments{
+        "convert", "--json", "--module", Ov::toUtf8(session.module().path()), "--to", conversion.target->name};
+    if (!conversion.as.empty()) arguments.insert(arguments.end(), {"--as", conversion.as});
+    if (conversion.asSaved) arguments.push_back("--as-saved");
+    arguments.insert(arguments.end(), {"--", conversion.in, conversion.out});
+    return arguments;
+}
+
+/// Carries the jobs out, in this process or in several others, and gives their reports in order.
+class Worker {
+public:
+    Worker(const std::vector<Job>& jobs, std::size_t atOnce, const HostSession& session) : _session(session) {
+        if (atOnce < 2) return;
+        std::vector<std::vector<std::string>> runs;
+        for (const Job& job : jobs)
+            if (job.refusal.empty()) runs.push_back(argumentsFor(job.conversion, session));
+        _runner = std::make_unique<SelfRunner>(std::move(runs), atOnce);
+    }
+
+    Json report(const Job& job) {
+        if (!job.refusal.empty()) return unconverted(job.conversion, {job.refusal});
+        return _runner ? fromProcess(job.conversion) : convertFile(job.conversion, _session);
+    }
+
+private:
+    Json fromProcess(const Conversion& conversion) {
+        const ProcessResult result = _runner->next();
+        Json report = Json::parse(result.out, nullptr, false);
+        if (report.is_object() && report.contains("ok")) return report;
+        const std::string status = std::to_string(result.status);
+        return unconverted(conversion,
+                           {result.err.empty() ? "its process failed with status " + status : result.err});
+    }
+
+    const HostSession& _session;
+    std::unique_ptr<SelfRunner> _runner;
+};
+
+Totals carryOut(const Plan& plan, const ConvertOptions& options, const HostSession& session) {
+    Totals totals;
+    Progress progress(plan.jobs.size());
+    Worker worker(plan.jobs, options.jobs, session);
+    for (const Job& job : plan.jobs) {
+        if (!std::cout) break;
+        progress.next();
+        const Json report = worker.report(job);
+        const bool ok = report["ok"].get<bool>();
+        ++(ok ? totals.converted : totals.failed);
+        if (ok && !report["warnings"].empty()) ++totals.withWarnings;
+        progress.clear();
+        printReport(report, job.conversion, options.json);
+    }
+    return totals;
+}
+
+void printSummary(const Totals& totals, int skipped) {
+    const int files = totals.converted + totals.failed;
+    std::cout << files << (files == 1 ? " file: " : " files: ") << totals.converted << " converted";
+    if (totals.withWarnings > 0) std::cout << " (" << totals.withWarnings << " with warnings)";
+    std::cout << ", " << totals.failed << " failed";
+    if (skipped > 0) std::cout << "; " << skipped << " more of no known format";
+    std::cout << '\n';
+}
+
+}  // namespace
+
+int convertIntoFolder(const ConvertOptions& options, const HostSession& session) {
+    const Plan plan = makePlan(options, session);
+    std::error_code error;
+    fs::create_directories(Ov::nativePath(Ov::fromUtf8(options.folder)), error);
+    if (error) {
+        std::cerr << options.folder << ": cannot be made: " << error.message() << '\n';
+        return exitFailed;
+    }
+    const Totals totals = carryOut(plan, options, session);
+    if (!options.json) printSummary(totals, plan.skipped);
+    return totals.failed == 0 ? exitWell : exitFailed;
+}
+
+}  // namespace OvTool

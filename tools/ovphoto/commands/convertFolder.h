@@ -1,0 +1,24 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "tools/ovphoto/hostSession.h"
+#include "tools/ovphoto/targetFormat.h"
+
+namespace OvTool {
+
+struct ConvertOptions {
+    std::vector<std::string> paths;  // the input and the output where there is no folder
+    std::string folder;
+    std::string as;
+    const TargetFormat* target = nullptr;
+    std::size_t jobs = 1;
+    bool asSaved = false;
+    bool json = false;
+};
+
+/// Converts files, and those in folders, into a folder; the exit status.
+int convertIntoFolder(const ConvertOptions& options, const HostSession& session);
+
+}  // namespace OvTool

@@ -1,0 +1,127 @@
+#include "tools/ovphoto/conversion.h"
+
+#include <algorithm>
+#include <cmath>
+#include <iostream>
+
+#include "tools/ovphoto/lightFile.h"
+#include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/outputFile.h"
+
+namespace OvTool {
+
+using namespace Ov;
+using OvPhotometrics::FileForm;
+
+namespace {
+
+void append(Json& array, const std::vector<std::string>& texts) {
+    for (const std::string& text : texts) array.push_back(text);
+}
+
+/// Writes what was read as another file in memory.
+std::optional<LightFile> writeAnew(const Conversion& conversion, const HostSession& session,
+                                   const ReadResult& source, const std::vector<Fact>& facts, const WebLight& light,
+                                   std::vector<std::string>& messages) {
+    if (!conversion.asSaved)
+        return makeFile(session, conversion.out, *conversion.target, *light, FileForm::faithful, facts, messages);
+    const auto asRead = session.distribute(*source.web, source.web->getLumens());
+    return makeFile(session, conversion.out, *conversion.target, *asRead, FileForm::asSaved, {}, messages);
+}
+
+void reportLoss(Json& report, const Conversion& conversion, RnWebIntensityDist& light, const LightFile& made) {
+    const ConversionLoss loss = measureLoss(light, *made.light);
+    report["maxCandelaDifference"] = static_cast<float>(loss.candela);
+    report["maxCandelaDifferencePercent"] = static_cast<float>(loss.candelaPercent);
+    report["fluxDifferencePercent"] = static_cast<float>(loss.fluxPercent);
+    append(report["warnings"], lossWarnings(loss, *conversion.target, light, made));
+}
+
+Json convert(const Conversion& conversion, const HostSession& session, const ReadResult& source) {
+    Json report = unconverted(conversion, source.reasons());
+    if (!source.format.empty()) report["format"] = source.format;
+    if (!source.web) return report;
+
+    const std::vector<Fact> facts = readFacts(session, source);
+    const WebLight light = lightOf(session, source, facts);
+    std::vector<std::string> messages;
+    const auto made = writeAnew(conversion, session, source, facts, light, messages);
+    if (made && made->light) {
+        report["dropped"] = factsToJson(droppedFacts(facts, made->facts));
+        reportLoss(report, conversion, *light, *made);
+    } else if (made) {
+        // A save is what it is, readable or not.
+        append(report[conversion.asSaved ? "warnings" : "messages"], {made->refusal});
+    }
+    if (made && (made->light || conversion.asSaved)) {
+        const std::string error = writeFile(conversion.out, made->bytes);
+        if (!error.empty()) messages.push_back(conversion.out + ": " + error);
+        report["ok"] = error.empty();
+    }
+    append(report["messages"], messages);
+    return report;
+}
+
+/// The keys, each once.
+std::string keysOf(const Json& facts) {
+    std::vector<std::string> keys;
+    for (const Json& fact : facts) {
+        const auto key = fact["key"].get<std::string>();
+        if (std::find(keys.begin(), keys.end(), key) == keys.end()) keys.push_back(key);
+    }
+    std::string text;
+    for (const std::string& key : keys) text += (text.empty() ? "" : ", ") + key;
+    return text;
+}
+
+std::string percentText(const Json& percent) {
+    return shortNumber(std::round(percent.get<double>() * 1000) / 1000) + " %";
+}
+
+std::string lossText(const Json& report) {
+    if (report["maxCandelaDifference"].is_null()) return "cannot be read back";
+    std::string text = "largest difference " + shortNumber(report["maxCandelaDifference"].get<double>()) +
+                       " cd (" + percentText(report["maxCandelaDifferencePercent"]) + "), flux " +
+                       percentText(report["fluxDifferencePercent"]);
+    if (!report["dropped"].empty()) text += "; dropped " + keysOf(report["dropped"]);
+    return text;
+}
+
+}  // namespace
+
+Json convertFile(const Conversion& conversion, const HostSession& session) {
+    try {
+        return convert(conversion, session, session.read(conversion.in, conversion.as));
+    } catch (...) {
+        return unconverted(conversion, {"cannot be converted: " + currentExceptionText()});
+    }
+}
+
+Json unconverted(const Conversion& conversion, const std::vector<std::string>& reasons) {
+    return {{"file", conversion.in},
+            {"out", conversion.out},
+            {"format", Json()},
+            {"target", conversion.target->name},
+            {"maxCandelaDifference", Json()},
+            {"maxCandelaDifferencePercent", Json()},
+            {"fluxDifferencePercent", Json()},
+            {"dropped", Json::array()},
+            {"warnings", Json::array()},
+            {"ok", false},
+            {"messages", reasons}};
+}
+
+void printReport(const Json& report, const Conversion& conversion, bool json) {
+    if (json) {
+        printLine(report);
+    } else if (report["ok"].get<bool>()) {
+        std::cout << conversion.in << " -> " << conversion.out << ": " << report["format"].get<std::string>()
+                  << " to " << conversion.target->name << ", " << lossText(report) << '\n';
+    }
+    for (const Json& message : report["messages"])
+        std::cerr << conversion.in << ": " << message.get<std::string>() << '\n';
+    for (const Json& warning : report["warnings"])
+        std::cerr << conversion.in << ": warning: " << warning.get<std::string>() << '\n';
+}
+
+}  // namespace OvTool

@@ -1,0 +1,38 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "tools/ovphoto/conversionLoss.h"
+#include "tools/ovphoto/fileFacts.h"
+#include "tools/ovphoto/hostSession.h"
+#include "tools/ovphoto/targetFormat.h"
+
+// Between files and lights whose candela and flux are the true ones, whatever the unit of a format.
+
+namespace OvTool {
+
+using WebLight = Ov::RnRef<Ov::RnWebIntensityDist>;
+
+/// The light of a file that was read. TBT files hold candela for a reference flux.
+WebLight lightOf(const HostSession& session, const ReadResult& source, const std::vector<Fact>& facts);
+
+/// A light as a file that is not yet in its place.
+struct LightFile {
+    std::string bytes;
+    WebLight light;           // as the format's reader reads it; null when it refuses to
+    std::string refusal;      // then why
+    std::vector<Fact> facts;  // as they are read
+};
+
+/// Writes a light for `file` and reads it again. None after messages, to which the writer's are added.
+std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const TargetFormat& target,
+                                  Ov::RnIntensityDist& light, OvPhotometrics::FileForm form,
+                                  const std::vector<Fact>& facts, std::vector<std::string>& messages);
+
+/// What a user should know of a file that differs from the light by `loss`.
+std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFormat& target,
+                                      const Ov::RnIntensityDist& light, const LightFile& file);
+
+}  // namespace OvTool

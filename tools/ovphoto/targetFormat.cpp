@@ -1,0 +1,37 @@
+#include "tools/ovphoto/targetFormat.h"
+
+#include <filesystem>
+
+namespace OvTool {
+
+namespace {
+
+using Functions = OvPhotometrics::NumberedFunctions;
+
+constexpr TargetFormat formats[] = {
+    {"IES", "ies", &Functions::writeIes, true},
+    {"CIBSE", "cib", &Functions::writeCibse, false},
+    {"NIMB", "nmb", &Functions::writeNimb, false},
+    {"TBT", "tbt", &Functions::writeTbt, true},
+};
+
+}  // namespace
+
+std::span<const TargetFormat> targetFormats() { return formats; }
+
+const TargetFormat* targetNamed(const std::string& name) {
+    for (const TargetFormat& format : formats)
+        if (name == format.name) return &format;
+    return nullptr;
+}
+
+const TargetFormat* targetOf(const std::string& path) {
+    std::string extension = std::filesystem::path(path).extension().string();
+    for (char& c : extension)
+        if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+    for (const TargetFormat& format : formats)
+        if (extension == std::string(".") + format.extension) return &format;
+    return nullptr;
+}
+
+}  // namespace OvTool
