@@ -21,8 +21,8 @@ class Difference {
 public:
     Difference(const RnIntensityDist& source, const RnIntensityDist& output)
         : _source(source), _output(output), _toHost(source.getOrientation().computeTranspose()) {
-        const auto& a = source.getOrientation().values();
-        const auto& b = output.getOrientation().values();
+        const auto a = source.getOrientation().values();
+        const auto b = output.getOrientation().values();
         _sameFrame =
             std::equal(a.begin(), a.end(), b.begin(), [](float x, float y) { return std::abs(x - y) < 1e-5F; });
     }
