@@ -10,10 +10,10 @@ namespace OvPhotometrics {
 
 namespace {
 
-constexpr double finest = 1;           // degrees
-constexpr double stepOfFormulas = 5;   // where no web says how fine a distribution is
-constexpr double allowedLoss = 0.001;  // of the peak
-constexpr double sameAngle = 0.005;    // degrees
+constexpr double finest = 1;            // degrees
+constexpr double stepOfFormulas = 5;    // where no web says how fine a distribution is
+constexpr double allowedLoss = 0.0007;  // of the peak, midway on the edges of a cell; inside it is a little more
+constexpr double sameAngle = 0.005;     // degrees
 
 double endOf(PhotoWebSymmetry symmetry) {
     switch (symmetry) {
@@ -138,7 +138,8 @@ HostView::HostView(const Ov::RnIntensityDist& dist) : _dist(dist), _symmetry(Pho
 }
 
 float HostView::intensity(double theta, double psi) const {
-    if (!_axisKept) return _dist.intensity(toRadians(theta), toRadians(psi));
+    // At a pole that lies on the edge of light psi tells the side.
+    if (!_axisKept) return _dist.intensity(toRadians(std::clamp(theta, 0.001, 179.999)), toRadians(psi));
     double local = std::fmod(psi + _turn, 360);
     if (local < 0) local += 360;
     float inRange = toRadians(theta);
