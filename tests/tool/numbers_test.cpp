@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <limits>
+#include <numbers>
 
 using namespace OvTool;
 
@@ -11,10 +12,17 @@ TEST(ToolNumbers, EveryAngleOfAFileComesBackAsWritten) {
     // Files hold degrees with up to three decimals; each is read into a float first.
     for (int i = -360000; i <= 360000; i += 7) {
         const float written = static_cast<float>(i / 1000.0);
-        EXPECT_EQ(toRadians(toDegrees(toRadians(written))), toRadians(written)) << written;
+        EXPECT_EQ(toRadians(static_cast<float>(toDegrees(toRadians(written)))), toRadians(written)) << written;
         EXPECT_NEAR(toDegrees(toRadians(written)), written, 1e-7 * (1 + std::abs(written)));
     }
-    EXPECT_EQ(toDegrees(toRadians(22.5F)), 22.5F);
+    EXPECT_EQ(toDegrees(toRadians(22.5F)), 22.5);
+    // Some angles are not those of any float in degrees.
+    for (float radians = 0.027F; radians < 6.28F; radians = std::nextafter(radians + 0.01F, 7.0F)) {
+        const double degrees = toDegrees(radians);
+        EXPECT_TRUE(static_cast<float>(degrees * std::numbers::pi / 180) == radians ||
+                    toRadians(static_cast<float>(degrees)) == radians)
+            << radians;
+    }
     EXPECT_EQ(toDegrees(3.1415927F), 180);
     EXPECT_TRUE(std::isnan(toDegrees(std::numeric_limits<float>::quiet_NaN())));
 }

@@ -25,14 +25,26 @@ void dropTrailingZeros(std::string& text) {
 
 float toRadians(float degrees) { return static_cast<float>(degrees * std::numbers::pi / 180); }
 
-float toDegrees(float radians) {
+double toDegrees(float radians) {
     const double degrees = radians * 180 / std::numbers::pi;
-    if (!std::isfinite(degrees)) return static_cast<float>(degrees);
-    for (int digits = 1; digits <= 7; ++digits) {
-        const auto candidate = parseFloat(formatDouble(degrees, std::chars_format::general, digits));
-        if (candidate && toRadians(*candidate) == radians) return *candidate;
-    }
-    return static_cast<float>(degrees);
+    if (!std::isfinite(degrees)) return degrees;
+    const auto exact = [&](double candidate) {
+        return static_cast<float>(candidate * std::numbers::pi / 180) == radians;
+    };
+    const auto asRead = [&](double candidate) { return toRadians(static_cast<float>(candidate)) == radians; };
+    const auto shortest = [&](auto fits) -> std::optional<double> {
+        for (int digits = 1; digits <= 9; ++digits) {
+            const std::string text = formatDouble(degrees, std::chars_format::general, digits);
+            double candidate = 0;
+            std::from_chars(text.data(), text.data() + text.size(), candidate);
+            if (fits(candidate)) return candidate;
+        }
+        return {};
+    };
+    auto found = shortest([&](double candidate) { return asRead(candidate) && exact(candidate); });
+    if (!found) found = shortest(asRead);
+    if (!found) found = shortest(exact);
+    return found.value_or(degrees);
 }
 
 std::optional<float> parseFloat(std::string_view text) {

@@ -10,9 +10,9 @@ namespace OvTool {
 
 /// The angle as files' readers convert it: float of degrees times pi / 180 in double.
 float toRadians(float degrees);
-/// The degrees with the fewest digits from which `toRadians` gives this angle back (30, not 30.000002); the
-/// nearest degrees when there are none.
-float toDegrees(float radians);
+/// The degrees with the fewest digits, 9 at most, that give this angle back (30, not 30.000002): as a float, in
+/// double, or both where that can be.
+double toDegrees(float radians);
 
 /// A finite decimal number that fits a float and is the whole text.
 std::optional<float> parseFloat(std::string_view text);

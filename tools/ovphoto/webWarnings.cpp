@@ -57,16 +57,16 @@ bool isUnturnedTypeB(const RnPhotoWebData& web, const std::vector<Fact>& facts) 
 std::optional<std::string> earlyEnd(const RnPhotoWebData& web) {
     const int count = web.getPsiCount();
     if (web.isPsiTruncated() || web.getSymmetry() == PhotoWebSymmetry::Axial || count < 2) return {};
-    const float last = toDegrees(web.getPsi(count - 1));
-    const float end = web.getSymmetry() == PhotoWebSymmetry::Full   ? 360
-                      : web.getSymmetry() == PhotoWebSymmetry::Half ? 180
-                                                                    : 90;
-    float allowed = tolerance;
+    const double last = toDegrees(web.getPsi(count - 1));
+    const double end = web.getSymmetry() == PhotoWebSymmetry::Full   ? 360
+                       : web.getSymmetry() == PhotoWebSymmetry::Half ? 180
+                                                                     : 90;
+    double allowed = tolerance;
     if (web.getSymmetry() == PhotoWebSymmetry::Full) {
-        float step = 0;
+        double step = 0;
         for (int j = 1; j < count; ++j)
             step = std::max(step, toDegrees(web.getPsi(j)) - toDegrees(web.getPsi(j - 1)));
-        allowed = 1.5F * step;
+        allowed = 1.5 * step;
     }
     if (end - last <= allowed) return {};
     return "the horizontal angles end at " + shortNumber(last) + " deg: up to " + shortNumber(end) +

@@ -44,14 +44,14 @@ SymmetryText symmetryText(PhotoWebSymmetry symmetry) {
     return {"Unknown", "unknown"};
 }
 
-std::vector<float> thetasOf(const RnPhotoWebData& web) {
-    std::vector<float> angles;
+std::vector<double> thetasOf(const RnPhotoWebData& web) {
+    std::vector<double> angles;
     for (int i = 0; i < web.getThetaCount(); ++i) angles.push_back(toDegrees(web.getTheta(i)));
     return angles;
 }
 
-std::vector<float> psisOf(const RnPhotoWebData& web) {
-    std::vector<float> angles;
+std::vector<double> psisOf(const RnPhotoWebData& web) {
+    std::vector<double> angles;
     for (int j = 0; j < web.getPsiCount(); ++j) angles.push_back(toDegrees(web.getPsi(j)));
     return angles;
 }
@@ -100,7 +100,7 @@ void printJson(const ReadResult& result, const HostSession& session, bool withVa
 
 std::string degreesText(double degrees) { return shortNumber(degrees) + " deg"; }
 
-std::string rangeText(const std::vector<float>& angles) {
+std::string rangeText(const std::vector<double>& angles) {
     const std::string count = std::to_string(angles.size()) + (angles.size() == 1 ? " angle" : " angles");
     if (angles.size() < 2) return angles.empty() ? count : count + ", " + degreesText(angles.front());
     return count + ", " + shortNumber(angles.front()) + " to " + degreesText(angles.back());
