@@ -16,6 +16,12 @@ set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_CXX_VISIBILITY_PRESET hidden)
 set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
 
+# Sources for one operating system end in this: <name>_posix.cpp, <name>_windows.cpp.
+set(OVPHOTO_PLATFORM posix)
+if(WIN32)
+  set(OVPHOTO_PLATFORM windows)
+endif()
+
 find_program(CCACHE_PROGRAM ccache)
 if(CCACHE_PROGRAM)
   set(CMAKE_CXX_COMPILER_LAUNCHER ${CCACHE_PROGRAM})
@@ -24,6 +30,9 @@ endif()
 add_library(ovphoto_flags INTERFACE)
 target_compile_features(ovphoto_flags INTERFACE cxx_std_20)
 target_include_directories(ovphoto_flags INTERFACE ${PROJECT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/include)
+if(WIN32)
+  target_compile_definitions(ovphoto_flags INTERFACE UNICODE WIN32_LEAN_AND_MEAN)
+endif()
 # Results must not depend on the compiler: no contraction of products and sums, and never fast-math.
 target_compile_options(ovphoto_flags INTERFACE -ffp-contract=off -Wall -Wextra -Wshadow -Wconversion -Werror)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)

@@ -10,7 +10,7 @@ namespace Ov {
 /// Errors: a device whose source fails raises RnStreamEx::ExReadError, one whose sink fails ExWriteError.
 class OVHOST_API RnBufferedIO : public RnCastable {
 public:
-    static constexpr RnUid iid{0x81c8df23, 0xa78111d1, 0x988a4445, 0x53540000};
+    [[gnu::used]] static constexpr RnUid iid{0x81c8df23, 0xa78111d1, 0x988a4445, 0x53540000};
     /// What `get` leaves in its argument at the end of the input.
     static constexpr wchar_t endOfInput = 0xFFFF;
 

@@ -11,7 +11,7 @@ namespace Ov {
 /// What a builder says of itself. Texts live as long as the module.
 class OVHOST_API RnBuilderDescription : public RnCastable {
 public:
-    static constexpr RnUid iid{0xad148680, 0x719a11d1, 0xa3bb0060, 0x9707609d};
+    [[gnu::used]] static constexpr RnUid iid{0xad148680, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// Class id of what the builder creates.
     virtual const RnUid& getClassId() const = 0;
@@ -29,7 +29,7 @@ public:
 /// Creates objects of one class.
 class OVHOST_API RnComponentBuilder : public RnBuilderDescription {
 public:
-    static constexpr RnUid iid{0xad148681, 0x719a11d1, 0xa3bb0060, 0x9707609d};
+    [[gnu::used]] static constexpr RnUid iid{0xad148681, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     virtual RnRefPtr<RnComponentBuilder> getBuilder();
     virtual RnCRefPtr<RnComponentBuilder> getBuilder() const;
@@ -40,7 +40,7 @@ public:
 /// Imports objects of one class from files; the second base of a builder.
 class OVHOST_API RnImportBuilder : public RnCastable {
 public:
-    static constexpr RnUid iid{0xad148682, 0x719a11d1, 0xa3bb0060, 0x9707609d};
+    [[gnu::used]] static constexpr RnUid iid{0xad148682, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// Visits the format's file extensions, in lower case without a dot.
     virtual RnEnum::Action enumerateExtensions(RnEnumerator<const wchar_t*>& visitor) = 0;
@@ -63,7 +63,7 @@ class OVHOST_API RnComponentDescription : public RnCastable {};
 /// The builders of a module.
 class OVHOST_API RnComponentRegistry : public RnComponentDescription {
 public:
-    static constexpr RnUid iid{0xad148683, 0x719a11d1, 0xa3bb0060, 0x9707609d};
+    [[gnu::used]] static constexpr RnUid iid{0xad148683, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// The builder of a class with a new reference, or null.
     virtual RnRef<RnComponentBuilder> getBuilder(const RnUid& classId) = 0;

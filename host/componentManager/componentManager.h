@@ -24,7 +24,7 @@ public:
 /// Threads:  any number may create and find at once, while nobody registers, loads or unloads.
 class OVHOST_API RnComponentManager : public RnCastable {
 public:
-    static constexpr RnUid iid{0xad148684, 0x719a11d1, 0xa3bb0060, 0x9707609d};
+    [[gnu::used]] static constexpr RnUid iid{0xad148684, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// A new object of a registered class; null when no builder has the class id or there is no memory.
     virtual RnRef<RnCastable> createObject(const RnUid& classId) = 0;

@@ -9,7 +9,7 @@ namespace Ov {
 /// Imports files of a family of formats without being told which.
 class OVHOST_API RnImporter : public RnCastable {
 public:
-    static constexpr RnUid iid{0x81c8df25, 0xa78111d1, 0x988a4445, 0x53540000};
+    [[gnu::used]] static constexpr RnUid iid{0x81c8df25, 0xa78111d1, 0x988a4445, 0x53540000};
 
     /// The category of the builders to draw on.
     virtual const wchar_t* getImportCategory() const = 0;

@@ -11,7 +11,7 @@ namespace Ov {
 /// The host's services to whoever runs in it: a place to report messages, and a finder of files.
 class OVHOST_API RnProcessController : public RnCastable {
 public:
-    static constexpr RnUid iid{0xeb719621, 0xc02011d1, 0xaa7a00c0, 0x4fb1532a};
+    [[gnu::used]] static constexpr RnUid iid{0xeb719621, 0xc02011d1, 0xaa7a00c0, 0x4fb1532a};
 
     /// Shows a message to the user. Level 0 is an ordinary message.
     virtual void report(int level, const wchar_t* text) = 0;

@@ -35,6 +35,9 @@ public:
     RnComponentRegistry& registry() const;
 
 private:
+    /// The system's handle of the file loaded from this absolute path; raises ExModule.
+    static void* load(const std::wstring& path);
+
     std::wstring _path;
     void* _handle;
 };

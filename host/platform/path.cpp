@@ -99,14 +99,6 @@ std::wstring fromUtf8(std::string_view text) {
     return out;
 }
 
-#if defined(_WIN32)
-std::filesystem::path nativePath(std::wstring_view path) { return std::filesystem::path(path); }
-std::wstring widePath(const std::filesystem::path& path) { return path.native(); }
-#else
-std::filesystem::path nativePath(std::wstring_view path) { return std::filesystem::path(toUtf8(path)); }
-std::wstring widePath(const std::filesystem::path& path) { return fromUtf8(path.native()); }
-#endif
-
 std::wstring pathStem(std::wstring_view path) { return widePath(nativePath(path).stem()); }
 
 std::wstring pathFolder(std::wstring_view path) {

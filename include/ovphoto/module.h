@@ -10,7 +10,7 @@
 
 extern "C" {
 
-/// The entry point, and the module's only named function: its builders. The object is static; no reference is
+/// The entry point, export 1 and the module's only named function: its builders. The object is static; no reference is
 /// taken. Type of the address: RnGetComponentDescriptionFunction.
 OVPHOTO_EXPORT Ov::RnComponentRegistry* RnGetComponentDescription();
 }

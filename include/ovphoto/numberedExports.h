@@ -6,6 +6,7 @@
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/module.h"
+#include "ovphoto/numberedExportList.h"
 
 // Functions that the module exports by number alone: calendar, clock and time zones for a host's dialogs, and
 // files in any of the formats. A host reaches them through Ov::Module::byOrdinal, which asks the system where
@@ -21,31 +22,6 @@
 // The functions that give names take one caller at a time, the others any number.
 //
 // Files (435 to 438 and 440) are described where they stand below.
-
-// clang-format off
-
-/// The list of them, number and name: tables and definition files are made from it.
-#define OVPHOTO_NUMBERED_EXPORTS(entry) \
-    entry(422, hoursMinutesToDecimal) \
-    entry(423, decimalToHoursMinutes) \
-    entry(424, getTimeZoneName) \
-    entry(425, getTimeZoneFlag) \
-    entry(426, getTimeZoneMeridian) \
-    entry(427, getTimeZoneCount) \
-    entry(428, findTimeZone) \
-    entry(429, isInTimeZone) \
-    entry(430, getMonthName) \
-    entry(431, getMonthShortName) \
-    entry(432, getDaysInMonth) \
-    entry(433, dayOfYear) \
-    entry(434, monthAndDay) \
-    entry(435, writeIes) \
-    entry(436, writeCibse) \
-    entry(437, writeNimb) \
-    entry(438, writeTbt) \
-    entry(440, readFileFacts)
-
-// clang-format on
 
 namespace OvPhotometrics {
 
@@ -159,6 +135,5 @@ struct RnNumberedExport {
     void (*function)();
 };
 
-#if !defined(_WIN32)
+/// The table, the entry point under its number first. On Windows there is none: the module's own has the numbers.
 extern "C" OVPHOTO_EXPORT const RnNumberedExport RnNumberedExports[];
-#endif

@@ -10,4 +10,5 @@
     {number, reinterpret_cast<void (*)()>( \
                  static_cast<decltype(OvPhotometrics::NumberedFunctions::name)>(&OvPhotometrics::name))},
 
-const RnNumberedExport RnNumberedExports[] = {OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_EXPORT_ENTRY){0, nullptr}};
+const RnNumberedExport RnNumberedExports[] = {{1, reinterpret_cast<void (*)()>(&RnGetComponentDescription)},
+                                              OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_EXPORT_ENTRY){0, nullptr}};

@@ -1,0 +1,22 @@
+#include <windows.h>
+
+#include "components/photo/lid/component.h"
+#include "components/photo/lid/moduleEntry.h"
+#include "ovphoto/module.h"
+
+namespace {
+
+constexpr DWORD longestPath = 504;  // the companion's is up to seven longer
+
+}  // namespace
+
+extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID) {
+    if (reason != DLL_PROCESS_ATTACH) return TRUE;
+    DisableThreadLibraryCalls(instance);
+    wchar_t path[512]{};
+    GetModuleFileNameW(instance, path, longestPath);
+    OvPhotometrics::enterModule(instance, path);
+    return TRUE;
+}
+
+Ov::RnComponentRegistry* RnGetComponentDescription() { return &OvPhotometrics::lidComponent(); }
