@@ -1,6 +1,5 @@
 #include "host/componentManager/componentManager.h"
 
-#include <dlfcn.h>
 #include <gmock/gmock.h>
 
 #include <thread>
@@ -194,8 +193,7 @@ std::string failureOf(F function) {
 }
 
 TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
-    const std::wstring text = folder.write("text\xE9.so", "text"),
-                       host = fromUtf8(OVPHOTO_BIN_DIR "/libOVhost.so");
+    const std::wstring text = folder.write("text\u00E9.so", "text"), host = fromUtf8(OVPHOTO_HOST);
     for (const auto& [path, reason] :
          {std::pair{folder.wide("l\xC3\xA4mp.so"), ": no such file"}, std::pair{folder.wide(), ": it is a folder"},
           std::pair{L"libm.so.6"s, ": no such file"}}) {
@@ -209,21 +207,21 @@ TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
                     HasSubstr(toUtf8(path) + reason));
     }
     EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(text.c_str()); }),
-                HasSubstr("\xE9.so: file too short"));
+                AllOf(HasSubstr("\u00E9.so: "), Not(HasSubstr("no such file"))));
     EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(host.c_str()); }),
                 HasSubstr("RnGetComponentDescription"));
     EXPECT_EQ(manager->builders().size(), 5U);
 }
 
 TEST_F(ComponentManager, LoadsAModuleOnceAndUnloadsIt) {
-    const std::wstring path = fromUtf8(OVPHOTO_BIN_DIR "/libOVphoto.so"), link = folder.wide("link.so");
-    std::filesystem::create_symlink(nativePath(path), nativePath(link));
+    const std::wstring path = fromUtf8(OVPHOTO_MODULE),
+                       link = pathFolder(path) + L"/de/.." + path.substr(path.find_last_of(L"/\\"));
     const Module& module = manager->loadModule(path.c_str());
     EXPECT_EQ(&manager->loadModule(link.c_str()), &module);
-    EXPECT_EQ(Module(fromUtf8(OVPHOTO_BIN_DIR "/libOVhost.so")).byOrdinal(422), nullptr);
+    EXPECT_EQ(Module(fromUtf8(OVPHOTO_HOST)).byOrdinal(422), nullptr);
     manager->unloadModule(L"/elsewhere.so");
     EXPECT_TRUE(manager->createObject(OvPhotometrics::classIds::iesWeb));
     manager->unloadModule(link.c_str());
     EXPECT_FALSE(manager->findBuilder(OvPhotometrics::classIds::iesWeb));
-    EXPECT_FALSE(dlopen(toUtf8(path).c_str(), RTLD_NOW | RTLD_NOLOAD));
+    EXPECT_FALSE(isLoaded(OVPHOTO_MODULE));
 }

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstdlib>
-#include <fstream>
 #include <string>
 #include <vector>
 
@@ -36,25 +34,23 @@ public:
 private:
     static std::wstring catalogue() {
         static const TempFolder folder;
-        static const bool compiled = compile(folder);
+        static const bool compiled = (compileCatalogue(folder.path() / "numbers", numbers()), true);
         return compiled ? folder.wide("numbers") : L"";
     }
 
-    static bool compile(const TempFolder& folder) {
-        std::string source = "$set 1\n";
+    static std::string numbers() {
+        std::string lines;
         for (const auto& message : OvPhotometrics::messages::all) {
-            source += std::to_string(message.id) + " " + std::to_string(message.id);
+            lines += std::to_string(message.id) + " " + std::to_string(message.id);
             int number = 0;
             for (const char* letter = message.arguments; *letter; ++letter)
-                source += " %" + std::to_string(++number) +
-                          (*letter == 's'   ? ""
-                           : *letter == 'f' ? "!g!"
-                                            : std::string("!") + *letter + "!");
-            source += "\n";
+                lines += " %" + std::to_string(++number) +
+                         (*letter == 's'   ? ""
+                          : *letter == 'f' ? "!g!"
+                                           : std::string("!") + *letter + "!");
+            lines += "\n";
         }
-        folder.write("numbers.msg", source);
-        const std::string stem = (folder.path() / "numbers").string();
-        return std::system(("LC_ALL=C gencat '" + stem + "' '" + stem + ".msg'").c_str()) == 0;
+        return lines;
     }
 
     Ov::MessageReporter _previous;
