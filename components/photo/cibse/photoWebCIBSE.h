@@ -18,10 +18,8 @@ struct CibseFormat {
     static constexpr const char* streamName = "CIBSE stream";
 
     static constexpr auto canImport = cibseCanRead;
-    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return cibseRead(rec, in); }
-    static bool toWeb(const Record& rec, Web& web, bool loaded, const wchar_t* name, const wchar_t*) {
-        return cibseToWeb(rec, web, loaded, name);
-    }
+    static constexpr auto read = cibseRead;
+    static constexpr auto toWeb = cibseToWeb;
     static constexpr auto fromDistribution = cibseRecordFromDistribution;
     static constexpr auto write = cibseWrite;
     static constexpr auto fromDistributionFaithfully = cibseRecordFromDistributionFaithfully;

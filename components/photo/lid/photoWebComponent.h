@@ -22,6 +22,7 @@
 //         static constexpr int saveLine, loadLine;
 //         static constexpr const char* streamName;
 //         static bool canImport(RnBufferedIO&);  // content test; keeps the position
+//         // These two may do without `basePath`, the folder of the file.
 //         static bool read(Record&, RnStream&, const wchar_t* basePath);
 //         static bool toWeb(const Record&, Web&, bool loaded, const wchar_t* name, const wchar_t* basePath);
 //         static bool fromDistribution(RnIntensityDist&, Record&);
@@ -39,6 +40,23 @@ namespace OvPhotometrics {
 
 template <class Format>
 class PhotoWebPersistant;
+
+template <class Format>
+bool readRecord(typename Format::Record& record, Ov::RnStream& in, const wchar_t* basePath) {
+    if constexpr (requires { Format::read(record, in, basePath); })
+        return Format::read(record, in, basePath);
+    else
+        return Format::read(record, in);
+}
+
+template <class Format>
+bool recordToWeb(const typename Format::Record& record, typename Format::Web& web, const wchar_t* name,
+                 const wchar_t* basePath) {
+    if constexpr (requires { Format::toWeb(record, web, true, name, basePath); })
+        return Format::toWeb(record, web, true, name, basePath);
+    else
+        return Format::toWeb(record, web, true, name);
+}
 
 /// Base of a format's web class `Self`.
 template <class Self, class Format>
@@ -71,7 +89,8 @@ public:
 
     bool load(Ov::RnStream& in, int, const wchar_t* name, const wchar_t* basePath) override {
         typename Format::Record record;
-        if (!Format::read(record, in, basePath) || !Format::toWeb(record, this->data(), true, name, basePath))
+        if (!readRecord<Format>(record, in, basePath) ||
+            !recordToWeb<Format>(record, this->data(), name, basePath))
             throw Ov::RnStreamEx::ExReadError(Format::source, Format::loadLine, Format::streamName);
         return true;
     }
@@ -109,7 +128,7 @@ public:
     bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath, FileFacts& facts) override {
         Ov::RnStream stream(&io, Ov::RnStream::Form::text);
         Record record;
-        if (!Format::read(record, stream, basePath)) return false;
+        if (!readRecord<Format>(record, stream, basePath)) return false;
         Format::describe(record, facts);
         return true;
     }
@@ -133,7 +152,7 @@ private:
         text->seek(0, 0);
         Record again;
         const auto web = Ov::rnCreate<typename Format::Web>();
-        return Format::read(again, stream, nullptr) && Format::toWeb(again, *web, true, L"", nullptr);
+        return readRecord<Format>(again, stream, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
     }
 };
 

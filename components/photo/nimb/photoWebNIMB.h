@@ -20,11 +20,8 @@ struct NimbFormat {
     static constexpr const char* streamName = "NIMB stream";
 
     static constexpr auto canImport = nimbCanRead;
-    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return nimbRead(rec, in); }
-    static bool toWeb(const Record& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name,
-                      const wchar_t*) {
-        return nimbToWeb(rec, web, loaded, name);
-    }
+    static constexpr auto read = nimbRead;
+    static constexpr auto toWeb = nimbToWeb;
     static constexpr auto fromDistribution = nimbRecordFromDistribution;
     static constexpr auto fromDistributionFaithfully = nimbRecordFromDistributionFaithfully;
     static constexpr auto write = nimbWrite;

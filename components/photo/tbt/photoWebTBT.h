@@ -20,11 +20,8 @@ struct TbtFormat {
     static constexpr const char* streamName = "TBT stream";
 
     static constexpr auto canImport = tbtCanRead;
-    static bool read(Record& rec, Ov::RnStream& in, const wchar_t*) { return tbtRead(rec, in); }
-    static bool toWeb(const Record& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name,
-                      const wchar_t*) {
-        return tbtToWeb(rec, web, loaded, name);
-    }
+    static constexpr auto read = tbtRead;
+    static constexpr auto toWeb = tbtToWeb;
     static constexpr auto fromDistribution = tbtRecordFromDistribution;
     static constexpr auto fromDistributionFaithfully = tbtRecordFromDistributionFaithfully;
     static constexpr auto write = tbtWrite;
