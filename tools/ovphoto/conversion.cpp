@@ -75,7 +75,7 @@ std::string keysOf(const Json& facts) {
 }
 
 std::string percentText(const Json& percent) {
-    return shortNumber(std::round(percent.get<double>() * 1000) / 1000) + " %";
+    return shortNumber(std::round(percent.get<double>() * 1000) / 1000 + 0.0) + " %";
 }
 
 std::string lossText(const Json& report) {
