@@ -13,14 +13,22 @@ class OVHOST_API ExBase {
 public:
     /// `reason`: what went wrong, for the user; `code`: 0, or where it was raised (a line number).
     explicit ExBase(const char* reason, int code = 0);
+
+    /// @{
+    /// Copies reason and code.
     ExBase(const ExBase&);
     ExBase& operator=(const ExBase&);
+    /// @}
+
     virtual ~ExBase();
 
+    /// What went wrong, for the user.
     const char* getReason() const noexcept { return _reason.c_str(); }
     /// The reason with what else is known: here the code, in derived classes the source path.
     virtual std::string getDetailedReason() const;
+    /// Says something else about what went wrong.
     void setReason(const char* reason);
+    /// 0, or the line that it was raised at.
     int getCode() const noexcept { return _code; }
 
 private:
@@ -31,6 +39,7 @@ private:
 /// A failed assertion of the host: the expression that did not hold and where it stands.
 class OVHOST_API ExAssertion : public ExBase, public std::logic_error {
 public:
+    /// `expression` did not hold in `line` of `file`.
     ExAssertion(const char* expression, const char* file, int line);
     ~ExAssertion() override;
 
@@ -46,6 +55,7 @@ namespace Assertions {
 }  // namespace Assertions
 
 namespace FloatUtil {
+/// The value without its sign; that of -0 stays.
 inline float abs(float value) { return value < 0 ? -value : value; }
 }  // namespace FloatUtil
 

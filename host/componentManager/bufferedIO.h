@@ -10,6 +10,7 @@ namespace Ov {
 /// Errors: a device whose source fails raises RnStreamEx::ExReadError, one whose sink fails ExWriteError.
 class OVHOST_API RnBufferedIO : public RnCastable {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0x81c8df23, 0xa78111d1, 0x988a4445, 0x53540000};
     /// What `get` leaves in its argument at the end of the input.
     static constexpr wchar_t endOfInput = 0xFFFF;
@@ -37,11 +38,13 @@ public:
     /// Line feeds between the start and the current position.
     virtual int lineFeeds() = 0;
 
+    /// @{
     /// The unread bytes that the device holds ready, possibly none. A reader may walk them directly and says with
     /// `advanceTo` how far it came; what it does not find there it gets through `get`.
     const char* next() const { return _next; }
     const char* limit() const { return _limit; }
     void advanceTo(const char* position) { _next = position; }
+    /// @}
 
     /// As `get`, but the result is the character or -1, and a character that is ready costs no call.
     int getChar() {
@@ -51,8 +54,11 @@ public:
     }
 
 protected:
+    /// @{
+    /// What `next` and `limit` give, kept by the device.
     const char* _next = nullptr;
     const char* _limit = nullptr;
+    /// @}
 };
 
 }  // namespace Ov

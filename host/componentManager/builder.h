@@ -11,17 +11,23 @@ namespace Ov {
 /// What a builder says of itself. Texts live as long as the module.
 class OVHOST_API RnBuilderDescription : public RnCastable {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xad148680, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// Class id of what the builder creates.
     virtual const RnUid& getClassId() const = 0;
     /// The family shown to the user, such as "Photometric Web".
     virtual const wchar_t* getCategory() const = 0;
+
+    /// @{
+    /// For the user: the class's name, version, description, legal notice and vendor.
     virtual const wchar_t* getName() const = 0;
     virtual int getVersion() const = 0;
     virtual const wchar_t* getDescription() const = 0;
     virtual const wchar_t* getLegalNotice() const = 0;
     virtual const wchar_t* getVendor() const = 0;
+    /// @}
+
     /// Whether a user may create the class directly.
     virtual bool isCreatable() const = 0;
 };
@@ -29,10 +35,15 @@ public:
 /// Creates objects of one class.
 class OVHOST_API RnComponentBuilder : public RnBuilderDescription {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xad148681, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
+    /// @{
+    /// This builder with a new reference.
     virtual RnRefPtr<RnComponentBuilder> getBuilder();
     virtual RnCRefPtr<RnComponentBuilder> getBuilder() const;
+    /// @}
+
     /// A new object with one reference; null when there is no memory.
     virtual RnRef<RnCastable> create() = 0;
 };
@@ -40,6 +51,7 @@ public:
 /// Imports objects of one class from files; the second base of a builder.
 class OVHOST_API RnImportBuilder : public RnCastable {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xad148682, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// Visits the format's file extensions, in lower case without a dot.
@@ -63,13 +75,20 @@ class OVHOST_API RnComponentDescription : public RnCastable {};
 /// The builders of a module.
 class OVHOST_API RnComponentRegistry : public RnComponentDescription {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xad148683, 0x719a11d1, 0xa3bb0060, 0x9707609d};
 
     /// The builder of a class with a new reference, or null.
     virtual RnRef<RnComponentBuilder> getBuilder(const RnUid& classId) = 0;
+
+    /// @{
+    /// Of the module: version, legal notice, vendor.
     virtual int getVersion() const = 0;
     virtual const wchar_t* getLegalNotice() const = 0;
     virtual const wchar_t* getVendor() const = 0;
+    /// @}
+
+    /// How many builders there are.
     virtual std::uint32_t getBuilderCount() const = 0;
     /// Visits every builder once, in no particular order, then finishes.
     virtual RnEnum::Action enumerateBuilders(RnEnumerator<RnPtr<RnComponentBuilder>>& visitor) = 0;

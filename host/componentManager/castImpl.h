@@ -39,21 +39,26 @@ RnCastable* findInterface(Object& object, const RnUid& id, First*, Rest*... rest
 
 }  // namespace detail
 
+/// Answers the interfaces, all of them bases of `Base`. On its own it makes static objects.
 template <class Base, class... Interfaces>
 class RnCastImpl : public Base {
 public:
     using Base::Base;
+    /// @cond
     RnCastable* getCastable() override { return this; }
     const RnCastable* getCastable() const override { return this; }
     RnCastable* getInterface(const RnUid& id) override {
         return detail::findInterface(*this, id, static_cast<Interfaces*>(nullptr)...);
     }
     bool hasInterface(const RnUid& id) const override { return ((id == Interfaces::iid) || ...); }
+    /// @endcond
 };
 
+/// The same for a class with a second base, which answers with its own part.
 template <class Base, class Second, class... Interfaces>
 class RnCastImpl2 : public Base, public Second {
 public:
+    /// @cond
     RnCastable* getCastable() override { return static_cast<Base*>(this); }
     const RnCastable* getCastable() const override { return static_cast<const Base*>(this); }
     RnCastable* getInterface(const RnUid& id) override {
@@ -66,22 +71,27 @@ public:
     void reserved() override {}
     long newReference() const override { return Base::newReference(); }
     long release() const override { return Base::release(); }
+    /// @endcond
 };
 
+/// Counted: deletes itself on its last release.
 template <class Impl>
 class RnCastHeap : public Impl {
 public:
     using Impl::Impl;
     RnCastHeap() = default;
-    RnCastHeap(const RnCastHeap& other) : Impl(other) {}  // a copy has its own holders
+    /// A copy has its own holders.
+    RnCastHeap(const RnCastHeap& other) : Impl(other) {}
     RnCastHeap& operator=(const RnCastHeap&) = delete;
 
+    /// @cond
     long newReference() const override { return ++_count; }
     long release() const override {
         const long count = --_count;
         if (count < 0) delete this;
         return count;
     }
+    /// @endcond
 
 private:
     mutable LkCounterWindows<long> _count{-1};
@@ -103,31 +113,39 @@ RnRef<RnCastable> rnCreateOrNull() noexcept {
     }
 }
 
+/// Answers RnPersistant with a new `Adapter` for this object.
 template <class Impl, class Self, class Adapter>
 class RnTempIface : public Impl {
 public:
     using Impl::Impl;
+    /// @cond
     RnCastable* getInterface(const RnUid& id) override {
         if (id == RnPersistant::iid) return rnCreate<Adapter>(static_cast<Self&>(*this)).detach();
         return Impl::getInterface(id);
     }
     bool hasInterface(const RnUid& id) const override { return id == RnPersistant::iid || Impl::hasInterface(id); }
+    /// @endcond
 };
 
 /// A data object: counted, answers `Interfaces` (Base derives from them) and saves itself through `Adapter`.
 template <class Self, class Adapter, class Base, class... Interfaces>
 using RnDataObject = RnCastHeap<RnTempIface<RnCastImpl<Base, Interfaces...>, Self, Adapter>>;
 
-/// `Data::classId` is the class id of the saved object.
+/// Base of such adapters: holds a reference to its data object, whose `Data::classId` is saved with it.
 template <class Data>
 class RnTempObject : public RnCastHeap<RnCastImpl<RnPersistant, RnPersistant>> {
 public:
+    /// Keeps `data` alive.
     explicit RnTempObject(Data& data) : _data(RnRef<Data>::share(&data)) {}
 
+    /// @{
+    /// What is saved in front of the object.
     const RnUid& getClassId() const override { return Data::classId; }
     int getVersion() const override { return 1; }
+    /// @}
 
 protected:
+    /// The object to save or load.
     Data& data() const { return *_data; }
 
 private:

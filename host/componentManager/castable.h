@@ -15,8 +15,11 @@ namespace Ov {
 /// reference; whoever holds a reference releases it. References may be taken and dropped on any thread.
 class OVHOST_API RnCastable {
 public:
+    /// @{
+    /// The object itself, whatever interface it is asked through; no new reference.
     virtual RnCastable* getCastable() = 0;
     virtual const RnCastable* getCastable() const = 0;
+    /// @}
 
     /// The part of this object that answers for `iid`, with a new reference, or null without one. The result is
     /// the castable base of exactly that interface, so a static_cast to the interface is right.
@@ -24,12 +27,15 @@ public:
     /// Whether `getInterface` would answer; takes no reference.
     virtual bool hasInterface(const RnUid& iid) const = 0;
 
+    /// A place in the table of operations; does nothing.
     virtual void reserved();
 
+    /// @{
     /// Take and drop a reference; the result is the new count, below 0 once the object is gone. These base
     /// versions are for static objects: they count nothing and destroy nothing.
     virtual long newReference() const;
     virtual long release() const;
+    /// @}
 
     virtual ~RnCastable();
 
@@ -42,6 +48,7 @@ class OVHOST_API ExBadCast : public ExBase, public std::bad_cast {
 public:
     ExBadCast();
     ~ExBadCast() override;
+    /// The reason.
     const char* what() const noexcept override;
 };
 
@@ -49,11 +56,14 @@ public:
 /// translators in turn (none are registered by default). Null, or an object with one reference.
 OVHOST_API RnCastable* RnTranslateInterface(RnCastable* object, const RnUid& iid);
 
-/// Host side: adds and removes a translator, which answers as RnTranslateInterface does. Do so while nothing is
-/// being cast.
+/// Answers as RnTranslateInterface does.
 using RnTranslator = RnCastable* (*)(RnCastable* object, const RnUid& iid);
+
+/// @{
+/// Host side: adds and removes a translator, while nothing is being cast.
 OVHOST_API void RnAddTranslator(RnTranslator translator);
 OVHOST_API void RnRemoveTranslator(RnTranslator translator);
+/// @}
 
 /// The interface `I` of an object: its own, else a translation, else null.
 template <class I>

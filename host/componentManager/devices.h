@@ -14,8 +14,12 @@ namespace Ov {
 /// Device over bytes in memory: reads and writes at one position, and grows as it is written.
 class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
 public:
+    /// @{
+    /// Empty, or holding a copy of `bytes`, at the first of them.
     RnMemoryBuffer() : RnMemoryBuffer(std::string_view()) {}
     explicit RnMemoryBuffer(std::string_view bytes);
+    /// @}
+
     RnMemoryBuffer(const RnMemoryBuffer&) = delete;
     RnMemoryBuffer& operator=(const RnMemoryBuffer&) = delete;
 
@@ -30,11 +34,13 @@ public:
     int writeBytes(const void* data, int count) override;
     int lineFeeds() override;
 
+    /// All that is held, wherever the position is.
     const std::string& bytes() const { return _bytes; }
 
 protected:
     /// Appends more input to what is held; false at the end of it. Memory has no more than it holds.
     virtual bool readMore() { return false; }
+    /// Adds to what is held; the position stays.
     void append(const char* data, std::size_t count);
     /// Room for `count` bytes at the position, which moves behind them.
     virtual char* prepareWrite(std::size_t count) { return makeRoom(count); }
@@ -55,6 +61,7 @@ private:
 /// read so that `seek` works on any stream. Writing raises ExWriteError.
 class OVHOST_API RnInBuffer : public RnMemoryBuffer {
 public:
+    /// Reads from `source`.
     explicit RnInBuffer(std::istream* source);
 
 protected:
@@ -68,6 +75,7 @@ private:
 /// Output device over a standard stream, which must outlive it. Writes at once; at the end of its input always.
 class OVHOST_API RnOutBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
 public:
+    /// Writes to `sink`.
     explicit RnOutBuffer(std::ostream* sink) : _sink(sink) {}
 
     int readBytes(void* buffer, int count) override;

@@ -9,6 +9,7 @@ namespace Ov {
 /// Imports files of a family of formats without being told which.
 class OVHOST_API RnImporter : public RnCastable {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0x81c8df25, 0xa78111d1, 0x988a4445, 0x53540000};
 
     /// The category of the builders to draw on.
@@ -18,11 +19,15 @@ public:
     /// The file types offered to the user: "Name (*.ext)|*.ext" entries, separated by "|"; the first, "All (...)",
     /// has every extension of the family. Empty when no builder is there.
     virtual const wchar_t* getFileTypes() = 0;
+
+    /// @{
     /// Import a file. The builder is the first whose content test accepts it; null when none does, and then
     /// `recognised` is false. A file that cannot be read or is refused raises RnStreamEx::ExReadError.
     virtual RnRef<RnCastable> import(const wchar_t* path, const wchar_t* basePath, bool& recognised) = 0;
     virtual RnRef<RnCastable> import(const wchar_t* path, const wchar_t* basePath) = 0;
     virtual RnRef<RnCastable> import(RnPtr<RnBufferedIO> io, const wchar_t* name, const wchar_t* basePath) = 0;
+    /// @}
+
     /// The pattern that a file dialog starts with: every extension of the family, "*.cib;*.ies".
     virtual const wchar_t* getDefaultSearch() = 0;
 };

@@ -20,6 +20,7 @@ public:
     /// Calls `loadFinished` of each object in the order they were added. What a call throws is passed on; the
     /// objects behind it are let go of without a call.
     void finish();
+    /// Whether nothing is due.
     bool empty() const { return !_first; }
 
 private:

@@ -11,6 +11,7 @@ namespace Ov {
 /// The host's services to whoever runs in it: a place to report messages, and a finder of files.
 class OVHOST_API RnProcessController : public RnCastable {
 public:
+    /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xeb719621, 0xc02011d1, 0xaa7a00c0, 0x4fb1532a};
 
     /// Shows a message to the user. Level 0 is an ordinary message.
@@ -22,17 +23,24 @@ public:
                           const wchar_t* listName) = 0;
 };
 
+/// @{
 /// The controllers of the process and of the calling thread, here one object, to be cast to RnProcessController.
 OVHOST_API RnCastable* RnGetProcessController();
 OVHOST_API RnCastable* RnGetThreadProcessController();
+/// @}
 
-/// Host side: who receives the messages (null: standard error, a line each), the folders of a path list, and an
-/// object that stands in for the controller, which is kept (null is passed on as null; `resetProcessController`
-/// brings the host's own back). All belong to the process; set them while nothing is being imported.
+/// Receives the messages of the process.
 using MessageReporter = std::function<void(int level, const wchar_t* text)>;
-OVHOST_API MessageReporter setMessageReporter(MessageReporter reporter);  // returns the previous one
+
+// Host side. All of this belongs to the process: set it while nothing is being imported.
+
+/// Who receives the messages; null: standard error, a line each. The result is the previous one.
+OVHOST_API MessageReporter setMessageReporter(MessageReporter reporter);
+/// The folders of a path list. Readers look for the files that theirs name in those of "WebPathList".
 OVHOST_API void setPathList(const std::wstring& listName, std::vector<std::wstring> folders);
+/// Lets an object stand in for the controller, which is kept; null is passed on as null.
 OVHOST_API void setProcessController(RnCastable* controller);
+/// Brings the host's own back.
 OVHOST_API void resetProcessController();
 
 }  // namespace Ov

@@ -9,17 +9,22 @@ template <class T>
 class RnPtr {
 public:
     RnPtr() = default;
-    RnPtr(T* object) : _object(object) {}  // implicit: an argument
+    /// Implicit, for arguments.
+    RnPtr(T* object) : _object(object) {}
 
+    /// @{
+    /// The object; null when there is none.
     T* get() const { return _object; }
     T* operator->() const { return _object; }
     T& operator*() const { return *_object; }
     explicit operator bool() const { return _object != nullptr; }
+    /// @}
 
 private:
     T* _object = nullptr;
 };
 
+/// The same of an object that is not to be changed.
 template <class T>
 using RnCPtr = RnPtr<const T>;
 
@@ -36,6 +41,8 @@ public:
         return RnRef(object);
     }
 
+    /// @{
+    /// A copy takes a new reference, a move the one that there was.
     RnRef(const RnRef& other) : RnRef(share(other._object)) {}
     RnRef(RnRef&& other) noexcept : _object(other.detach()) {}
     template <class U>
@@ -49,11 +56,15 @@ public:
         std::swap(_object, other._object);
         return *this;
     }
+    /// @}
 
+    /// @{
+    /// The object; null when there is none.
     T* get() const { return _object; }
     T* operator->() const { return _object; }
     T& operator*() const { return *_object; }
     explicit operator bool() const { return _object != nullptr; }
+    /// @}
 
     /// Gives the reference up to the caller.
     T* detach() { return std::exchange(_object, nullptr); }
@@ -64,12 +75,16 @@ private:
     T* _object = nullptr;
 };
 
+/// Owner of a reference to an object that is not to be changed.
 template <class T>
 using RnCRef = RnRef<const T>;
+
+/// @{
 /// Names under which the builder interfaces return counted pointers to themselves.
 template <class T>
 using RnRefPtr = RnRef<T>;
 template <class T>
 using RnCRefPtr = RnRef<const T>;
+/// @}
 
 }  // namespace Ov

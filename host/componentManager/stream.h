@@ -12,7 +12,8 @@ namespace Ov {
 /// A stream of values, formatted text and whole objects over a device, in text or in binary form.
 ///
 /// Text form: values stand as decimal text with one separator between them; lines break after column 70. Numbers
-/// read back exactly; characters stand as numbers, bool as 0 or 1, a string between quotes with \", \\ and \uXXXX.
+/// read back exactly; characters stand as numbers, bool as 0 or 1, a string between quotes with `\"`, `\\` and
+/// `\uXXXX`.
 /// Binary form: values stand little-endian in fixed widths (long as 32 bits, wchar_t as 16, bool as one byte,
 /// a string as a 32-bit length and that many UTF-16 units).
 /// Formatted text is the same in both forms, one byte a character.
@@ -22,6 +23,7 @@ namespace Ov {
 /// Threads: one at a time.
 class OVHOST_API RnStream {
 public:
+    /// How values stand in the device.
     enum class Form { text, binary };
 
     /// Reads and writes through `device`, which it keeps. Loaded objects go to `postLoad`, or, without a list,
@@ -31,8 +33,13 @@ public:
     RnStream& operator=(const RnStream&) = delete;
 
     virtual ~RnStream();
+
+    /// @{
+    /// The form.
     virtual bool isTextStream() const;
     virtual bool isBinaryStream() const;
+    /// @}
+
     /// `object` has been loaded and wants to hear when all are.
     virtual void postLoad(RnPersistant* object);
     /// Hands the waiting objects of `list` on to this stream's own list.
@@ -40,8 +47,7 @@ public:
     /// Line of the current position: line feeds consumed so far plus one.
     virtual int computeLineNb();
 
-    // Four groups over fifteen types, in this order of types. `count` items stand behind `value`; read returns
-    // the number read, which is `count`.
+    // Four groups over fifteen types, in this order of types.
 // clang-format off
 #define OV_STREAM_TYPES(X) \
     X(unsigned long long) X(long long) X(std::wstring) X(double) X(float) X(bool) X(unsigned long) X(long) \
@@ -51,15 +57,20 @@ public:
 #define OV_STREAM_INSERT(T) virtual RnStream& operator<<(T value);
 #define OV_STREAM_READ(T) virtual int read(T& value, int count);
 #define OV_STREAM_EXTRACT(T) virtual RnStream& operator>>(T& value);
+
+    /// @{
+    /// Values: one, or the `count` that stand from `value` on. `read` gives the number read, which is `count`.
     OV_STREAM_TYPES(OV_STREAM_WRITE)
     OV_STREAM_TYPES(OV_STREAM_INSERT)
     OV_STREAM_TYPES(OV_STREAM_READ)
     OV_STREAM_TYPES(OV_STREAM_EXTRACT)
+    /// @}
 #undef OV_STREAM_WRITE
 #undef OV_STREAM_INSERT
 #undef OV_STREAM_READ
 #undef OV_STREAM_EXTRACT
 
+    /// @{
     /// Formatted text as wide printf and scanf know it, with these fixed meanings on every platform: %s and %[
     /// are wide strings, %hd and %hx 16 bits, %d, %ld, %u and %x 32 bits, %n int; reading, %g, %f and %e are float
     /// and %lg, %lf and %le double. Independent of the process's locale, and exact. Only decimal numbers convert:
@@ -69,6 +80,7 @@ public:
     /// pending separator first.
     virtual int formattedWrite(const wchar_t* format, ...);
     virtual int formattedRead(const wchar_t* format, ...);
+    /// @}
 
     /// Writes a whole object: its class id and version, then what its persistence adapter saves. Null is written
     /// as such. Raises ExBadCast for an object that cannot be saved. In text form what the adapter saves starts on
@@ -80,12 +92,15 @@ public:
     RnRef<RnCastable> readObject(const RnUid* iid, const wchar_t* name = nullptr,
                                  const wchar_t* basePath = nullptr);
 
+    /// The device, without a new reference.
     RnBufferedIO& device() const { return *_device; }
 
+    /// @{
     /// Characters on the current output line, and whether the last item leaves a separator due. The text readers
     /// and writers of formats keep both themselves where they go to the device directly.
     std::int32_t column = 0;
     bool pendingSeparator = false;
+    /// @}
 
     /// The next character, or -1 at the end of the input; a pending separator is skipped first.
     int getChar() {

@@ -12,7 +12,9 @@ public:
     ~RnStreamEx() override;
 
     std::string getDetailedReason() const override;
+    /// Source path of the throwing module.
     const char* getFile() const noexcept { return _file.c_str(); }
+    /// Line there.
     int getLine() const noexcept { return getCode(); }
 
     class ExReadError;
@@ -22,12 +24,14 @@ private:
     std::string _file;
 };
 
+/// What is read is not there, not right or not to be held.
 class OVHOST_API RnStreamEx::ExReadError : public RnStreamEx {
 public:
     using RnStreamEx::RnStreamEx;
     ~ExReadError() override;
 };
 
+/// What is to be written cannot be written.
 class OVHOST_API RnStreamEx::ExWriteError : public RnStreamEx {
 public:
     using RnStreamEx::RnStreamEx;

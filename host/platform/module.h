@@ -18,6 +18,7 @@ public:
     Module& operator=(const Module&) = delete;
     ~Module();
 
+    /// The absolute path of the file.
     const std::wstring& path() const { return _path; }
 
     /// The address of an export, or null.

@@ -9,10 +9,14 @@ namespace Ov {
 /// A vector or direction (x, y, z).
 template <class T>
 struct GeVector3 {
+    /// @{
+    /// Along the axes.
     T x{};
     T y{};
     T z{};
+    /// @}
 
+    /// The Euclidean length.
     T length() const { return std::sqrt(x * x + y * y + z * z); }
 
     /// Scales to length 1 by the reciprocal of the length. A length of 0 raises the assertion "len > 0" with the
@@ -27,11 +31,13 @@ struct GeVector3 {
         return *this;
     }
 
+    /// A copy of length 1; the assertion as for `normalize`.
     GeVector3 normalized() const {
         GeVector3 result = *this;
         return result.normalize(505);
     }
 
+    /// Whether all components are equal.
     friend bool operator==(const GeVector3&, const GeVector3&) = default;
 };
 

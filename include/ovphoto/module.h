@@ -2,6 +2,7 @@
 
 #include "host/componentManager/builder.h"
 
+/// Marks what the module shows by name. On Windows a list of exports does.
 #if defined(_WIN32)
 #define OVPHOTO_EXPORT
 #else
@@ -10,9 +11,10 @@
 
 extern "C" {
 
-/// The entry point, export 1 and the module's only named function: its builders. The object is static; no reference is
-/// taken. Type of the address: RnGetComponentDescriptionFunction.
+/// The entry point, export 1 and the module's only named function: its builders. The object is static; no
+/// reference is taken.
 OVPHOTO_EXPORT Ov::RnComponentRegistry* RnGetComponentDescription();
 }
 
+/// Type of the entry point, for an address that was looked up.
 using RnGetComponentDescriptionFunction = Ov::RnComponentRegistry*();

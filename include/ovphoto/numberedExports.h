@@ -59,8 +59,8 @@ enum class FileForm : std::int32_t {
 ///
 /// Numbers are the shortest text that reads back as the same value, several with one blank between them.
 struct FileFact {
-    const wchar_t* key;
-    const wchar_t* text;
+    const wchar_t* key;   ///< which; as listed above
+    const wchar_t* text;  ///< what the file says
 };
 
 /// The functions with their types.
@@ -78,15 +78,19 @@ struct NumberedFunctions {
     int (*getTimeZoneFlag)(int index);
     /// Longitude of the zone's meridian in radians, 15 degrees for each hour; 0 for an invalid index.
     float (*getTimeZoneMeridian)(int index);
+    /// How many zones there are.
     int (*getTimeZoneCount)();
     /// The index of the zone with the meridian (radians) nearest to this one, the lowest of equals.
     int (*findTimeZone)(float meridian);
     /// Whether the longitude (degrees, -180 to 180) lies inside the zone's range; false for an invalid index.
     bool (*isInTimeZone)(int index, float longitude);
 
+    /// @{
     /// Empty outside 1..12.
     const wchar_t* (*getMonthName)(int month);
     const wchar_t* (*getMonthShortName)(int month);
+    /// @}
+
     /// 0 outside 1..12.
     int (*getDaysInMonth)(int month);
     /// 1..365, or 0 when there is no such date.
@@ -94,6 +98,7 @@ struct NumberedFunctions {
     /// The date of a day of the year; false, and nothing written, outside 1..365.
     bool (*monthAndDay)(int dayOfYear, int* month, int* day);
 
+    /// @{
     /// Write any distribution as the text of a file to a text stream. A faithful file takes its label lines, and
     /// those of the format's own numbers that do not follow from the light, from `count` facts as `readFileFacts`
     /// gives them, of any format: lines of another format go where there is room, keywords in front; the name of a
@@ -108,6 +113,7 @@ struct NumberedFunctions {
                       std::int32_t count);
     bool (*writeTbt)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
                      std::int32_t count);
+    /// @}
 
     /// Reads an input and visits what it says beyond its web, label lines first, each in the order of the file.
     /// The format is that of the web class `format`, or, when that is null, of the first whose content test
@@ -131,8 +137,8 @@ NumberedFunctions numberedFunctions(const Module& module) {
 
 /// One entry of the table; the last has ordinal 0 and no function.
 struct RnNumberedExport {
-    std::uint32_t ordinal;
-    void (*function)();
+    std::uint32_t ordinal;  ///< its number
+    void (*function)();     ///< to be cast to its own type
 };
 
 /// The table, the entry point under its number first. On Windows there is none: the module's own has the numbers.

@@ -14,14 +14,20 @@ enum class PhotoWebSymmetry : std::int32_t {
 
 /// Angles {first, last} in radians.
 struct AngleRange {
+    /// @{
+    /// Both ends belong to the range.
     float first = 0;
     float last = 0;
+    /// @}
 };
 
 /// Indices {first, last}, both inclusive.
 struct IndexRange {
+    /// @{
+    /// Both ends belong to the range.
     std::int32_t first = 0;
     std::int32_t last = 0;
+    /// @}
 };
 
 }  // namespace Ov

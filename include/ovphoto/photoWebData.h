@@ -18,6 +18,7 @@ namespace Ov {
 /// Threads:  any number may query a loaded web at once.
 class RnPhotoWebData : public RnCastable {
 public:
+    /// Id of the interface.
     static constexpr RnUid iid{0x1a3aa365, 0xb3bd11d1, 0xa3e70060, 0x9707609d};
 
     /// A new web with the same grid, flux, peak, orientation and flags; its name is empty and it does not count
@@ -27,12 +28,15 @@ public:
     virtual bool isLoaded() const = 0;
     /// Never null.
     virtual const wchar_t* getName() const = 0;
+    /// How the horizontal angles stand for the whole circle.
     virtual PhotoWebSymmetry getSymmetry() const = 0;
     /// Peak intensity in candela, as the file gives it.
     virtual float getMaxCandela() const = 0;
     /// Luminous flux in lumens: as the file gives it, else integrated over the web.
     virtual float getLumens() const = 0;
+    /// Whether the light's frame is the web's own.
     virtual bool hasIdentityOrientation() const = 0;
+    /// The matrix that turns a direction of the light's frame into the web's own.
     virtual GeLinearMatrix3<float> getOrientation() const = 0;
     /// `direction` in the web's frame: unchanged when the orientation is the identity, else turned and
     /// normalised. A zero vector then raises the assertion "len > 0".
@@ -41,14 +45,24 @@ public:
     virtual GeVector3<float>& toWebFrameUnit(GeVector3<float>& out, const GeVector3<float>& direction) const = 0;
     /// Whether nothing is emitted beyond the last horizontal angle.
     virtual bool isPsiTruncated() const = 0;
+
+    /// @{
+    /// The first and the last angle.
     virtual AngleRange getThetaRange() const = 0;
     virtual AngleRange getPsiRange() const = 0;
+    /// @}
+
+    /// @{
     /// Index of the last angle that is at most `angle`; 0 when all are above it, -1 when there are none.
     virtual int findTheta(float angle) const = 0;
     virtual int findPsi(float angle) const = 0;
+    /// @}
+
+    /// How many vertical angles there are.
     virtual int getThetaCount() const = 0;
     /// The index is clamped to those that exist.
     virtual float getTheta(int index) const = 0;
+    /// How many horizontal angles are stored.
     virtual int getPsiCount() const = 0;
     /// The index is folded by symmetry; -1 and indices beyond the last stand for mirrored or repeated planes.
     virtual float getPsi(int index) const = 0;
