@@ -28,8 +28,8 @@ protected:
                                        const wchar_t* basePath = nullptr) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
         try {
-            const auto object = immortal<PhotoWebBuilder<Format>>().import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()),
-                                                                           name, basePath);
+            const auto object =
+                immortal<PhotoWebBuilder<Format>>().import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), name, basePath);
             return RnRef<typename Format::Web>::share(dynamic_cast<typename Format::Web*>(object.get()));
         } catch (const Ov::RnStreamEx::ExReadError&) {
             return {};

@@ -17,19 +17,33 @@ TEST_F(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
             EXPECT_TRUE(result.says(row.substr(row.find('|') + 1))) << row << result.out << result.err;
         }
     };
-    expectStatus(2, {"|command is required", "frobnicate|frobnicate", "info|FILE", "info good.ies --frob|--frob",
-                     "info good.ies --values|--json", "info good.ies --as pdf|pdf", "intensity good.ies 10|'10'",
-                     "intensity good.ies 1,2,3|'1,2,3'", "intensity good.ies up,0|'up,0'",
-                     "intensity good.ies 0,nan|'0,nan'", "intensity good.ies 0,0 --frame upside|upside",
-                     "intensity good.ies 0,0 --flux -5|-5", "intensity good.ies 0,0 --flux 5lm|5lm",
+    expectStatus(2, {"|command is required",
+                     "frobnicate|frobnicate",
+                     "info|FILE",
+                     "info good.ies --frob|--frob",
+                     "info good.ies --values|--json",
+                     "info good.ies --as pdf|pdf",
+                     "intensity good.ies 10|'10'",
+                     "intensity good.ies 1,2,3|'1,2,3'",
+                     "intensity good.ies up,0|'up,0'",
+                     "intensity good.ies 0,nan|'0,nan'",
+                     "intensity good.ies 0,0 --frame upside|upside",
+                     "intensity good.ies 0,0 --flux -5|-5",
+                     "intensity good.ies 0,0 --flux 5lm|5lm",
                      "convert good.ies|OUT",
-                     "convert good.ies b.pdf|b.pdf", "convert good.ies b --to pdf|pdf", "convert a b c --to ies|OUT",
-                     "convert good.ies --into o|--to", "convert good.ies a.ies --jobs 2|--into",
-                     "convert good.ies --into o --to ies --jobs 0|'0'", "make torch a.ies|torch",
-                     "make diffuse a|'a'", "make diffuse a.ies --hotspot 9|spotlight",
+                     "convert good.ies b.pdf|b.pdf",
+                     "convert good.ies b --to pdf|pdf",
+                     "convert a b c --to ies|OUT",
+                     "convert good.ies --into o|--to",
+                     "convert good.ies a.ies --jobs 2|--into",
+                     "convert good.ies --into o --to ies --jobs 0|'0'",
+                     "make torch a.ies|torch",
+                     "make diffuse a|'a'",
+                     "make diffuse a.ies --hotspot 9|spotlight",
                      "make spotlight a.ies --hotspot 89.1|from 0.11 to 89 ",
                      "make spotlight a.ies --falloff 0|from 0.11 to 90 ",
-                     "make isotropic a.ies --candela 1 --flux 1|--flux", "make isotropic a.ies --flux 0|'0'"});
+                     "make isotropic a.ies --candela 1 --flux 1|--flux",
+                     "make isotropic a.ies --flux 0|'0'"});
     expectStatus(0, {"--help|Exit status", "intensity --help|--frame", "--version|ovphoto 0.",
                      "info good.ies --as Ies|good"});
     expectStatus(1, {"info good.ies --module ./none.so|none.so"});
