@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <fstream>
 #include <regex>
+#include <set>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -80,6 +81,31 @@ TEST(Readme, ExamplesPrintWhatStandsThere) {
         EXPECT_THAT(example.command, testing::StartsWith("ovphoto "));
         EXPECT_EQ(runInSources(example.command), example.output);
     }
+}
+
+/// What stands in `text` wherever the pattern's group is found.
+std::set<std::string> allOf(const std::string& text, const char* pattern) {
+    const std::regex regex(pattern);
+    std::set<std::string> found;
+    for (std::sregex_iterator match(text.begin(), text.end(), regex), end; match != end; ++match)
+        found.insert((*match)[1]);
+    return found;
+}
+
+TEST(ManPage, NamesEveryCommandAndOptionAndNoOther) {
+    const std::string page =
+        std::regex_replace(readText(sourceFolder / "docs/man/ovphoto.1"), std::regex(R"(\\-)"), "-");
+    const char* const option = R"((--[a-z][a-z-]*))";
+    const std::string help = runInSources("ovphoto --help");
+    std::set<std::string> options = allOf(help, option);
+    const std::set<std::string> commands = allOf(help, R"(\n  ([a-z]+) )");
+    EXPECT_GT(commands.size(), 5U);
+    for (const std::string& command : commands) {
+        EXPECT_THAT(page, testing::HasSubstr("\n.SS " + command));
+        options.merge(allOf(runInSources("ovphoto " + command + " --help"), option));
+    }
+    options.merge(allOf(runInSources("ovphoto settings write --help"), option));
+    EXPECT_EQ(allOf(page, option), options);
 }
 
 TEST(Documents, LinksLeadToFiles) {
