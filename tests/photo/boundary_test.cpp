@@ -1,0 +1,174 @@
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+#include "host/componentManager/componentManager.h"
+#include "host/componentManager/devices.h"
+#include "host/componentManager/processController.h"
+#include "host/componentManager/stream.h"
+#include "host/platform/module.h"
+#include "ovphoto/classIds.h"
+#include "ovphoto/intensityDist.h"
+#include "ovphoto/numberedExports.h"
+#include "tests/support/tempFolder.h"
+
+// What passes between a host and the built module: exceptions both ways, and the module itself, again and again.
+
+namespace {
+
+using namespace Ov;
+namespace ids = OvPhotometrics::classIds;
+
+constexpr const char* goodFile = "IESNA91\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1";
+
+RnRef<RnComponentManager> manager() { return rnCast<RnComponentManager>(RnGetComponentManager()); }
+
+/// A module that is loaded as long as the object lives.
+class LoadedModule {
+public:
+    explicit LoadedModule(std::wstring path)
+        : _path(std::move(path)), _module(manager()->loadModule(_path.c_str())) {}
+    LoadedModule(const LoadedModule&) = delete;
+    LoadedModule& operator=(const LoadedModule&) = delete;
+    ~LoadedModule() { manager()->unloadModule(_path.c_str()); }
+
+    OvPhotometrics::NumberedFunctions functions() const { return OvPhotometrics::numberedFunctions(_module); }
+
+private:
+    std::wstring _path;
+    const Module& _module;
+};
+
+RnRef<RnImportBuilder> iesImporter() { return rnCast<RnImportBuilder>(manager()->findBuilder(ids::iesWeb).get()); }
+
+RnRef<RnIntensityDist> lamp() {
+    auto lamp = rnCast<RnIntensityDist>(manager()->createObject(ids::diffuse).get());
+    lamp->setFlux(1000);
+    return lamp;
+}
+
+class Boundary : public testing::Test {
+protected:
+    Boundary() {
+        setMessageReporter([this](int, const wchar_t* text) { reported += text; });
+    }
+    ~Boundary() override { setMessageReporter(nullptr); }
+
+    template <class Handled, class F>
+    static void isCaught(F raise) {
+        EXPECT_THROW(raise(), Handled);
+    }
+
+    /// `raise` ends in an exception that a handler of each of these classes catches, and of ExBase.
+    template <class... Handled, class F>
+    static void raises(F raise) {
+        (isCaught<Handled>(raise), ...);
+        try {
+            raise();
+            ADD_FAILURE() << "nothing is raised";
+        } catch (const ExBase& failure) {
+            EXPECT_STRNE(failure.getReason(), "");
+            EXPECT_NE(failure.getDetailedReason().find(failure.getReason()), std::string::npos);
+        }
+    }
+
+    TempFolder folder;
+    std::wstring reported;
+};
+
+/// Fails like a broken disk where a host may well have no exception of the library's.
+struct DeviceFailure {
+    int code;
+};
+
+class FailingInput : public RnInBuffer {
+public:
+    FailingInput() : RnInBuffer(&_nothing) {}
+
+protected:
+    bool readMore() override { throw DeviceFailure{7}; }
+
+private:
+    std::istringstream _nothing;
+};
+
+TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
+    const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
+    const auto importer = iesImporter();
+    const std::wstring bad = folder.write("bad.ies", "IESNA91\nTILT=NONE\n0");
+    raises<RnStreamEx::ExReadError, RnStreamEx, std::runtime_error>(
+        [&] { importer->import(bad.c_str(), nullptr); });
+    EXPECT_NE(reported, L"");
+    raises<ExBadCast, std::bad_cast>([&] { importer->canImport(static_cast<RnBufferedIO*>(nullptr)); });
+    const auto source = lamp();
+    raises<ExAssertion, std::logic_error>([&] { source->toLocalNormalized({0, 0, 0}); });
+
+    std::ostringstream full;
+    full.setstate(std::ios::badbit);
+    RnStream out(rnCreate<RnOutBuffer>(&full).get(), RnStream::Form::text);
+    for (const auto write :
+         {module.functions().writeIes, module.functions().writeCibse, module.functions().writeTbt})
+        raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>(
+            [&] { write(*source, out, OvPhotometrics::FileForm::faithful, nullptr, 0); });
+    const auto object = importer->import(folder.write("good.ies", goodFile).c_str(), nullptr);
+    raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>([&] { out << object.get(); });
+}
+
+TEST_F(Boundary, ACatalogueThatIsMissingIsTheHostsToCatch) {
+    const std::wstring alone = folder.wide("alone" + std::filesystem::path(OVPHOTO_MODULE).extension().string());
+    std::filesystem::copy_file(OVPHOTO_MODULE, nativePath(alone));
+    const LoadedModule module(alone);
+    raises<std::runtime_error>([&] { module.functions().getMonthName(6); });
+    EXPECT_THROW(iesImporter()->import(folder.write("cut.ies", "IESNA91").c_str(), nullptr),
+                 RnStreamEx::ExReadError);
+    EXPECT_EQ(reported.substr(0, 8), L"Message ");
+}
+
+TEST_F(Boundary, WhatAHostThrowsComesBackToIt) {
+    const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
+    const auto importer = iesImporter();
+    try {
+        importer->import(rnCreate<FailingInput>().get(), L"", nullptr);
+        ADD_FAILURE() << "nothing is raised";
+    } catch (const DeviceFailure& failure) {
+        EXPECT_EQ(failure.code, 7);
+    }
+    auto visitor = rnVisitor<const wchar_t*>([](const wchar_t*) { throw DeviceFailure{8}; });
+    EXPECT_THROW(importer->enumerateExtensions(visitor), DeviceFailure);
+    setMessageReporter([](int, const wchar_t*) { throw DeviceFailure{9}; });
+    EXPECT_THROW(importer->import(folder.write("cut.ies", "IESNA91").c_str(), nullptr), DeviceFailure);
+}
+
+TEST_F(Boundary, AModuleIsUsedUnloadedAndLoadedAgain) {
+    ASSERT_FALSE(isLoaded(OVPHOTO_MODULE));
+    const std::wstring good = folder.write("good.ies", goodFile), cut = folder.write("cut.ies", "IESNA91");
+    std::wstring first;
+    std::string saved;
+    for (int round = 0; round < 3; ++round) {
+        SCOPED_TRACE(round);
+        {
+            const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
+            EXPECT_TRUE(isLoaded(OVPHOTO_MODULE));
+            const auto memory = rnCreate<RnMemoryBuffer>(saved);
+            RnStream stream(memory.get(), RnStream::Form::binary);
+            if (round == 0) {
+                stream << lamp().get();
+                saved = memory->bytes();
+            } else {
+                EXPECT_EQ(rnCast<RnIntensityDist>(stream.readObject(nullptr).get())->getFlux(), 1000);
+            }
+            const auto web = iesImporter()->import(good.c_str(), nullptr);
+            EXPECT_EQ(rnCast<RnPhotoWebData>(web.get())->getMaxCandela(), 5);
+            // The catalogue is opened anew, and the texts are the same.
+            EXPECT_THROW(iesImporter()->import(cut.c_str(), nullptr), RnStreamEx::ExReadError);
+            EXPECT_STREQ(module.functions().getMonthName(6), L"June");
+        }
+        EXPECT_FALSE(isLoaded(OVPHOTO_MODULE));
+        EXPECT_FALSE(manager()->findBuilder(ids::iesWeb));
+        if (round == 0) first = reported;
+        EXPECT_EQ(std::exchange(reported, L""), first);
+    }
+    EXPECT_NE(first, L"");
+}
+
+}  // namespace
