@@ -26,7 +26,7 @@ void dropTrailingZeros(std::string& text) {
 float toRadians(float degrees) { return static_cast<float>(degrees * std::numbers::pi / 180); }
 
 double toDegrees(float radians) {
-    const double degrees = radians * 180 / std::numbers::pi;
+    const double degrees = static_cast<double>(radians) * 180 / std::numbers::pi;
     if (!std::isfinite(degrees)) return degrees;
     const auto exact = [&](double candidate) {
         return static_cast<float>(candidate * std::numbers::pi / 180) == radians;
