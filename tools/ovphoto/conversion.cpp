@@ -114,6 +114,7 @@ Json unconverted(const Conversion& conversion, const std::vector<std::string>& r
 void printReport(const Json& report, const Conversion& conversion, bool json) {
     if (json) {
         printLine(report);
+        std::cout.flush();  // what is done is told even if a later file ends the process
     } else if (report["ok"].get<bool>()) {
         std::cout << conversion.in << " -> " << conversion.out << ": " << report["format"].get<std::string>()
                   << " to " << conversion.target->name << ", " << lossText(report) << '\n';

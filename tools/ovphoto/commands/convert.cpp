@@ -49,8 +49,8 @@ Action declareConvert(CLI::App& app) {
                                        "extension; no file is written twice or over one that is read")
                             ->type_name("FOLDER")
                             ->needs(to);
-    addParsed(app, {"--jobs", "1..64", "Convert that many files at a time, each in a process of its own"},
-              parseJobs, [options](std::size_t jobs) { options->jobs = jobs; })
+    addParsed(app, {"--jobs", "1..64", "Convert that many files at a time, in as many processes"}, parseJobs,
+              [options](std::size_t jobs) { options->jobs = jobs; })
         ->needs(into);
     app.add_flag("--as-saved", options->asSaved,
                  "Write what a web's own save writes, relative values as a rule, instead of candela for other "

@@ -1,10 +1,12 @@
 #include "tools/ovphoto/commands/convertFolder.h"
 
+#include <algorithm>
 #include <filesystem>
 #include <iostream>
 #include <map>
 #include <memory>
 #include <set>
+#include <sstream>
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/commands.h"
@@ -93,25 +95,23 @@ Plan makePlan(const ConvertOptions& options, const HostSession& session) {
     return plan;
 }
 
-/// The arguments with which the tool converts one file as this run would.
-std::vector<std::string> argumentsFor(const Conversion& conversion, const HostSession& session) {
+/// The arguments with which the tool converts files as this run would; the files are to follow.
+std::vector<std::string> argumentsOf(const ConvertOptions& options, const HostSession& session) {
     std::vector<std::string> arguments{
-        "convert", "--json", "--module", Ov::toUtf8(session.module().path()), "--to", conversion.target->name};
-    if (!conversion.as.empty()) arguments.insert(arguments.end(), {"--as", conversion.as});
-    if (conversion.asSaved) arguments.push_back("--as-saved");
-    arguments.insert(arguments.end(), {"--", conversion.in, conversion.out});
+        "convert", "--json",      "--module", Ov::toUtf8(session.module().path()), "--to", options.target->name,
+        "--into",  options.folder};
+    if (!options.as.empty()) arguments.insert(arguments.end(), {"--as", options.as});
+    if (options.asSaved) arguments.push_back("--as-saved");
+    arguments.push_back("--");
     return arguments;
 }
 
 /// Carries the jobs out, in this process or in several others, and gives their reports in order.
 class Worker {
 public:
-    Worker(const std::vector<Job>& jobs, std::size_t atOnce, const HostSession& session) : _session(session) {
-        if (atOnce < 2) return;
-        std::vector<std::vector<std::string>> runs;
-        for (const Job& job : jobs)
-            if (job.refusal.empty()) runs.push_back(argumentsFor(job.conversion, session));
-        _runner = std::make_unique<SelfRunner>(std::move(runs), atOnce);
+    Worker(const std::vector<Job>& jobs, const ConvertOptions& options, const HostSession& session)
+        : _session(session) {
+        if (options.jobs > 1) startProcesses(jobs, options);
     }
 
     Json report(const Job& job) {
@@ -120,23 +120,56 @@ public:
     }
 
 private:
+    /// Each process gets a share of the files: starting one takes longer than a small file.
+    void startProcesses(const std::vector<Job>& jobs, const ConvertOptions& options) {
+        constexpr std::size_t sharesEach = 4;
+        constexpr std::size_t mostFiles = 50;  // so that a system takes that many arguments
+        const auto isWell = [](const Job& job) { return job.refusal.empty(); };
+        _files = static_cast<std::size_t>(std::count_if(jobs.begin(), jobs.end(), isWell));
+        _share = std::clamp<std::size_t>(_files / (options.jobs * sharesEach), 1, mostFiles);
+        std::vector<std::vector<std::string>> runs;
+        std::size_t files = 0;
+        for (const Job& job : jobs) {
+            if (!isWell(job)) continue;
+            if (files++ % _share == 0) runs.push_back(argumentsOf(options, _session));
+            runs.back().push_back(job.conversion.in);
+        }
+        _runner = std::make_unique<SelfRunner>(std::move(runs), options.jobs);
+    }
+
     Json fromProcess(const Conversion& conversion) {
+        if (_left == 0) takeShare();
+        --_left;
+        std::string line;
+        std::getline(_lines, line);
+        Json report = Json::parse(line, nullptr, false);
+        if (report.is_object()) return report;
+        // A process that broke off did so at the first file without a report; the rest of its share is done here.
+        if (!_failure.empty()) return unconverted(conversion, {std::exchange(_failure, {})});
+        return convertFile(conversion, _session);
+    }
+
+    void takeShare() {
         const ProcessResult result = _runner->next();
-        Json report = Json::parse(result.out, nullptr, false);
-        if (report.is_object() && report.contains("ok")) return report;
-        const std::string status = std::to_string(result.status);
-        return unconverted(conversion,
-                           {result.err.empty() ? "its process failed with status " + status : result.err});
+        _left = std::min(_share, _files);
+        _files -= _left;
+        _lines = std::istringstream(result.out);
+        _failure = result.status == -1 && !result.err.empty() ? result.err : "its process broke off";
     }
 
     const HostSession& _session;
     std::unique_ptr<SelfRunner> _runner;
+    std::size_t _share = 1;
+    std::size_t _files = 0;     // of shares that were not yet taken
+    std::size_t _left = 0;      // files of the share that was taken last
+    std::istringstream _lines;  // their reports
+    std::string _failure;
 };
 
 Totals carryOut(const Plan& plan, const ConvertOptions& options, const HostSession& session) {
     Totals totals;
     Progress progress(plan.jobs.size());
-    Worker worker(plan.jobs, options.jobs, session);
+    Worker worker(plan.jobs, options, session);
     for (const Job& job : plan.jobs) {
         if (!std::cout) break;
         progress.next();
