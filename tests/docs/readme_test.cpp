@@ -109,7 +109,7 @@ TEST(ManPage, NamesEveryCommandAndOptionAndNoOther) {
 }
 
 TEST(Documents, LinksLeadToFiles) {
-    const std::regex link(R"(\]\(([^)#]+)[^)]*\))");
+    const std::regex link(R"(\]\(([^)#\s]+)(#[^)]*)?\))");
     int links = 0;
     for (const fs::path& document : documents()) {
         const std::string text = readText(document);
