@@ -1,10 +1,10 @@
 #include <windows.h>
 
-#include <algorithm>
 #include <cstdint>
 #include <filesystem>
 
 #include "components/messageFile/messageStore.h"
+#include "components/messageFile/resourceCheck_windows.h"
 #include "host/platform/path.h"
 #include "host/sdk/util.h"
 
@@ -50,20 +50,6 @@ private:
     bool _active;
 };
 
-/// Whether all sections of a mapped image lie inside its file. Not every system finds out by itself, and texts
-/// behind the end would be read as empty, or end the process.
-bool isWhole(HMODULE image, std::uintmax_t fileSize) {
-    // The lowest bits say how it is mapped.
-    const char* const base =
-        reinterpret_cast<const char*>(reinterpret_cast<std::uintptr_t>(image) & ~std::uintptr_t{3});
-    const auto* const dos = reinterpret_cast<const IMAGE_DOS_HEADER*>(base);
-    const auto* const headers = reinterpret_cast<const IMAGE_NT_HEADERS*>(base + dos->e_lfanew);
-    const IMAGE_SECTION_HEADER* const sections = IMAGE_FIRST_SECTION(headers);
-    return std::all_of(sections, sections + headers->FileHeader.NumberOfSections, [&](const auto& section) {
-        return std::uintmax_t{section.PointerToRawData} + section.SizeOfRawData <= fileSize;
-    });
-}
-
 /// The open resource file, or null. No code of it runs.
 HMODULE openCatalogue(const fs::path& path) {
     std::error_code error;
@@ -72,7 +58,9 @@ HMODULE openCatalogue(const fs::path& path) {
     // A name without a folder would be looked for in the system's places.
     const HMODULE image = LoadLibraryExW(fs::absolute(path, error).c_str(), nullptr,
                                          LOAD_LIBRARY_AS_DATAFILE | LOAD_LIBRARY_AS_IMAGE_RESOURCE);
-    if (!image || isWhole(image, fs::file_size(path, error))) return image;
+    // The lowest bits of the handle say how the file is mapped.
+    const auto base = reinterpret_cast<std::uintptr_t>(image) & ~std::uintptr_t{3};
+    if (!image || resourcesAreSound(reinterpret_cast<const void*>(base), fs::file_size(path, error))) return image;
     FreeLibrary(image);
     return nullptr;
 }

@@ -177,8 +177,12 @@ TEST(StreamValues, WhatIsMissingOrCannotBeHeldRaises) {
     expectRefused<bool>(Form::binary, {"\x02"});
     expectRefused<std::wstring>(Form::binary, {"\xFF\xFF\xFF\xFF____"});  // a length that nothing stands behind
     RnStream out(rnCreate<RnMemoryBuffer>().get(), Form::binary);
-    EXPECT_THROW(out << (1L << 31), RnStreamEx::ExWriteError);
-    EXPECT_THROW(out << std::wstring(1, static_cast<wchar_t>(0x110000)), RnStreamEx::ExWriteError);
+    if (sizeof(long) > 4) {
+        EXPECT_THROW(out << (1L << 31), RnStreamEx::ExWriteError);
+    }
+    if (sizeof(wchar_t) > 2) {
+        EXPECT_THROW(out << std::wstring(1, static_cast<wchar_t>(0x110000)), RnStreamEx::ExWriteError);
+    }
 }
 
 TEST(StreamValues, ItemsAndLinesKeepColumnAndSeparator) {

@@ -42,6 +42,11 @@ protected:
         }
     }
 
+    bool opensBytes(const std::string& bytes) {
+        catalogue.setFileName(L"");  // some systems protect an open file
+        return opens(folder.write("bytes", bytes));
+    }
+
     TempFolder folder;
     Ov::RnMessageFile catalogue;
 };
@@ -80,12 +85,12 @@ TEST_F(MessageFile, RefusesWhatIsNoCatalogueOrHasLostTexts) {
 
     // What lies behind the last text of a resource file may be missing.
     const auto refused = [&](const std::string& bytes, const std::wstring& lastText) {
-        return !opens(folder.write("cut", bytes)) || catalogue.getText(7) == lastText;
+        return !opensBytes(bytes) || catalogue.getText(7) == lastText;
     };
     const std::string small = bytesOf(compile("small.cat", "5 five\n6 six\n7 seven"));
     for (std::size_t length = 0; length < small.size(); length += 1 + small.size() / 1000)
         EXPECT_TRUE(refused(small.substr(0, length), L"seven")) << length;
-    EXPECT_TRUE(opens(folder.write("cut", small)));
+    EXPECT_TRUE(opensBytes(small));
     // Texts on pages that the file no longer has.
     const std::string large =
         bytesOf(compile("large.cat", "5 " + std::string(1900, 'a') + "\n7 " + std::string(9000, 'b')));
@@ -99,7 +104,7 @@ TEST_F(MessageFile, DamagedTablesAreRefusedOrHarmless) {
         for (const int flip : {0x01, 0x80, 0xFF}) {
             std::string damaged = whole;
             damaged[at] = static_cast<char>(damaged[at] ^ flip);
-            if (!opens(folder.write("damaged", damaged))) continue;
+            if (!opensBytes(damaged)) continue;
             for (unsigned id = 0; id < 10; ++id) EXPECT_LT(catalogue.getText(id).size(), whole.size());
         }
     }

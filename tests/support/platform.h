@@ -17,6 +17,9 @@ void setVariable(const char* name, const char* value);
 /// system knows no such things.
 std::vector<std::filesystem::path> irregularFiles(const std::filesystem::path& folder);
 
+/// Whether the C library's printf keeps every rule of its standard, and can judge others.
+extern const bool printfIsExact;
+
 /// Compiles messages ("5 text", one a line, the text as it is) to a catalogue that replaces the file.
 void compileCatalogue(const std::filesystem::path& file, const std::string& messages);
 

@@ -17,6 +17,8 @@ fs::path makeTemporaryFolder() {
     return name;
 }
 
+const bool printfIsExact = true;
+
 void setVariable(const char* name, const char* value) { setenv(name, value, 1); }
 
 std::vector<fs::path> irregularFiles(const fs::path& folder) {

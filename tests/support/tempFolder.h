@@ -2,6 +2,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <stdexcept>
 #include <string>
 #include <string_view>
 
@@ -27,7 +28,8 @@ public:
     /// Writes a file, in folders that are made for it; its wide path.
     std::wstring write(const std::string& name, std::string_view bytes) const {
         std::filesystem::create_directories(pathOf(name).parent_path());
-        std::ofstream(pathOf(name), std::ios::binary) << bytes;
+        std::ofstream file(pathOf(name), std::ios::binary);
+        if (!(file << bytes).flush()) throw std::runtime_error(name + " cannot be written");
         return wide(name);
     }
 
