@@ -100,6 +100,11 @@ TEST_F(ToolConversion, TellsWhichFactsAreDropped) {
     EXPECT_TRUE(inTbt.ends_with(size)) << inTbt;
     EXPECT_EQ(inTbt.find("LUMINAIRE"), std::string::npos) << "it is the title";
     EXPECT_TRUE(runTool("convert rich.ies out.tbt", folder).says("; dropped TEST, OTHER, tilt, units, length"));
+
+    // Keywords come back from label lines.
+    folder.write("short.ies", IesFile{}.text());
+    convert("short.ies short.cib");
+    EXPECT_EQ(texts(convert("short.cib back.ies")["dropped"]), "[]");
 }
 
 TEST_F(ToolConversion, ASaveThatItsReaderRefusesIsWrittenWithAWarning) {

@@ -25,11 +25,14 @@ std::vector<Fact> readFrom(const HostSession& session, const ReadResult& result,
     return facts;
 }
 
-/// Keys of label lines: header keywords, which are in capitals, and those of lines.
+/// Header keywords are in capitals.
+bool isKeyword(std::wstring_view key) {
+    return std::none_of(key.begin(), key.end(), [](wchar_t c) { return c >= L'a' && c <= L'z'; });
+}
+
 bool isLabel(std::wstring_view key) {
-    const auto isLower = [](wchar_t c) { return c >= L'a' && c <= L'z'; };
     return key == L"title" || key == L"line" || key.starts_with(L"line ") || key.starts_with(L"label ") ||
-           std::none_of(key.begin(), key.end(), isLower);
+           isKeyword(key);
 }
 
 bool isOfWeb(std::wstring_view key) {
@@ -62,11 +65,14 @@ std::wstring withoutBlanks(std::wstring text) {
     return text;
 }
 
-/// The text of all label lines, in which a line that was continued on another is whole.
+/// The text of all label lines, keywords in front. A line that was continued on another is whole.
 std::wstring labelsOf(const std::vector<Fact>& facts) {
     std::wstring labels;
-    for (const Fact& fact : facts)
-        if (isLabel(fact.key)) labels += withoutBlanks(fact.text);
+    for (const Fact& fact : facts) {
+        if (!isLabel(fact.key)) continue;
+        if (isKeyword(fact.key) && fact.key != L"MORE") labels += L"[" + fact.key + L"]";
+        labels += withoutBlanks(fact.text);
+    }
     return labels;
 }
 
