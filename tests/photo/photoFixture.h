@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <memory>
+#include <span>
 #include <string>
 
 #include "components/photo/ies/photoWebIES.h"
@@ -17,6 +18,8 @@ namespace OvPhotometrics {
 /// A host that knows the library's builders and logs what they report.
 class Photo : public testing::Test {
 protected:
+    using Form = Ov::RnStream::Form;
+
     Photo() {
         registerBuilders();
         Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager())->addRegistry(lidComponent());
@@ -36,17 +39,79 @@ protected:
         }
     }
 
-    /// What an object's adapter saves into a text stream.
-    std::string saved(Ov::RnCastable& object) {
+    /// What an object's adapter saves.
+    static std::string saved(Ov::RnCastable& object, Form form = Form::text) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+        Ov::RnStream stream(io.get(), form);
         Ov::rnCast<Ov::RnPersistant>(&object)->save(stream);
         return io->bytes();
+    }
+
+    /// Loads an object from what its adapter may have saved.
+    static bool load(Ov::RnCastable& object, const std::string& bytes, Form form = Form::text,
+                     const wchar_t* name = nullptr) {
+        Ov::RnStream stream(Ov::rnCreate<Ov::RnMemoryBuffer>(bytes).get(), form);
+        return Ov::rnCast<Ov::RnPersistant>(&object)->load(stream, 0, name, nullptr);
     }
 
     RnRef<Ov::RnWebIntensityDist> distributionOf(Ov::RnPhotoWebData& web) { return makeWebDistribution(web); }
 
     MessageLog log;
+};
+
+/// Tests of one format.
+template <class Format>
+class FormatTest : public Photo {
+protected:
+    using Record = typename Format::Record;
+
+    struct Refusal {
+        std::string text, messages;
+        const char* reason = "";
+    };
+
+    RnRef<typename Format::Web> imported(const std::string& text) { return import <Format>(text); }
+
+    /// Reads a text into `rec`.
+    bool read(const std::string& text) {
+        Ov::RnStream stream(Ov::rnCreate<Ov::RnMemoryBuffer>(text).get(), Form::text);
+        return readRecord<Format>(rec, stream, nullptr);
+    }
+
+    /// The text of a record; empty when it is refused.
+    static std::string written(const Record& record) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Form::text);
+        return Format::write(record, stream) ? io->bytes() : "";
+    }
+
+    /// Each text is refused with its messages, and a web that was to load it stays as it was.
+    void refuses(const std::string& good, std::span<const Refusal> cases) {
+        const auto web = import <Format>(good, L"good");
+        ASSERT_TRUE(web) << log.take();
+        const std::string before = saved(*web);
+        for (const auto& [text, messages, reason] : cases) {
+            SCOPED_TRACE(reason + (": " + text));
+            EXPECT_THROW(load(*web, text, Form::text, L"bad"), Ov::RnStreamEx::ExReadError);
+            EXPECT_EQ(log.take(), messages);
+            EXPECT_EQ(saved(*web), before);
+            EXPECT_STREQ(web->getName(), L"good");
+        }
+    }
+
+    /// The content test gives one answer for these texts, and keeps the position.
+    void contentTestIs(bool accepted, std::initializer_list<std::string> texts) {
+        auto& builder = immortal<PhotoWebBuilder<Format>>();
+        for (const std::string& text : texts) {
+            const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>("??" + text);
+            io->seek(2, 0);
+            EXPECT_EQ(builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get())), accepted) << text;
+            EXPECT_EQ(io->seek(0, 1), 2);
+        }
+        EXPECT_THROW(builder.canImport(static_cast<Ov::RnBufferedIO*>(nullptr)), Ov::ExBadCast);
+    }
+
+    Record rec;
 };
 
 /// Numbers in text, one blank between them.

@@ -5,70 +5,60 @@
 namespace OvPhotometrics {
 namespace {
 
-class IesRead : public Photo {};
-
-struct Case {
-    const char* name;
-    std::string text;
-    std::string messages;  // empty: accepted
-};
+using IesRead = FormatTest<IesFormat>;
 
 std::string numbers(const std::string& text) { return "TILT=NONE\n" + text; }
 std::string tilted(const std::string& block) { return IesText{.tilt = "INCLUDE\n" + block + "\n"}.text(); }
 std::string graded(const std::string& values) { return IesText{.values = values}.text(); }
 
 TEST_F(IesRead, EachFaultHasItsMessage) {
-    const Case cases[] = {
-        {"empty file", "", "12945 12956"},
-        {"no TILT line", "IESNA91\n[TEST] tilt\n", "12945 12956"},
-        {"nothing behind TILT", numbers(""), "12945 12946; 12945 12959 -1"},
-        {"no lamp", numbers("0 1 1 2 1 1 2 0 0 0"), "12945 12959 0"},
-        {"leading plus", numbers("+1"), "12945 12947 +; 12945 12959 0"},
-        {"cut off behind the lamps", numbers("1 "), "12945 12946; 12945 12960 -1"},
-        {"one vertical angle", numbers("1 1 1 1 1 1 2"), "12945 12960 1"},
-        {"fraction as a count", numbers("1 1 1 73.5 1"), "12945 12946; 12945 12960 -1"},
-        {"no horizontal angle", numbers("1 1 1 2 0 1 2"), "12945 12961 0"},
-        {"type 4", numbers("1 1 1 2 1 4 2"), "12945 12962 4"},
-        {"units 0", numbers("1 1 1 2 1 1 0"), "12945 12963 0"},
-        {"bad lumens are told with the dimensions", numbers("1 x 1 2 1 1 2 0 0 0"), "12945 12948 x; 12945 12964"},
-        {"missing dimension", numbers("1 1 1 2 1 1 2 0 0"), "12945 12946; 12945 12964"},
-        {"factors", numbers("1 1 1 2 1 1 2 0 0 0 1 1e99 60"), "12945 12946; 12945 12965"},
-        {"grid beyond all counts", numbers("1 1 1 65536 65536 1 2 0 0 0 1 1 60"), "12945 12936"},
-        {"huge counts, short file", numbers("1 1 1 40000 40000 1 2 0 0 0 1 1 60 0 1"), "12945 12946; 12945 12966"},
-        {"vertical angle", numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 x 90"), "12945 12948 x; 12945 12966"},
-        {"horizontal angle", numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 90 -"), "12945 12946; 12945 12967"},
-        {"two points", graded("1 12.5.3 3"), "12945 12946; 12945 12968"},
-        {"number with a tail", graded("1 7x 3"), "12945 12946; 12945 12948 x; 12945 12968"},
-        {"cut off in the candelas", graded("1 2"), "12945 12946; 12945 12968"},
-        {"angles fall", IesText{.vertical = {0, 90, 80, 180}}.text(), "12943"},
-        {"planes fall", IesText{.horizontal = {0, 90, 45}}.text(), "12944"},
-        {"type C vertical", IesText{.vertical = {0, 120}}.text(), "12940"},
-        {"type C last", IesText{.horizontal = {0, 120}}.text(), "12941 120"},
-        {"type C first", IesText{.horizontal = {45, 90}}.text(), "12942 45"},
-        {"type B vertical", IesText{.type = 2, .vertical = {-90, 90.5}, .horizontal = {0, 90}}.text(), "12937"},
-        {"type B one plane", IesText{.type = 2}.text(), "12938"},
-        {"type B last", IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {0, 90.5}}.text(), "12939"},
-        {"type B first", IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {10, 90}}.text(), "12939"},
-        {"type A vertical", IesText{.type = 3, .vertical = {-90.5, 90}, .horizontal = {0, 90}}.text(), "12932"},
-        {"type A one plane", IesText{.type = 3}.text(), "12933"},
-        {"type A first", IesText{.type = 3, .vertical = {-90, 90}, .horizontal = {-91, 90}}.text(), "12934"},
-        {"the web refuses", IesText{.horizontal = {0, 0.1, 360}}.text(), "12928; 12935"},
-        {"product overflows", numbers("1 1 1e30 2 1 1 2 0 0 0 1 1 60 0 90 0 1e30 1"), "12935"},
-        {"flux overflows", IesText{.lumens = -1, .values = "3e38 3e38 3e38"}.text(), "12935"},
-        {"tilt geometry", tilted("4 2 0 90 1 1"), "12945 12949 4"},
-        {"tilt pairs", tilted("1 1"), "12945 12950 1"},
-        {"tilt first angle", tilted("1 2 5 90 1 1"), "12945 12951 5"},
-        {"tilt order", tilted("1 3 0 45 45 1 1 1"), "12945 12952 45 45"},
-        {"tilt last angle", tilted("1 2 0 80 1 1"), "12945 12953 80"},
-        {"tilt angle fails", tilted("1 3 0 x 90 1 1 1"), "12945 12948 x; 12945 12954 3"},
-        {"tilt factors cut off", "TILT=INCLUDE\n1 2 0 90 1", "12945 12946; 12945 12955 2"},
-        {"no tilt file", IesText{.tilt = " lost.tlt\n"}.text(), "12957  lost.tlt"},
+    const Refusal cases[] = {
+        {"", "12945 12956", "empty file"},
+        {"IESNA91\n[TEST] tilt\n", "12945 12956", "no TILT line"},
+        {numbers(""), "12945 12946; 12945 12959 -1", "nothing behind TILT"},
+        {numbers("0 1 1 2 1 1 2 0 0 0"), "12945 12959 0", "no lamp"},
+        {numbers("+1"), "12945 12947 +; 12945 12959 0", "leading plus"},
+        {numbers("1 "), "12945 12946; 12945 12960 -1", "cut off behind the lamps"},
+        {numbers("1 1 1 1 1 1 2"), "12945 12960 1", "one vertical angle"},
+        {numbers("1 1 1 73.5 1"), "12945 12946; 12945 12960 -1", "fraction as a count"},
+        {numbers("1 1 1 2 0 1 2"), "12945 12961 0", "no horizontal angle"},
+        {numbers("1 1 1 2 1 4 2"), "12945 12962 4", "type 4"},
+        {numbers("1 1 1 2 1 1 0"), "12945 12963 0", "units 0"},
+        {numbers("1 x 1 2 1 1 2 0 0 0"), "12945 12948 x; 12945 12964", "bad lumens are told with the dimensions"},
+        {numbers("1 1 1 2 1 1 2 0 0"), "12945 12946; 12945 12964", "missing dimension"},
+        {numbers("1 1 1 2 1 1 2 0 0 0 1 1e99 60"), "12945 12946; 12945 12965", "factors"},
+        {numbers("1 1 1 65536 65536 1 2 0 0 0 1 1 60"), "12945 12936", "grid beyond all counts"},
+        {numbers("1 1 1 40000 40000 1 2 0 0 0 1 1 60 0 1"), "12945 12946; 12945 12966", "huge counts, short file"},
+        {numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 x 90"), "12945 12948 x; 12945 12966", "vertical angle"},
+        {numbers("1 1 1 2 1 1 2 0 0 0 1 1 60 0 90 -"), "12945 12946; 12945 12967", "horizontal angle"},
+        {graded("1 12.5.3 3"), "12945 12946; 12945 12968", "two points"},
+        {graded("1 7x 3"), "12945 12946; 12945 12948 x; 12945 12968", "number with a tail"},
+        {graded("1 2"), "12945 12946; 12945 12968", "cut off in the candelas"},
+        {IesText{.vertical = {0, 90, 80, 180}}.text(), "12943", "angles fall"},
+        {IesText{.horizontal = {0, 90, 45}}.text(), "12944", "planes fall"},
+        {IesText{.vertical = {0, 120}}.text(), "12940", "type C vertical"},
+        {IesText{.horizontal = {0, 120}}.text(), "12941 120", "type C last"},
+        {IesText{.horizontal = {45, 90}}.text(), "12942 45", "type C first"},
+        {IesText{.type = 2, .vertical = {-90, 90.5}, .horizontal = {0, 90}}.text(), "12937", "type B vertical"},
+        {IesText{.type = 2}.text(), "12938", "type B one plane"},
+        {IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {0, 90.5}}.text(), "12939", "type B last"},
+        {IesText{.type = 2, .vertical = {-90, 90}, .horizontal = {10, 90}}.text(), "12939", "type B first"},
+        {IesText{.type = 3, .vertical = {-90.5, 90}, .horizontal = {0, 90}}.text(), "12932", "type A vertical"},
+        {IesText{.type = 3}.text(), "12933", "type A one plane"},
+        {IesText{.type = 3, .vertical = {-90, 90}, .horizontal = {-91, 90}}.text(), "12934", "type A first"},
+        {IesText{.horizontal = {0, 0.1, 360}}.text(), "12928; 12935", "the web refuses"},
+        {numbers("1 1 1e30 2 1 1 2 0 0 0 1 1 60 0 90 0 1e30 1"), "12935", "product overflows"},
+        {IesText{.lumens = -1, .values = "3e38 3e38 3e38"}.text(), "12935", "flux overflows"},
+        {tilted("4 2 0 90 1 1"), "12945 12949 4", "tilt geometry"},
+        {tilted("1 1"), "12945 12950 1", "tilt pairs"},
+        {tilted("1 2 5 90 1 1"), "12945 12951 5", "tilt first angle"},
+        {tilted("1 3 0 45 45 1 1 1"), "12945 12952 45 45", "tilt order"},
+        {tilted("1 2 0 80 1 1"), "12945 12953 80", "tilt last angle"},
+        {tilted("1 3 0 x 90 1 1 1"), "12945 12948 x; 12945 12954 3", "tilt angle fails"},
+        {"TILT=INCLUDE\n1 2 0 90 1", "12945 12946; 12945 12955 2", "tilt factors cut off"},
+        {IesText{.tilt = " lost.tlt\n"}.text(), "12957  lost.tlt", "no tilt file"},
     };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.name);
-        EXPECT_EQ(static_cast<bool>(import(c.text)), c.messages.empty());
-        EXPECT_EQ(log.take(), c.messages);
-    }
+    refuses(IesText{}.text(), cases);
 }
 
 TEST_F(IesRead, AcceptsWhatMakersWrite) {
@@ -81,23 +71,23 @@ TEST_F(IesRead, AcceptsWhatMakersWrite) {
     }
     std::replace(commas.begin() + static_cast<std::ptrdiff_t>(commas.find("TILT=NONE") + 10), commas.end(), ' ',
                  ',');
-    const Case cases[] = {
-        {"CR LF", crlf, ""},
-        {"lone CR", cr, ""},
-        {"commas", commas, ""},
-        {"Ctrl-Z behind the last number", plain.substr(0, plain.size() - 1) + '\x1a', ""},
-        {"NUL behind the last number", plain.substr(0, plain.size() - 1) + '\0', ""},
-        {"no IESNA91", IesText{.header = "1234\n\n[A] b\n"}.text(), ""},
-        {"header bytes above 127", IesText{.header = "IESNA91\n\xe4\xff\n"}.text(), ""},
-        {"long lines", IesText{.header = std::string(200, '=') + "\n"}.text(), ""},
-        {"tilt in lower case, blanks", IesText{.tilt = "none \t\n"}.text(), ""},
-        {"tilt data", tilted("1 2 0 89.95 1 1"), ""},
-        {"counts with a fraction of zeros", "TILT=NONE\n1.0 1e3 1 3.00 1. 1 2 0 0 0 1 1 60 0 90 180 0 1 2 3", ""},
-        {"tiny values are 0", graded("1 2 3 1e-50"), ""},
+    const std::pair<const char*, std::string> cases[] = {
+        {"CR LF", crlf},
+        {"lone CR", cr},
+        {"commas", commas},
+        {"Ctrl-Z behind the last number", plain.substr(0, plain.size() - 1) + '\x1a'},
+        {"NUL behind the last number", plain.substr(0, plain.size() - 1) + '\0'},
+        {"no IESNA91", IesText{.header = "1234\n\n[A] b\n"}.text()},
+        {"header bytes above 127", IesText{.header = "IESNA91\n\xe4\xff\n"}.text()},
+        {"long lines", IesText{.header = std::string(200, '=') + "\n"}.text()},
+        {"tilt in lower case, blanks", IesText{.tilt = "none \t\n"}.text()},
+        {"tilt data", tilted("1 2 0 89.95 1 1")},
+        {"counts with a fraction of zeros", "TILT=NONE\n1.0 1e3 1 3.00 1. 1 2 0 0 0 1 1 60 0 90 180 0 1 2 3"},
+        {"tiny values are 0", graded("1 2 3 1e-50")},
     };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.name);
-        const auto web = import(c.text);
+    for (const auto& [name, text] : cases) {
+        SCOPED_TRACE(name);
+        const auto web = imported(text);
         EXPECT_EQ(log.take(), "");
         ASSERT_TRUE(web);
         EXPECT_EQ(saved(*web), expected);
@@ -105,12 +95,7 @@ TEST_F(IesRead, AcceptsWhatMakersWrite) {
 }
 
 TEST_F(IesRead, HeaderLinesAreKeptInPieces) {
-    const std::string text =
-        "IESNA91\n\n" + std::string(200, 'x') + "\nTILT=NONE\n1 1 1 2 1 1 2 0 0 0 1 1 0 0 90 0 1 1";
-    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
-    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-    IesFileRecord rec;
-    ASSERT_TRUE(iesReadRecord(rec, stream, nullptr));
+    ASSERT_TRUE(read(IesText{.header = "IESNA91\n\n" + std::string(200, 'x') + "\n"}.text()));
     const std::vector<std::wstring> expected = {L"IESNA91", L"", std::wstring(80, L'x'), std::wstring(80, L'x'),
                                                 std::wstring(40, L'x')};
     EXPECT_EQ(rec.lines, expected);
@@ -126,13 +111,11 @@ TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
     const auto tiltPath = [&](const char* name) -> std::wstring {
         const auto web = import(IesText{.tilt = std::string(name) + "\n"}.text(), L"", beside.wide().c_str());
         if (!web) return log.take().empty() ? L"silent" : L"refused";
-        std::wstring visited;
+        std::wstring visited, again;
         auto visitor = Ov::rnVisitor<const wchar_t*>([&](const wchar_t* path) { visited += path; });
-        web->enumerateFiles(visitor);
-        const auto clone = web->clone();
-        std::wstring again;
         auto second = Ov::rnVisitor<const wchar_t*>([&](const wchar_t* path) { again += path; });
-        clone->enumerateFiles(second);
+        web->enumerateFiles(visitor);
+        web->clone()->enumerateFiles(second);
         EXPECT_EQ(visited, again);
         return visited;
     };
@@ -146,35 +129,8 @@ TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
 }
 
 TEST_F(IesRead, ContentTestKeepsThePosition) {
-    const struct {
-        const char* text;
-        bool accepted;
-    } cases[] = {{"IESNA91", true},          {"IESNA9", false},  {"", false},
-                 {"a\nb\nTILT=NONE", true},  {"a TILT=", false}, {"a\rTILT=NONE\r", false},
-                 {"iesna91\r\nTILT=", true}, {"\n\nTILT", false}};
-    for (const auto& c : cases) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(std::string("??") + c.text);
-        io->seek(2, 0);
-        EXPECT_EQ(immortal<IESBuilder>().canImport(static_cast<Ov::RnBufferedIO*>(io.get())), c.accepted)
-            << c.text;
-        EXPECT_EQ(io->seek(0, 1), 2);
-    }
-    EXPECT_THROW(immortal<IESBuilder>().canImport(static_cast<Ov::RnBufferedIO*>(nullptr)), Ov::ExBadCast);
-}
-
-TEST_F(IesRead, ARefusedFileLeavesTheWebAsItWas) {
-    const auto web = import(IesText{}.text(), L"first");
-    const std::string before = saved(*web);
-    const std::string refused[] = {IesText{.horizontal = {0, 120}}.text(), graded("1 2"), "",
-                                   IesText{.horizontal = {0, 0.1, 360}}.text()};
-    for (const std::string& text : refused) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
-        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-        const auto adapter = Ov::rnCast<Ov::RnPersistant>(web.get());
-        EXPECT_THROW(adapter->load(stream, 0, L"second", nullptr), Ov::RnStreamEx::ExReadError);
-        EXPECT_EQ(saved(*web), before);
-        EXPECT_STREQ(web->getName(), L"first");
-    }
+    contentTestIs(true, {"IESNA91", "a\nb\nTILT=NONE", "iesna91\r\nTILT="});
+    contentTestIs(false, {"IESNA9", "", "a TILT=", "a\rTILT=NONE\r", "\n\nTILT"});
 }
 
 }  // namespace
