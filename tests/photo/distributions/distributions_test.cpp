@@ -4,6 +4,8 @@
 #include "components/photo/distributions/isotropic.h"
 #include "components/photo/distributions/spotlight.h"
 #include "components/photo/distributions/web.h"
+#include "components/photo/naturallight/daylightData.h"
+#include "components/photo/tbt/photoWebTBT.h"
 #include "tests/photo/photoFixture.h"
 
 namespace OvPhotometrics {
@@ -107,11 +109,6 @@ TEST_F(Distributions, SpotlightCosinesStayInTheirLimits) {
 }
 
 TEST_F(Distributions, ASpotlightReadsBackExactlyOrStays) {
-    const auto load = [](Spotlight& spot, const std::string& text) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
-        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-        Ov::rnCast<Ov::RnPersistant>(&spot)->load(stream, 0, nullptr, nullptr);
-    };
     const auto spot = makeSpotlight(12.3, 45.6, 0.1f);
     const auto loaded = Ov::rnCreate<Spotlight>();
     load(*loaded, saved(*spot));
@@ -127,18 +124,25 @@ TEST_F(Distributions, ASpotlightReadsBackExactlyOrStays) {
     EXPECT_EQ(loaded->intensity(0, 0) + loaded->getFlux(), 0);
 }
 
-TEST_F(Distributions, SavedOnesReadBackExactly) {
-    for (const auto form : {Ov::RnStream::Form::text, Ov::RnStream::Form::binary}) {
-        const auto lamp = Ov::rnCreate<Isotropic>();
-        lamp->candela = 0.1f;
+TEST_F(Distributions, ObjectsFollowEachOtherInAStream) {
+    const auto lamp = Ov::rnCreate<Isotropic>();
+    lamp->candela = 0.1f;
+    const auto sun = Ov::rnCreate<DaylightData>();
+    sun->setDayOfYear(7);
+    const auto first = distributionOf(*import(IesText{.values = "4 2 1"}.text()));
+    const auto second = distributionOf(*import(IesText{.horizontal = {0, 180}, .values = "4 2 1 4 1 2"}.text()));
+    const auto tbt = import <TbtFormat>("QRT photometric web\n3\n1 1 1\n1000 1000 1 1 1 0\n3 3 2\n4 2 1 4 1 1 -1");
+    Ov::RnCastable* const objects[] = {lamp.get(), first.get(), tbt.get(), sun.get(), second.get()};
+    for (const Form form : {Form::text, Form::binary}) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), form);
-        stream << static_cast<const Ov::RnCastable*>(lamp.get());
-        stream << static_cast<const Ov::RnCastable*>(
-            Ov::rnCreate<Web>().get());  // a web distribution without a web
+        for (Ov::RnCastable* object : objects) stream << object;
+        stream << static_cast<const Ov::RnCastable*>(Ov::rnCreate<Web>().get());  // without a web
         io->seek(0, 0);
-        const auto object = stream.readObject(&Ov::RnIntensityDist::iid);
-        EXPECT_EQ(Ov::rnCast<Ov::RnIntensityDist>(object.get())->getPeakIntensity(), 0.1f);
+        for (Ov::RnCastable* object : objects) {
+            const auto read = stream.readObject(nullptr, L"name");
+            EXPECT_EQ(saved(*read), saved(*object));
+        }
         EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
     }
 }
@@ -188,23 +192,17 @@ TEST_F(Distributions, OneWebIsShared) {
 }
 
 TEST_F(Distributions, LoadingBringsDerivedValuesUpToDate) {
-    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
     const auto light = makeWebDistribution(*import(IesText{.horizontal = {90, 180, 270}}.text()));
     light->setPeakIntensity(7);
-    Ov::rnCast<Ov::RnPersistant>(light.get())->save(stream);
-    io->seek(0, 0);
     const auto loaded = Ov::rnCreate<Web>();
-    Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(stream, 0, nullptr, nullptr);
+    load(*loaded, saved(*light));
     EXPECT_EQ(loaded->getPeakIntensity(), 7);
     // The web's text holds relative values, so what stands for the saved web now has a peak of 1.
     EXPECT_EQ(loaded->getWeb()->getMaxCandela(), 1);
     EXPECT_GT(light->intensityAtUnit(direction(90, 100)), 0);
     EXPECT_NEAR(loaded->localIntensity(1, 1), light->localIntensity(1, 1), 7 * 0.01);
 
-    const auto bad = Ov::rnCreate<Ov::RnMemoryBuffer>("5 1 2 3 4 1\nno object");
-    Ov::RnStream other(bad.get(), Ov::RnStream::Form::text);
-    EXPECT_ANY_THROW(Ov::rnCast<Ov::RnPersistant>(loaded.get())->load(other, 0, nullptr, nullptr));
+    EXPECT_ANY_THROW(load(*loaded, "5 1 2 3 4 1\nno object"));
     EXPECT_EQ(loaded->getPeakIntensity(), 7);
 }
 

@@ -8,7 +8,6 @@ namespace OvPhotometrics {
 namespace {
 
 using Settings = Ov::NaturalLightSettings;
-using Form = Ov::RnStream::Form;
 
 /// A device whose source fails.
 class BrokenDevice : public Ov::RnMemoryBuffer {
@@ -18,19 +17,8 @@ protected:
 
 class LightForms : public Photo {
 protected:
-    bool load(const std::string& bytes, Form form) {
-        Ov::RnStream stream(Ov::rnCreate<Ov::RnMemoryBuffer>(bytes).get(), form);
-        return load(stream);
-    }
-    bool load(Ov::RnStream& stream) {
-        return Ov::rnCast<Ov::RnPersistant>(light.get())->load(stream, 0, nullptr, nullptr);
-    }
-    std::string save(Form form) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), form);
-        Ov::rnCast<Ov::RnPersistant>(light.get())->save(stream);
-        return io->bytes();
-    }
+    bool load(const std::string& bytes, Form form) { return Photo::load(*light, bytes, form); }
+    std::string save(Form form) { return saved(*light, form); }
     Settings settings() const {
         Settings all;
         light->getSettings(all);
@@ -88,22 +76,6 @@ TEST_F(LightForms, ReadBackTheSame) {
         }
     }
     EXPECT_EQ(log.take(), "");
-}
-
-TEST_F(LightForms, ObjectsFollowEachOtherInAStream) {
-    for (const Form form : {Form::text, Form::binary}) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), form);
-        for (const int day : {7, 8}) {
-            light->setDayOfYear(static_cast<std::uint16_t>(day));
-            stream << static_cast<const Ov::RnCastable*>(light.get());
-        }
-        io->seek(0, 0);
-        for (const int day : {7, 8}) {
-            const auto object = stream.readObject(&Ov::RnNaturalLight::iid);
-            EXPECT_EQ(Ov::rnCast<Ov::RnNaturalLight>(object.get())->getDayOfYear(), day);
-        }
-    }
 }
 
 /// The lines of a text form that has all sections of release 3, and what is reported without them.
@@ -313,7 +285,8 @@ TEST_F(LightForms, BinaryOfOtherReleases) {
 TEST_F(LightForms, FailuresOfTheStreamPassThrough) {
     for (const Form form : {Form::text, Form::binary}) {
         Ov::RnStream stream(Ov::rnCreate<BrokenDevice>().get(), form);
-        EXPECT_THROW(load(stream), Ov::RnStreamEx::ExReadError);
+        EXPECT_THROW(Ov::rnCast<Ov::RnPersistant>(light.get())->load(stream, 0, nullptr, nullptr),
+                     Ov::RnStreamEx::ExReadError);
     }
     EXPECT_EQ(log.take(), "");
     Ov::messageFile().setFileName(L"");
