@@ -57,39 +57,40 @@ TEST(Calendar, WhatIsNoDateGivesNothing) {
     }
 }
 
+/// A reading of the clock as "13:45", with " pm" where that is told.
+std::string reading(bool twelveHour, float decimal) {
+    int hours = -1, minutes = -1;
+    bool pm = false;
+    decimalToHoursMinutes(twelveHour, decimal, &hours, &minutes, &pm);
+    return std::to_string(hours) + ":" + std::to_string(minutes) + (pm ? " pm" : "");
+}
+
 TEST(Clock, EveryMinuteComesBack) {
-    for (int minute = 0; minute < 24 * 60; ++minute) {
+    for (int minute = 0; minute < 24 * 60; ++minute)
         for (bool twelveHour : {false, true}) {
-            int hours = -1, minutes = -1;
-            bool pm = false;
-            decimalToHoursMinutes(twelveHour, static_cast<float>(minute) / 60, &hours, &minutes, &pm);
-            EXPECT_EQ((hours + (pm ? 12 : 0)) * 60 + minutes, minute) << minute;
-            EXPECT_LT(hours, twelveHour ? 12 : 24);
-            EXPECT_NEAR(hoursMinutesToDecimal(twelveHour, hours, minutes, pm), minute / 60.0, 2e-6);
+            const bool pm = twelveHour && minute >= 12 * 60;
+            const int hours = minute / 60 - (pm ? 12 : 0);
+            EXPECT_EQ(reading(twelveHour, static_cast<float>(minute) / 60),
+                      std::to_string(hours) + ":" + std::to_string(minute % 60) + (pm ? " pm" : ""));
+            EXPECT_NEAR(hoursMinutesToDecimal(twelveHour, hours, minute % 60, pm), minute / 60.0, 2e-6);
         }
-    }
 }
 
 TEST(Clock, ReadsAnyHours) {
     const struct {
-        bool twelveHour;
         float decimal;
-        int hours, minutes;
-        bool pm;
+        const char* of24;
+        const char* of12;
     } cases[] = {
-        {true, 13.75F, 1, 45, true},    {false, -0.5F, 23, 30, false},  {true, 0.25F, 0, 15, false},
-        {true, 12, 0, 0, true},         {false, 23.992F, 0, 0, false},  {false, -0.001F, 0, 0, false},
-        {false, -24, 0, 0, false},      {false, 49.5F, 1, 30, false},   {false, notANumber, 0, 0, false},
-        {false, infinity, 0, 0, false}, {true, -infinity, 0, 0, false}, {false, 3e38F, 0, 0, false},
-        {true, 0.0083F, 0, 0, false},   {true, 0.0084F, 0, 1, false},   {false, 16777216, 16, 0, false},
+        {13.75F, "13:45", "1:45 pm"}, {-0.5F, "23:30", "11:30 pm"}, {0.25F, "0:15", "0:15"},
+        {12, "12:0", "0:0 pm"},       {23.992F, "0:0", "0:0"},      {-0.001F, "0:0", "0:0"},
+        {-24, "0:0", "0:0"},          {49.5F, "1:30", "1:30"},      {notANumber, "0:0", "0:0"},
+        {infinity, "0:0", "0:0"},     {-infinity, "0:0", "0:0"},    {3e38F, "0:0", "0:0"},
+        {0.0083F, "0:0", "0:0"},      {0.0084F, "0:1", "0:1"},      {16777216, "16:0", "4:0 pm"},
     };
     for (const auto& c : cases) {
-        int hours = -1, minutes = -1;
-        bool pm = false;
-        decimalToHoursMinutes(c.twelveHour, c.decimal, &hours, &minutes, &pm);
-        EXPECT_EQ(hours, c.hours) << c.decimal;
-        EXPECT_EQ(minutes, c.minutes) << c.decimal;
-        EXPECT_EQ(pm, c.pm) << c.decimal;
+        EXPECT_EQ(reading(false, c.decimal), c.of24) << c.decimal;
+        EXPECT_EQ(reading(true, c.decimal), c.of12) << c.decimal;
     }
     bool pm = true;
     decimalToHoursMinutes(false, 1, nullptr, nullptr, &pm);
@@ -129,9 +130,8 @@ TEST(TimeZones, EveryMeridianFindsTheFirstZoneOfItsOffset) {
 }
 
 TEST(TimeZones, HoldTheirMeridiansAndExcludeTheirBounds) {
-    for (int i = 0; i < getTimeZoneCount(); ++i) {
-        EXPECT_TRUE(isInTimeZone(i, getTimeZoneMeridian(i) / degree) || i == 0) << i;
-    }
+    for (int i = 1; i < getTimeZoneCount(); ++i)
+        EXPECT_TRUE(isInTimeZone(i, getTimeZoneMeridian(i) / degree)) << i;
     const struct {
         int zone;
         float longitude;
@@ -171,9 +171,8 @@ TEST(CalendarNames, AreMessagesOfTheirNumbers) {
     EXPECT_STREQ(march, L"13030");  // valid until the same function is called again
 
     Ov::messageFile().setFileName(L"/none/Res.dll");
-    EXPECT_THROW(getMonthName(1), Ov::RnMessageFileEx::ExNoCatalogue);
-    EXPECT_THROW(getMonthShortName(1), Ov::RnMessageFileEx::ExNoCatalogue);
-    EXPECT_THROW(getTimeZoneName(0), Ov::RnMessageFileEx::ExNoCatalogue);
+    for (const auto name : {getMonthName, getMonthShortName, getTimeZoneName})
+        EXPECT_THROW(name(1), Ov::RnMessageFileEx::ExNoCatalogue);
 }
 
 }  // namespace
