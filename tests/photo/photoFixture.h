@@ -4,6 +4,7 @@
 
 #include <memory>
 #include <span>
+#include <sstream>
 #include <string>
 
 #include "components/photo/ies/photoWebIES.h"
@@ -123,6 +124,20 @@ inline std::string joined(const std::vector<double>& values) {
         text += buffer;
     }
     return text;
+}
+
+/// A text with other ends of its lines.
+inline std::string withLineEnds(const std::string& text, const char* end) {
+    std::string other;
+    for (const char c : text) c == '\n' ? other += end : other += c;
+    return other;
+}
+
+inline std::size_t longestLine(const std::string& text) {
+    std::size_t longest = 0;
+    std::istringstream lines(text);
+    for (std::string line; std::getline(lines, line);) longest = std::max(longest, line.size());
+    return longest;
 }
 
 /// The text of an IES file; a test sets what is odd about it and nothing else.

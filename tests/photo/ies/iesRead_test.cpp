@@ -62,18 +62,14 @@ TEST_F(IesRead, EachFaultHasItsMessage) {
 }
 
 TEST_F(IesRead, AcceptsWhatMakersWrite) {
-    const std::string expected = saved(*import(IesText{}.text()));
     const std::string plain = IesText{}.text();
-    std::string crlf, cr, commas = plain;
-    for (const char c : plain) {
-        crlf += c == '\n' ? "\r\n" : std::string(1, c);
-        cr += c == '\n' ? '\r' : c;
-    }
+    const std::string expected = saved(*imported(plain));
+    std::string commas = plain;
     std::replace(commas.begin() + static_cast<std::ptrdiff_t>(commas.find("TILT=NONE") + 10), commas.end(), ' ',
                  ',');
     const std::pair<const char*, std::string> cases[] = {
-        {"CR LF", crlf},
-        {"lone CR", cr},
+        {"CR LF", withLineEnds(plain, "\r\n")},
+        {"lone CR", withLineEnds(plain, "\r")},
         {"commas", commas},
         {"Ctrl-Z behind the last number", plain.substr(0, plain.size() - 1) + '\x1a'},
         {"NUL behind the last number", plain.substr(0, plain.size() - 1) + '\0'},

@@ -163,52 +163,15 @@ TEST_F(LightForms, EachLineHasItsOwnMessage) {
     }
 }
 
-TEST_F(LightForms, TextOfOtherReleases) {
-    const std::string body = Text::whole().substr(Text::whole().find("Natural light is"));
-    const std::string common = body.substr(0, body.find("Overwrite Solar Position"));
-    const std::string overrides =
-        "Overwrite Solar Position: Yes\nSolar Altitude: 0.5\nSolar Azimuth: 1\nOverwrite Solar Illuminance: No\n";
-    const std::string accuracy = "Sky Shadows Accuracy: 0.25\n";
-    const std::string flags = "Sun Flags: 0x600\nSky Flags: 0xFFFF\n";
-    const struct {
-        const char* name;
-        std::string header, trailer;
-        bool isOverridden, sunCastsShadows, skyCastsShadows;
-        float accuracy;
-    } cases[] = {
-        {"0", "1, Release 0", "", false, true, false, 0.5f},
-        {"below 0", "1, Release -2", overrides, false, true, false, 0.5f},
-        {"1", "1, Release 1", overrides, true, true, false, 0.5f},
-        {"2, sky casts", "1, Release 2", overrides + "Sky Casts Shadows: Yes\n" + accuracy, true, true, true,
-         0.25f},
-        {"2, lower case", "1, Release 2", overrides + "Sky Casts Shadows: yes\n" + accuracy, true, true, false,
-         0.25f},
-        {"3", "1, Release 3", overrides + flags + accuracy, true, false, false, 0.25f},
-        {"later", "9, Release 12", overrides + flags + accuracy + "More: 1\n", true, false, false, 0.25f},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.name);
-        ASSERT_TRUE(load("Marovendel Natural Light Version " + c.header + "\n" + common + c.trailer, Form::text));
-        const Settings s = settings();
-        EXPECT_EQ(s.overrideSolarPosition, c.isOverridden);
-        EXPECT_EQ(s.solarAzimuth, c.isOverridden ? 1 : 0);
-        EXPECT_EQ(s.sunCastsShadows, c.sunCastsShadows);
-        EXPECT_EQ(s.sunFlag3, c.sunCastsShadows);
-        EXPECT_EQ(s.skyCastsShadows, c.skyCastsShadows);
-        EXPECT_EQ(s.skyShadowAccuracy, c.accuracy);
-    }
-    const std::string release2 = "Marovendel Natural Light Version 1, Release 2\n" + common + overrides;
-    EXPECT_EQ(refusal(release2 + accuracy, Form::text).substr(0, 11), "12896 12921");
-    EXPECT_EQ(refusal(release2 + "Sky Casts Shadows: no\n", Form::text).substr(0, 11), "12896 12924");
-}
-
-TEST_F(LightForms, TextIsReadInThreeCharacterWords) {
+TEST_F(LightForms, TextIsReadInThreeCharacterWordsAndBits) {
     const std::string text = Text::whole();
     const auto replaced = [&](const char* from, const char* to) {
         std::string other = text;
         return other.replace(other.find(from), std::strlen(from), to);
     };
     EXPECT_TRUE(load(replaced("is: On\n", "is: One\n"), Form::text));
+    EXPECT_TRUE(load(replaced("0x100\nSky Flags: 0x200", "0x600\nSky Flags: 0xFFFF"), Form::text));
+    EXPECT_FALSE(light->getSunCastsShadows() || light->getSunFlag3() || light->getSkyCastsShadows());
     EXPECT_EQ(refusal(replaced("is: On\n", "is: Onward\n"), Form::text), "12896 12901 3");
     EXPECT_EQ(refusal(replaced("is: On\n", "is: on\n"), Form::text).substr(0, 11), "12896 12900");
     EXPECT_EQ(refusal(replaced("172", "40000"), Form::text).substr(0, 11), "12896 12906");
@@ -240,45 +203,59 @@ TEST_F(LightForms, BinaryIsLittleEndianAtFixedPlaces) {
         EXPECT_EQ(std::string_view(bytes).substr(c.offset, c.bytes.size()), c.bytes) << c.offset;
 }
 
-TEST_F(LightForms, BinaryOfOtherReleases) {
-    light->setOverrideSolarPosition(true);
-    light->setSolarPosition(0.5f, 1);
-    light->setSkyShadowAccuracy(0.25f);
-    light->setSunCastsShadows(false);
-    light->setSkyFlag3(true);
-    const Settings all = settings();
-    const std::string bytes = save(Form::binary);
-    const auto form = [&](char version, char release, const std::string& trailer) {
-        return std::string{version, 0, release, 0} + bytes.substr(4, 88) + trailer;
+TEST_F(LightForms, FormsOfOtherReleases) {
+    Settings overridden;
+    overridden.overrideSolarPosition = true;
+    overridden.solarAltitude = 0.5f;
+    overridden.solarAzimuth = 1;
+    Settings accurate = overridden;
+    accurate.skyShadowAccuracy = 0.25f;
+    Settings skyCasts = accurate, all = accurate;
+    skyCasts.skyCastsShadows = true;
+    all.sunCastsShadows = false;
+    all.skyFlag3 = true;
+    light->setSettings(all);
+    const std::string bytes = save(Form::binary), text = save(Form::text);
+    const auto textFrom = [&](const char* from, const char* to) {
+        return text.substr(text.find(from), text.find(to) - text.find(from));
     };
-    const std::string overrides = bytes.substr(92, 16);
-    const std::string accuracy = bytes.substr(108, 4);
-    Settings expected;
-    const auto check = [&](const std::string& input) {
+    const std::string common = textFrom("Natural light is", "Overwrite Solar Position");
+    const std::string overrides = textFrom("Overwrite Solar Position", "Sun Flags");
+    const std::string accuracy = "Sky Shadows Accuracy: 0.25\n";
+    const std::string binaryOverrides = bytes.substr(92, 16), binaryAccuracy = bytes.substr(108, 4);
+    const struct {
+        std::string header, text;
+        char release;
+        std::string bytes;
+        Settings expected;
+    } cases[] = {
+        {"1, Release 0", "", 0, "", {}},
+        {"1, Release -2", overrides, 0, "", {}},
+        {"1, Release 1", overrides, 1, binaryOverrides, overridden},
+        {"1, Release 2", overrides + "Sky Casts Shadows: yes\n" + accuracy, 2,
+         binaryOverrides + std::string("\0\0", 2) + binaryAccuracy, accurate},
+        {"1, Release 2", overrides + "Sky Casts Shadows: Yes\n" + accuracy, 2,
+         binaryOverrides + std::string("\0\1", 2) + binaryAccuracy, skyCasts},
+        {"9, Release 12", text.substr(text.find("Overwrite")) + "More: 1\n", 12, bytes.substr(92), all},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.header);
         light->setLatitude(3);
-        EXPECT_TRUE(load(input, Form::binary));
-        EXPECT_EQ(settings(), expected);
+        EXPECT_TRUE(load("Marovendel Natural Light Version " + c.header + "\n" + common + c.text, Form::text));
+        EXPECT_EQ(settings(), c.expected);
+        const std::string input = std::string{1, 0, c.release, 0} + bytes.substr(4, 88) + c.bytes;
         for (std::size_t size = 0; size < input.size(); ++size)
             ASSERT_EQ(refusal(input.substr(0, size), Form::binary), "12896 12898 0") << size;
-    };
-    check(form(1, 0, ""));
-    expected.overrideSolarPosition = true;
-    expected.solarAltitude = 0.5f;
-    expected.solarAzimuth = 1;
-    check(form(1, 1, overrides));
-    expected.skyShadowAccuracy = 0.25f;
-    check(form(1, 2, overrides + std::string("\0\0", 2) + accuracy));
-    expected.skyCastsShadows = true;
-    check(form(1, 2, overrides + std::string("\0\1", 2) + accuracy));
-    expected = all;
-    check(bytes);
-    check(form(1, 9, bytes.substr(92)));
-
-    expected = Settings();
+        EXPECT_TRUE(load(input, Form::binary));
+        EXPECT_EQ(settings(), c.expected);
+    }
+    const std::string release2 = "Marovendel Natural Light Version 1, Release 2\n" + common + overrides;
+    EXPECT_EQ(refusal(release2 + accuracy, Form::text).substr(0, 11), "12896 12921");
+    EXPECT_EQ(refusal(release2 + "Sky Casts Shadows: no\n", Form::text).substr(0, 11), "12896 12924");
     for (const char version : {'\0', '\2'}) {
         light->setLatitude(3);
         EXPECT_TRUE(load({version, 0, 3, 0}, Form::binary));
-        EXPECT_EQ(settings(), expected);
+        EXPECT_EQ(settings(), Settings());
     }
 }
 

@@ -86,10 +86,8 @@ TEST_F(Tbt, AcceptsWhatTheGrammarAllows) {
     const std::string expected =
         "Spot\n3\n1.0000 0.5000 0.0000\n1200.00 1000.00 1.200000047683716 1 5 0\n3 5 2\n"
         " 100.00 80.00 50.00 Z0\n 100.00 90.00 0.00 0.00 10.00\n-1\n";
-    std::string crlf;
-    for (const char c : TbtText{}.text()) crlf += c == '\n' ? "\r\n" : std::string(1, c);
     const std::string texts[] = {
-        crlf,
+        withLineEnds(TbtText{}.text(), "\r\n"),
         TbtText{.title = " \n\n/* a\n/ ** */ /**/\tSpot\r"}.text(),
         values("1e2 8E+1 50. z0 100/**/90 .0 0 10.0e"),
         values("1000e-1 80.0000001 50Z0100 90 . 1e-60 10e+"),
