@@ -236,6 +236,7 @@ TEST_F(LightForms, FormsOfOtherReleases) {
          binaryOverrides + std::string("\0\0", 2) + binaryAccuracy, accurate},
         {"1, Release 2", overrides + "Sky Casts Shadows: Yes\n" + accuracy, 2,
          binaryOverrides + std::string("\0\1", 2) + binaryAccuracy, skyCasts},
+        {"1, Release 3", text.substr(text.find("Overwrite")), 3, bytes.substr(92), all},
         {"9, Release 12", text.substr(text.find("Overwrite")) + "More: 1\n", 12, bytes.substr(92), all},
     };
     for (const auto& c : cases) {
