@@ -124,16 +124,15 @@ TEST_F(Cibse, RecordsAndFactsReadBackAsWritten) {
     EXPECT_EQ(rec.grid.candelas, whole.grid.candelas);
     EXPECT_EQ(longestLine(text), 78u);  // a line of angles would have 79
 
-    FileFacts facts;
-    cibseDescribe(rec, facts);
+    FileFacts facts, again;
     CibseRecord carried;
+    cibseDescribe(rec, facts);
     cibseCarry(facts, L"name", carried);
     EXPECT_EQ(carried.labels, (Labels{L"Maker", L"", std::wstring(60, L'x'), L"two  lines", L" z"}));
     EXPECT_EQ(carried.factors[0], 1);
-    FileFacts again2;
     carried.factors[0] = 4;
-    cibseDescribe(carried, again2);
-    EXPECT_TRUE(std::equal(facts.begin(), facts.end(), again2.begin(), again2.end(),
+    cibseDescribe(carried, again);
+    EXPECT_TRUE(std::equal(facts.begin(), facts.end(), again.begin(), again.end(),
                            [](auto& a, auto& b) { return a.key == b.key && a.text == b.text; }));
 }
 

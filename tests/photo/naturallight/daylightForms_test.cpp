@@ -114,21 +114,18 @@ struct Text {
     std::string text;
     int line = 1;  // of what was changed
 
-    /// All lines, `changed` as `change` gives it (empty: left out).
-    template <class Change>
-    static Text with(const Line* changed, Change change) {
+    /// All lines, but one of them changed.
+    static Text with(const Line* changed, const std::string& instead) {
         Text all;
         for (const Line& l : lines) {
             if (l.isAfterBlank) all.text += "\n";
             if (&l == changed) all.line = 1 + static_cast<int>(std::ranges::count(all.text, '\n'));
-            all.text += &l == changed ? change(l) : l.key + l.value + "\n";
+            all.text += &l == changed ? instead : l.key + l.value + "\n";
         }
         all.text += "\n";
         return all;
     }
-    static std::string whole() {
-        return with(nullptr, [](const Line&) { return ""; }).text;
-    }
+    static std::string whole() { return with(nullptr, "").text; }
 };
 
 TEST_F(LightForms, TextIsWrittenToTheByte) {
@@ -146,20 +143,15 @@ TEST_F(LightForms, TextIsWrittenToTheByte) {
 TEST_F(LightForms, EachLineHasItsOwnMessage) {
     for (const Line& line : lines) {
         SCOPED_TRACE(line.key);
-        const auto report = [](unsigned id, int at) {
-            return "12896 " + std::to_string(id) + " " + std::to_string(at);
+        const auto refused = [&](const std::string& text, unsigned id, int at) {
+            EXPECT_EQ(refusal(text, Form::text), "12896 " + std::to_string(id) + " " + std::to_string(at));
         };
+        const Text missing = Text::with(&line, ""), wrong = Text::with(&line, line.key + "Wrong\n");
+        // Without it reading stops where the next line starts, behind blank ones.
         const bool isLast = &line == std::end(lines) - 1;
-        const Text missing = Text::with(&line, [](const Line&) { return ""; });
-        // Reading stops where the next line starts, behind blank ones.
-        const int skipped = isLast || (&line)[1].isAfterBlank ? 1 : 0;
-        EXPECT_EQ(refusal(missing.text, Form::text), report(line.missing, missing.line + skipped));
-        const Text wrong = Text::with(&line, [](const Line& l) { return l.key + "Wrong\n"; });
-        const unsigned expected = line.wrongWord ? line.wrongWord : line.missing;
-        EXPECT_EQ(refusal(wrong.text, Form::text), report(expected, wrong.line));
-        const Text cut = Text::with(&line, [](const Line& l) { return l.key; });
-        const std::string ended = cut.text.substr(0, cut.text.find(line.key) + line.key.size());
-        EXPECT_EQ(refusal(ended, Form::text), report(line.missing, cut.line));
+        refused(missing.text, line.missing, missing.line + (isLast || (&line)[1].isAfterBlank));
+        refused(wrong.text, line.wrongWord ? line.wrongWord : line.missing, wrong.line);
+        refused(wrong.text.substr(0, wrong.text.find("Wrong")), line.missing, wrong.line);
     }
 }
 
