@@ -5,3 +5,17 @@ function(ovphoto_add_test source)
   target_link_libraries(${name} PRIVATE ovphoto_core ovphoto_test_support GTest::gmock GTest::gtest_main)
   gtest_discover_tests(${name} TEST_PREFIX ${name}. DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 300)
 endfunction()
+
+# ovphoto_find_headers(<package> <target> <folder>): a package that is nothing but headers in <folder>. Programs for
+# another system take those of the build machine, and nothing else that lies beside them.
+function(ovphoto_find_headers package target folder)
+  if(NOT CMAKE_CROSSCOMPILING)
+    find_package(${package} REQUIRED)
+    return()
+  endif()
+  find_path(${package}_PARENT ${folder} NO_CMAKE_FIND_ROOT_PATH REQUIRED)
+  file(MAKE_DIRECTORY ${CMAKE_BINARY_DIR}/headers)
+  file(CREATE_LINK ${${package}_PARENT}/${folder} ${CMAKE_BINARY_DIR}/headers/${folder} SYMBOLIC)
+  add_library(${target} INTERFACE IMPORTED)
+  target_include_directories(${target} INTERFACE ${CMAKE_BINARY_DIR}/headers)
+endfunction()

@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "host/platform/path.h"
+#include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
@@ -12,23 +13,21 @@ namespace fs = std::filesystem;
 
 namespace {
 
-std::string toText(const fs::path& path) { return Ov::toUtf8(Ov::widePath(path)); }
-
 void addFolder(const fs::path& folder, std::vector<FoundFile>& files) {
     std::error_code error;
     std::vector<fs::directory_entry> entries;
     for (fs::directory_iterator entry(folder, error), end; !error && entry != end; entry.increment(error)) {
         entries.push_back(*entry);
     }
-    if (error) files.push_back({toText(folder), false, "cannot be listed: " + error.message()});
+    if (error) files.push_back({pathText(folder), false, "cannot be listed: " + error.message()});
     std::sort(entries.begin(), entries.end());
     for (const fs::directory_entry& entry : entries) {
         std::error_code ignored;
         // Links to folders are not followed: they may lead in circles.
-        if (entry.is_directory(ignored) && !entry.is_symlink(ignored)) {
+        if (entry.is_directory(ignored) && !isLink(entry.path())) {
             addFolder(entry.path(), files);
         } else if (!entry.is_directory(ignored)) {
-            files.push_back({toText(entry.path()), true, {}});
+            files.push_back({pathText(entry.path()), true, {}});
         }
     }
 }
@@ -47,6 +46,12 @@ std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths) {
         }
     }
     return files;
+}
+
+std::string pathText(const fs::path& path) {
+    std::string text = Ov::toUtf8(Ov::widePath(path));
+    if (fs::path::preferred_separator != '/') std::replace(text.begin(), text.end(), '\\', '/');
+    return text;
 }
 
 bool hasPhotometricExtension(const std::string& path) { return targetOf(path) != nullptr; }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <filesystem>
 #include <string>
 #include <vector>
 
@@ -15,6 +16,9 @@ struct FoundFile {
 /// The files that the paths name: what is no folder as it is, and everything below the folders, by name. A folder
 /// that cannot be listed stands in the result itself.
 std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths);
+
+/// A path as the tool shows it: with slashes, on every system.
+std::string pathText(const std::filesystem::path& path);
 
 /// Whether the file's extension is that of a photometric format: ies, cib, nmb or tbt.
 bool hasPhotometricExtension(const std::string& path);

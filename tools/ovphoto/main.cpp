@@ -1,4 +1,5 @@
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <iostream>
 #include <utility>
 #include <vector>
@@ -21,7 +22,7 @@ int runCommand(const Action& action, const std::string& module) {
     }
 }
 
-int parseAndRun(CLI::App& app, int argc, char** argv) {
+int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     std::string module;
     app.add_option("--module", module, "Load this module instead of the one beside the tool")->type_name("PATH");
     app.set_version_flag("--version", "ovphoto " OVPHOTO_VERSION, "Print the version and exit");
@@ -35,7 +36,8 @@ int parseAndRun(CLI::App& app, int argc, char** argv) {
         actions.emplace_back(sub, command.declare(*sub));
     }
     try {
-        app.parse(argc, argv);
+        std::reverse(arguments.begin(), arguments.end());  // so they are parsed, from the end
+        app.parse(arguments);
     } catch (const CLI::ParseError& error) {
         return app.exit(error) == 0 ? exitWell : exitUsage;
     }
@@ -60,7 +62,7 @@ int main(int argc, char** argv) {
         "Angles are in degrees: theta from the axis, psi around it; latitudes positive towards north, "
         "longitudes,\n"
         "time zones and azimuths (0 is south) towards west.");
-    const int status = parseAndRun(app, argc, argv);
+    const int status = parseAndRun(app, commandLine(argc, argv));
     if (std::cout.flush()) return status;
     std::cerr << "ovphoto: standard output cannot be written\n";
     return status == exitWell ? exitFailed : status;

@@ -3,6 +3,7 @@
 #include <filesystem>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 // What the tool asks of the operating system; one source file for each.
@@ -10,10 +11,15 @@
 namespace OvTool {
 
 /// Makes sure that the three standard streams can be told from files opened later, even if the caller closed
-/// them, and that writing to a closed pipe is an error like any other instead of the end of the process.
+/// them, that writing to a closed pipe is an error like any other instead of the end of the process, and that
+/// bytes pass as they are.
 void prepareStandardStreams();
 bool standardErrorIsTerminal();
+/// What `main` was given behind the program's name, in UTF-8; wildcards that a shell has left are expanded.
+std::vector<std::string> commandLine(int argc, char** argv);
 std::filesystem::path executableFolder();
+/// Whether a folder is a link to another.
+bool isLink(const std::filesystem::path& folder);
 /// File name of the module, "libOVphoto.so".
 const char* moduleFileName();
 
@@ -24,21 +30,12 @@ struct ProcessResult {
     std::string err;
 };
 
-/// The tool itself, run once for each list of arguments, up to `atOnce` processes at a time.
-class SelfRunner {
-public:
-    SelfRunner(std::vector<std::vector<std::string>> runs, std::size_t atOnce);
-    SelfRunner(const SelfRunner&) = delete;
-    SelfRunner& operator=(const SelfRunner&) = delete;
-    /// Waits for the processes that are under way.
-    ~SelfRunner();
+/// A process that was started.
+struct Process;
 
-    /// The result of the next list of arguments, in their order; there must be one.
-    ProcessResult next();
-
-private:
-    class Processes;
-    std::unique_ptr<Processes> _processes;
-};
+/// Starts the tool itself with these arguments; raises std::system_error.
+std::shared_ptr<Process> startSelf(const std::vector<std::string>& arguments);
+/// Waits until one of several processes has ended; its place among them, and its result.
+std::pair<std::size_t, ProcessResult> waitForOne(const std::vector<std::shared_ptr<Process>>& processes);
 
 }  // namespace OvTool

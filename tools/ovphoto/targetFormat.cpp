@@ -1,6 +1,6 @@
 #include "tools/ovphoto/targetFormat.h"
 
-#include <filesystem>
+#include "host/platform/path.h"
 
 namespace OvTool {
 
@@ -26,7 +26,7 @@ const TargetFormat* targetNamed(const std::string& name) {
 }
 
 const TargetFormat* targetOf(const std::string& path) {
-    std::string extension = std::filesystem::path(path).extension().string();
+    std::string extension = Ov::toUtf8(Ov::widePath(Ov::nativePath(Ov::fromUtf8(path)).extension()));
     for (char& c : extension)
         if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
     for (const TargetFormat& format : formats)

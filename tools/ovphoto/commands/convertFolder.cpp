@@ -12,8 +12,8 @@
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/conversion.h"
 #include "tools/ovphoto/expandPaths.h"
-#include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/progress.h"
+#include "tools/ovphoto/selfRunner.h"
 
 namespace OvTool {
 
@@ -62,8 +62,9 @@ public:
     }
 
     Job plan(const FoundFile& file) {
-        const std::string name = fs::path(file.path).stem().string() + "." + _options.target->extension;
-        const std::string out = (fs::path(_options.folder) / name).string();
+        const fs::path folder = Ov::nativePath(Ov::fromUtf8(_options.folder));
+        const std::wstring stem = Ov::pathStem(Ov::fromUtf8(file.path));
+        const std::string out = pathText(folder / Ov::nativePath(stem)) + "." + _options.target->extension;
         return {{file.path, out, _options.as, _options.target, _options.asSaved},
                 file.error.empty() ? refusal(file.path, out) : file.error};
     }
