@@ -1,5 +1,4 @@
 #include <gmock/gmock.h>
-#include <sys/wait.h>
 
 #include <cstdio>
 #include <filesystem>
@@ -9,6 +8,8 @@
 #include <sstream>
 #include <string>
 #include <vector>
+
+#include "tool/toolRun.h"
 
 // What the documents promise: the README's examples print what stands there, and links lead somewhere.
 
@@ -52,9 +53,8 @@ std::vector<Example> examplesOf(const fs::path& document) {
 /// What a shell in the source folder, where `ovphoto` is the built tool, prints; and the status when that is not
 /// 0.
 std::string runInSources(const std::string& command) {
-    const std::string line = "export LC_ALL=C PATH='" OVPHOTO_BIN_DIR "':\"$PATH\" && cd '" OVPHOTO_SOURCE_DIR
-                             "' && { " +
-                             command + "\n} 2>&1";
+    const std::string line = "export LC_ALL=C PATH='" + toolFolder() +
+                             "':\"$PATH\" && cd '" OVPHOTO_SOURCE_DIR "' && { " + command + "\n} 2>&1";
     FILE* pipe = popen(line.c_str(), "r");
     if (!pipe) return "no shell";
     std::string output;

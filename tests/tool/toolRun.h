@@ -15,6 +15,11 @@
 
 // The built tool as a process, and small IES files for it.
 
+/// The folder of a tool for Windows that is tested instead, or null. What is a matter of POSIX is left out then.
+inline const char* windowsTool() { return std::getenv("OVPHOTO_WINDOWS_TOOL"); }
+
+inline std::string toolFolder() { return windowsTool() ? windowsTool() : OVPHOTO_BIN_DIR; }
+
 inline std::string readBytes(const std::filesystem::path& path) {
     std::ifstream file(path, std::ios::binary);
     return {std::istreambuf_iterator<char>(file), {}};
@@ -34,13 +39,14 @@ struct ToolResult {
 };
 
 /// Runs a shell command in which `ovphoto` is the built tool, in the folder `folder`.
-inline ToolResult runShell(const std::string& command, const TempFolder& folder, const std::string& input = "") {
+inline ToolResult runShell(const std::string& command, const TempFolder& folder, const std::string& input = "",
+                           const std::string& tool = toolFolder()) {
     const TempFolder streams;
     streams.write("in", input);
     const std::string stem = streams.path().string();
-    const std::string line = "cd '" + folder.path().string() +
-                             "' && export LC_ALL=C && ovphoto() { '" OVPHOTO_BIN_DIR "/ovphoto' \"$@\"; } && { " +
-                             command + "\n} <" + stem + "/in >" + stem + "/out 2>" + stem + "/err";
+    const std::string line = "cd '" + folder.path().string() + "' && export LC_ALL=C && ovphoto() { '" + tool +
+                             "/ovphoto' \"$@\"; } && { " + command + "\n} <" + stem + "/in >" + stem + "/out 2>" +
+                             stem + "/err";
     const int status = std::system(line.c_str());
     return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, readBytes(stem + "/out"), readBytes(stem + "/err")};
 }

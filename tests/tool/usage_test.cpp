@@ -58,6 +58,7 @@ TEST_F(ToolUsage, WhatCannotBeReadIsToldByEveryCommand) {
          {"missing.ies: cannot be opened", "folder: is a folder", "/dev/null: is no regular file",
           "empty.ies: not a photometric file of a known format",
           "letter.txt: not a photometric file of a known format", "cut.ies: "}) {
+        if (windowsTool() && text.starts_with("/dev")) continue;
         for (std::string command :
              {"info @", "info --json @", "intensity @ 0,0", "convert --as-saved @ out.ies"}) {
             command.replace(command.find('@'), 1, text, 0, text.find(':'));

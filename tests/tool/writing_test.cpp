@@ -33,6 +33,7 @@ TEST_F(ToolConvert, WhatItWritesReadsBackAndSavesTheSameAgain) {
 }
 
 TEST_F(ToolConvert, KeepsPermissionsAndFollowsLinks) {
+    if (windowsTool()) GTEST_SKIP() << "a matter of POSIX";
     const auto real = folder.path() / "real.ies", link = folder.path() / "link.ies";
     folder.write("real.ies", "old");
     fs::permissions(real, fs::perms::owner_read | fs::perms::owner_write);
