@@ -161,7 +161,9 @@ TEST_F(ToolConversion, NeverWritesOverAFileThatItReads) {
     fs::create_directory(folder.path() / "out");
     fs::create_symlink("../in.ies", folder.path() / "out/in.ies");
     const std::string before = readBytes(folder.path() / "in.ies");
-    for (const std::string into : {".", windowsTool() ? "./" : "out"}) {
+    std::vector<std::string> folders{"."};
+    if (!windowsTool()) folders.push_back("out");  // the link may be none there
+    for (const std::string& into : folders) {
         const ToolResult result = runTool("convert ./in.ies --to ies --into " + into, folder);
         EXPECT_EQ(result.status, 1);
         EXPECT_TRUE(result.says(into + "/in.ies is not written: it is one of the files to read")) << result.err;
