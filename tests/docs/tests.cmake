@@ -1,2 +1,3 @@
 ovphoto_add_test(docs/readme_test)
 add_dependencies(docs_readme_test ovphoto)
+add_dependencies(ovphoto_tool_tests docs_readme_test)

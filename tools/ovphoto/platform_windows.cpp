@@ -93,9 +93,15 @@ struct Process {
 
 void prepareStandardStreams() {
     for (int stream = 0; stream < 3; ++stream) _setmode(stream, _O_BINARY);
+    SetConsoleOutputCP(CP_UTF8);
 }
 
-bool standardErrorIsTerminal() { return _isatty(2) != 0; }
+bool standardErrorIsTerminal() {
+    // One that takes the control sequences that terminals of other systems take.
+    const HANDLE console = GetStdHandle(STD_ERROR_HANDLE);
+    DWORD mode = 0;
+    return GetConsoleMode(console, &mode) && SetConsoleMode(console, mode | ENABLE_VIRTUAL_TERMINAL_PROCESSING);
+}
 
 std::vector<std::string> commandLine(int, char**) {
     int argc = 0;
