@@ -1,8 +1,14 @@
-# ovphoto_add_test(<source without .cpp> [<more sources>]): one test program over the core, below tests/.
-function(ovphoto_add_test source)
+# ovphoto_add_test_program(<source without .cpp> [<more sources>]): a program of tests over the core, below tests/.
+function(ovphoto_add_test_program source)
   string(REPLACE "/" "_" name ${source})
   add_executable(${name} ${source}.cpp ${ARGN})
   target_link_libraries(${name} PRIVATE ovphoto_core ovphoto_test_support GTest::gmock GTest::gtest_main)
+endfunction()
+
+# ovphoto_add_test(<source without .cpp> [<more sources>]): one whose tests ctest runs.
+function(ovphoto_add_test source)
+  ovphoto_add_test_program(${source} ${ARGN})
+  string(REPLACE "/" "_" name ${source})
   gtest_discover_tests(${name} TEST_PREFIX ${name}. DISCOVERY_TIMEOUT 60 PROPERTIES TIMEOUT 300)
 endfunction()
 

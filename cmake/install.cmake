@@ -55,6 +55,16 @@ install(DIRECTORY ${PROJECT_SOURCE_DIR}/host DESTINATION ${CMAKE_INSTALL_INCLUDE
 install(FILES ${PROJECT_SOURCE_DIR}/docs/man/ovphoto.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
 install(FILES ${PROJECT_SOURCE_DIR}/LICENSE DESTINATION ${CMAKE_INSTALL_DOCDIR})
 
+# The notices of what is compiled into the programs, from the packages that it comes in.
+set(contents libcli11-dev nlohmann-json3-dev)
+if(WIN32)
+  list(APPEND contents mingw-w64-x86-64-dev g++-mingw-w64-x86-64-posix)
+endif()
+foreach(package ${contents})
+  install(FILES /usr/share/doc/${package}/copyright DESTINATION ${CMAKE_INSTALL_DOCDIR}/licences RENAME ${package}
+    OPTIONAL)
+endforeach()
+
 # find_package(ovphoto)
 install(EXPORT ovphoto NAMESPACE ovphoto:: FILE ovphotoTargets.cmake DESTINATION ${packageFolder})
 configure_package_config_file(${CMAKE_CURRENT_LIST_DIR}/ovphotoConfig.cmake.in
@@ -65,7 +75,11 @@ write_basic_package_version_file(${PROJECT_BINARY_DIR}/install/ovphotoConfigVers
 install(FILES ${PROJECT_BINARY_DIR}/install/ovphotoConfig.cmake
   ${PROJECT_BINARY_DIR}/install/ovphotoConfigVersion.cmake DESTINATION ${packageFolder})
 
-# pkg-config ovphoto
+# pkg-config ovphoto. The import library's full name is found where programs are linked with -static, too.
+set(hostLibrary OVhost)
+if(WIN32)
+  set(hostLibrary :libOVhost.dll.a)
+endif()
 file(RELATIVE_PATH prefixFromPkgconfig /prefix/${CMAKE_INSTALL_LIBDIR}/pkgconfig /prefix)
 string(REGEX REPLACE "/$" "" prefixFromPkgconfig ${prefixFromPkgconfig})
 configure_file(${CMAKE_CURRENT_LIST_DIR}/ovphoto.pc.in ${PROJECT_BINARY_DIR}/install/ovphoto.pc @ONLY)

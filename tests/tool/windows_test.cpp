@@ -23,9 +23,7 @@ std::map<std::string, std::string> outcome(const std::string& command, const std
 
 class WindowsTool : public testing::Test {
 protected:
-    void SetUp() override {
-        if (!windowsTool()) GTEST_SKIP() << "OVPHOTO_WINDOWS_TOOL names no folder";
-    }
+    void SetUp() override { ASSERT_TRUE(windowsTool()) << "OVPHOTO_WINDOWS_TOOL names no folder"; }
     /// Every text and file at a time, so that a difference is shown where it is.
     static void expectSame(const std::string& command, std::size_t files = 0) {
         const auto ours = outcome(command, OVPHOTO_BIN_DIR);

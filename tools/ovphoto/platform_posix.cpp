@@ -2,6 +2,7 @@
 
 #include <fcntl.h>
 #include <spawn.h>
+#include <sys/auxv.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -16,8 +17,6 @@ extern char** environ;
 namespace OvTool {
 
 namespace {
-
-constexpr const char* self = "/proc/self/exe";
 
 struct CloseFile {
     void operator()(std::FILE* file) const { std::fclose(file); }
@@ -44,6 +43,15 @@ std::string contents(std::FILE* file) {
     return bytes;
 }
 
+/// This program's file. Where /proc is not mounted, the name that it was started by is followed.
+std::filesystem::path executable() {
+    std::error_code error;
+    const auto path = std::filesystem::read_symlink("/proc/self/exe", error);
+    if (!error) return path;
+    const auto* started = reinterpret_cast<const char*>(::getauxval(AT_EXECFN));
+    return started ? std::filesystem::canonical(started, error) : std::filesystem::path();
+}
+
 }  // namespace
 
 struct Process {
@@ -66,10 +74,7 @@ bool standardErrorIsTerminal() { return ::isatty(STDERR_FILENO) != 0; }
 
 std::vector<std::string> commandLine(int argc, char** argv) { return {argv + std::min(argc, 1), argv + argc}; }
 
-std::filesystem::path executableFolder() {
-    std::error_code error;
-    return std::filesystem::read_symlink(self, error).parent_path();
-}
+std::filesystem::path executableFolder() { return executable().parent_path(); }
 
 bool isLink(const std::filesystem::path& folder) {
     std::error_code ignored;
@@ -80,8 +85,7 @@ const char* moduleFileName() { return "libOVphoto.so"; }
 
 std::shared_ptr<Process> startSelf(const std::vector<std::string>& arguments) {
     auto process = std::make_shared<Process>();
-    std::error_code error;
-    std::vector<std::string> texts{std::filesystem::read_symlink(self, error).string()};
+    std::vector<std::string> texts{executable().string()};
     texts.insert(texts.end(), arguments.begin(), arguments.end());
     std::vector<char*> argv;
     for (std::string& text : texts) argv.push_back(text.data());
