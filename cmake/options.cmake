@@ -2,6 +2,7 @@
 
 option(OVPHOTO_TESTS "Build the tests" ON)
 option(OVPHOTO_BENCH "Build the benchmarks" OFF)
+option(OVPHOTO_FUZZ "Build the fuzz targets for libFuzzer, which needs Clang and the sanitizer fuzzer-no-link" OFF)
 set(OVPHOTO_SANITIZE "" CACHE STRING "Sanitizers, such as address,undefined")
 
 if(NOT CMAKE_BUILD_TYPE)
@@ -41,9 +42,11 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_L
 endif()
 if(OVPHOTO_SANITIZE)
   target_compile_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE} -fno-sanitize-recover=all
-                                                 -fno-omit-frame-pointer
-                                                 # Instrumented code makes GCC doubt what std::regex initialises.
-                                                 -Wno-maybe-uninitialized)
+                                                 -fno-omit-frame-pointer)
+  if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    # Instrumented code makes GCC doubt what std::regex initialises.
+    target_compile_options(ovphoto_flags INTERFACE -Wno-maybe-uninitialized)
+  endif()
   target_link_options(ovphoto_flags INTERFACE -fsanitize=${OVPHOTO_SANITIZE})
   target_compile_definitions(ovphoto_flags INTERFACE _GLIBCXX_ASSERTIONS)  # indices of the standard containers
 endif()

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "host/componentManager/stream.h"
 
@@ -37,7 +38,8 @@ float Web::intensityAtUnit(const GeVector3<float>& direction) const {
 }
 
 float Web::localIntensity(float theta, float psi) const {
-    return _maxCandela > 0 ? _multiplier * _web->getIntensity(theta, psi) : 0;
+    if (!(_maxCandela > 0)) return 0;
+    return std::min(_multiplier * _web->getIntensity(theta, psi), std::numeric_limits<float>::max());
 }
 
 float Web::localIntensityAt(const GeVector3<float>& direction) const {

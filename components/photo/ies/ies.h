@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <deque>
 #include <string>
 #include <vector>
 
@@ -41,9 +42,12 @@ struct IesTilt {
 
 enum class IesPhotometricType : std::int32_t { C = 1, B = 2, A = 3 };
 
+/// A deque, because it grows without a copy: a file may hold nothing but line ends, and each is a line.
+using IesLines = std::deque<std::wstring>;
+
 /// A file as it was read, or as it is to be written.
 struct IesFileRecord {
-    std::vector<std::wstring> lines;  // every line before the TILT= line
+    IesLines lines;  // every line before the TILT= line
     std::int32_t lampCount = 1;
     float lumensPerLamp = -1;  // -1: absolute photometry
     float candelaMultiplier = 1;

@@ -45,7 +45,7 @@ std::size_t keywordLength(std::wstring_view line) {
 }
 
 /// The line of index `next`, and what follows of a longer line that the reader has cut.
-std::wstring wholeLine(const std::vector<std::wstring>& lines, std::size_t& next) {
+std::wstring wholeLine(const IesLines& lines, std::size_t& next) {
     std::wstring line = lines[next];
     while (lines[next++].size() == lineLimit && next < lines.size() && !lines[next].starts_with(L'['))
         line += lines[next];
@@ -63,14 +63,14 @@ void describeLine(const std::wstring& line, bool first, FileFacts& facts) {
 }
 
 /// Adds a line; what goes beyond the limit follows as lines that continue it.
-void addLine(std::vector<std::wstring>& lines, std::wstring_view line) {
+void addLine(IesLines& lines, std::wstring_view line) {
     static constexpr std::wstring_view more = L"[MORE] ";
     lines.emplace_back(line.substr(0, lineLimit));
     for (std::size_t next = lineLimit; next < line.size(); next += lineLimit - more.size())
         lines.push_back(std::wstring(more).append(line.substr(next, lineLimit - more.size())));
 }
 
-bool hasKeyword(const std::vector<std::wstring>& lines, std::wstring_view start) {
+bool hasKeyword(const IesLines& lines, std::wstring_view start) {
     return std::any_of(lines.begin(), lines.end(), [&](const auto& line) { return line.starts_with(start); });
 }
 
@@ -97,7 +97,7 @@ void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
 }
 
 void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& rec) {
-    const std::vector<std::wstring> unknown(rec.lines.begin() + 1, rec.lines.end());
+    const IesLines unknown(rec.lines.begin() + 1, rec.lines.end());
     rec.lines.resize(1);
     for (const std::wstring& line : facts.textLines())
         addLine(rec.lines, keywordLength(line) > 0 ? line : L"[OTHER] " + line);

@@ -116,7 +116,7 @@ public:
     GeVector3<float>& toWebFrameUnit(GeVector3<float>& out, const GeVector3<float>& direction) const override;
     bool isPsiTruncated() const override { return _psiTruncated; }
     AngleRange getThetaRange() const override {
-        return _nthetas > 0 ? AngleRange{_thetas[0], _thetas[_nthetas - 1]} : AngleRange{};
+        return _nthetas > 0 ? AngleRange{_thetas[0], _thetas.get()[_nthetas - 1]} : AngleRange{};
     }
     AngleRange getPsiRange() const override {
         return _npsis > 0 ? AngleRange{_psis[0], _psis[_npsis - 1]} : AngleRange{};
@@ -124,7 +124,7 @@ public:
     int findTheta(float angle) const override { return lastAtMost(_thetas.get(), _nthetas, angle); }
     int findPsi(float angle) const override { return lastAtMost(_psis, _npsis, angle); }
     int getThetaCount() const override { return _nthetas; }
-    float getTheta(int index) const override { return _nthetas > 0 ? _thetas[clampTheta(index)] : 0; }
+    float getTheta(int index) const override { return _nthetas > 0 ? _thetas.get()[clampTheta(index)] : 0; }
     int getPsiCount() const override { return _npsis; }
     float getPsi(int index) const override {
         return _npsis > 0 ? _psis[photoWebFoldPsiIndex(index, _npsis, _symmetry)] : 0;

@@ -1,5 +1,8 @@
 #pragma once
 
+#include <algorithm>
+#include <limits>
+
 #include "components/photo/lid/photoWeb.h"
 
 // Intensities between the samples of a web: Catmull-Rom interpolation in both directions.
@@ -36,6 +39,9 @@ inline float foldPsi(float psi, PhotoWebSymmetry symmetry) {
     return psi;
 }
 
+/// What an interpolation gives as light: 0 where it swings below, the largest number where that is exceeded.
+inline float asLight(float value) { return value > 0 ? std::min(value, std::numeric_limits<float>::max()) : 0; }
+
 }  // namespace detail
 
 /// Relative intensity of `web` towards (theta, psi). The web is asked through its own operations only, so that a
@@ -61,8 +67,7 @@ float evaluateWeb(const Web& web, float theta, float psi) {
     const PhotoWebSymmetry symmetry = web.getSymmetry();
     if (symmetry == PhotoWebSymmetry::Axial) {
         web.getCandelaBlock({0, 0}, columns, block);
-        const float value = catmullRom(block, u);
-        return value > 0 ? value : 0;
+        return detail::asLight(catmullRom(block, u));
     }
 
     psi = detail::foldPsi(psi, symmetry);
@@ -88,8 +93,7 @@ float evaluateWeb(const Web& web, float theta, float psi) {
     web.getCandelaBlock({j - 1, j + 2}, columns, block);
     const float rows[4] = {catmullRom(block, u), catmullRom(block + 4, u), catmullRom(block + 8, u),
                            catmullRom(block + 12, u)};
-    const float value = catmullRom(rows, v);
-    return value > 0 ? value : 0;
+    return detail::asLight(catmullRom(rows, v));
 }
 
 }  // namespace OvPhotometrics

@@ -1,5 +1,6 @@
 #include "components/photo/naturallight/daylightForms.h"
 
+#include <cmath>
 #include <cwchar>
 
 #include "components/messageFile/messageIds.h"
@@ -58,16 +59,12 @@ public:
 
     bool number(unsigned message, const wchar_t* format, float& value) {
         double read = 0;
-        if (!fields(1, message, format, &read)) return false;
-        value = static_cast<float>(read);
-        return true;
+        return fields(1, message, format, &read) && hold(static_cast<float>(read), message, value);
     }
 
     bool degrees(unsigned message, const wchar_t* format, float& radians) {
         double read = 0;
-        if (!fields(1, message, format, &read)) return false;
-        radians = toRadians(read);
-        return true;
+        return fields(1, message, format, &read) && hold(toRadians(read), message, radians);
     }
 
     bool color(unsigned message, const wchar_t* format, std::array<float, 3>& c) {
@@ -101,6 +98,11 @@ public:
 private:
     static bool startsWith(const wchar_t* word, const wchar_t* start) {
         return std::wcsncmp(word, start, std::wcslen(start)) == 0;
+    }
+    /// Takes a number over; one that is too large for a setting is none.
+    bool hold(float number, unsigned message, float& setting) {
+        setting = number;
+        return std::isfinite(number) || fail(message);
     }
     bool fail(unsigned message) {
         reportFormError(message, _in.computeLineNb());

@@ -125,7 +125,8 @@ bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecor
     rec.symmetryCode = codeOf(plan.symmetry);
     rec.verticalCount = plan.thetaCount();
     rec.horizontalCount = plan.psiCount();
-    sample(rec, dist.getFlux(), [&](int v, int h) { return view.intensity(v * plan.thetaStep, plan.psi(h)); });
+    const float flux = std::max(0.0f, dist.getFlux());  // the format has no signs, be it that of a zero
+    sample(rec, flux, [&](int v, int h) { return view.intensity(v * plan.thetaStep, plan.psi(h)); });
     return true;
 }
 

@@ -92,8 +92,8 @@ TEST_F(IesRead, AcceptsWhatMakersWrite) {
 
 TEST_F(IesRead, HeaderLinesAreKeptInPieces) {
     ASSERT_TRUE(read(IesText{.header = "IESNA91\n\n" + std::string(200, 'x') + "\n"}.text()));
-    const std::vector<std::wstring> expected = {L"IESNA91", L"", std::wstring(80, L'x'), std::wstring(80, L'x'),
-                                                std::wstring(40, L'x')};
+    const IesLines expected = {L"IESNA91", L"", std::wstring(80, L'x'), std::wstring(80, L'x'),
+                               std::wstring(40, L'x')};
     EXPECT_EQ(rec.lines, expected);
 }
 

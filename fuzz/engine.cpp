@@ -1,0 +1,10 @@
+#include "fuzz/fuzz.h"
+
+namespace OvPhotometrics::fuzz {
+
+bool isDue(std::string_view input, std::size_t part) { return std::hash<std::string_view>()(input) % 32 == part; }
+
+/// libFuzzer bounds memory and time itself.
+void measured(std::size_t, const std::function<void()>& work) { work(); }
+
+}  // namespace OvPhotometrics::fuzz

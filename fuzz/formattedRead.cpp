@@ -1,0 +1,54 @@
+#include <algorithm>
+#include <array>
+#include <string>
+#include <vector>
+
+#include "fuzz/fuzz.h"
+#include "host/componentManager/stream.h"
+#include "host/platform/path.h"
+#include "tests/host/testObjects.h"
+
+// A format, a line feed, and the input that it reads: from memory, and from a device that shows a byte at a time.
+
+namespace OvPhotometrics::fuzz {
+
+namespace {
+
+constexpr std::size_t mostFields = 12;
+
+/// What a format leaves behind: count, targets and the rest of the input.
+struct Outcome {
+    int count;
+    std::array<std::vector<wchar_t>, mostFields> fields;
+    std::string rest;
+
+    Outcome(const Ov::RnRef<Ov::RnBufferedIO>& device, const wchar_t* format, std::size_t size) {
+        fields.fill(std::vector<wchar_t>(size + 2, L'?'));  // a text may be as long as the input
+        auto* const f = fields.data();
+        measured(size, [&] {
+            Ov::RnStream stream(device.get(), Ov::RnStream::Form::text);
+            count = stream.formattedRead(format, f[0].data(), f[1].data(), f[2].data(), f[3].data(), f[4].data(),
+                                         f[5].data(), f[6].data(), f[7].data(), f[8].data(), f[9].data(),
+                                         f[10].data(), f[11].data());
+        });
+        rest = Ov::readRest(*device);
+    }
+    bool operator==(const Outcome&) const = default;
+};
+
+}  // namespace
+
+void tryInput(std::string_view bytes) {
+    const std::size_t end = std::min(bytes.find('\n'), bytes.size());
+    const std::wstring format = Ov::fromUtf8(bytes.substr(0, end));
+    const std::string input(bytes.substr(std::min(end + 1, bytes.size())));
+    const auto fields = std::count(format.begin(), format.end(), L'%');
+    if (fields > static_cast<std::ptrdiff_t>(mostFields)) return;
+    const Outcome whole(Ov::rnCreate<Ov::RnMemoryBuffer>(input), format.c_str(), input.size());
+    demand(whole.count >= -1 && whole.count <= fields, "no more is counted than asked for");
+    demand(input.ends_with(whole.rest), "what is not read stays");
+    const Outcome drip(Ov::rnCreate<Ov::DripDevice>(input), format.c_str(), input.size());
+    demand(whole == drip, "every device reads the same");
+}
+
+}  // namespace OvPhotometrics::fuzz

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <cstddef>
+#include <functional>
+#include <string_view>
+
+// What the fuzz targets share. Each target is one source file with its own `tryInput`; linked with engine.cpp it
+// is driven by libFuzzer, with replay.cpp it is a program that goes through files.
+
+namespace OvPhotometrics::fuzz {
+
+/// Tries one input, in a host that knows the library's builders and English texts.
+void tryInput(std::string_view bytes);
+
+/// Ends the process where a promise is broken.
+void demand(bool kept, const char* promise);
+
+/// The number of messages reported since the last call.
+int takeMessages();
+
+/// Whether the slow part `part` is tried with this input: by the engine with one input in 32, by the replay with
+/// all.
+bool isDue(std::string_view input, std::size_t part);
+
+/// Does `work`, which reads `size` bytes. The replay holds it to the bounds of memory and time.
+void measured(std::size_t size, const std::function<void()>& work);
+
+}  // namespace OvPhotometrics::fuzz

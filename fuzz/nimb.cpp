@@ -1,0 +1,3 @@
+#include "fuzz/web.h"
+
+void OvPhotometrics::fuzz::tryInput(std::string_view bytes) { tryFile<NimbFormat>(bytes); }

@@ -1,0 +1,144 @@
+#pragma once
+
+#include <algorithm>
+#include <cmath>
+#include <iterator>
+#include <limits>
+#include <string>
+#include <vector>
+
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/ies/photoWebIES.h"
+#include "components/photo/lid/component.h"
+#include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
+#include "fuzz/fuzz.h"
+
+// What is demanded of the builder of a file format: any bytes are refused with a message, or give, without one, a
+// web that is whole, gives light everywhere, is written in every format, and reads back.
+
+namespace OvPhotometrics::fuzz {
+
+inline bool isWhole(const std::vector<float>& angles) {
+    return std::is_sorted(angles.begin(), angles.end()) &&
+           std::all_of(angles.begin(), angles.end(), [](float angle) { return std::isfinite(angle); });
+}
+
+/// The angles of a web, one axis.
+template <class At>
+std::vector<float> angles(int count, At at) {
+    std::vector<float> all;
+    for (int k = 0; k < count; ++k) all.push_back(at(k));
+    return all;
+}
+
+inline void demandInstalled(const Ov::RnPhotoWebData& web) {
+    const auto thetas = angles(web.getThetaCount(), [&](int i) { return web.getTheta(i); });
+    const auto psis = angles(web.getPsiCount(), [&](int j) { return web.getPsi(j); });
+    demand(thetas.size() >= 2 && isWhole(thetas), "vertical angles ascend");
+    demand(!psis.empty() && isWhole(psis) && compareAngles(psis.front(), 0) == 0,
+           "horizontal angles ascend from 0");
+    const auto symmetry = web.getSymmetry();
+    const float circle = symmetry == PhotoWebSymmetry::Full   ? twoPi
+                         : symmetry == PhotoWebSymmetry::Half ? pi
+                                                              : halfPi;
+    demand(symmetry == PhotoWebSymmetry::Axial
+               ? psis.size() == 1
+               : psis.size() >= 2 && compareAngles(psis.back(), 0) > 0 && compareAngles(psis.back(), circle) <= 0,
+           "horizontal angles fit the symmetry");
+
+    const float peak = web.getMaxCandela();
+    demand(std::isfinite(peak) && peak >= 0 && std::isfinite(web.getLumens()), "peak and flux are finite");
+    float largest = -std::numeric_limits<float>::infinity();
+    for (int j = 0; j < web.getPsiCount(); ++j)
+        for (int i = 0; i < web.getThetaCount(); ++i) {
+            demand(std::isfinite(web.getCandela(j, i)), "values are finite");
+            largest = std::max(largest, web.getCandela(j, i));
+        }
+    demand(peak > 0 ? largest == 1 : largest <= 0 && web.getLumens() == 0, "values are relative to the peak");
+
+    const auto m = web.getOrientation();
+    const auto turnedBack = m * (m.computeTranspose() * GeVector3<float>{0.48f, 0.6f, 0.64f});
+    demand(
+        std::fabs(turnedBack.x - 0.48f) + std::fabs(turnedBack.y - 0.6f) + std::fabs(turnedBack.z - 0.64f) < 1e-5f,
+        "the orientation is a turn");
+    demand(!web.hasIdentityOrientation() || m.values() == GeLinearMatrix3<float>().values(), "no turn is none");
+    demand(web.isLoaded(), "it is loaded");
+}
+
+/// Some angles of every kind, and each web's own with their neighbours.
+inline std::vector<float> probes(AngleRange range) {
+    constexpr float infinity = std::numeric_limits<float>::infinity();
+    std::vector<float> all{0.0f, -0.0f, 1e-45f, 1e-6f, 0.3f,  1.1f,     halfPi,    2.5f,         pi,
+                           4.0f, twoPi, -1.0f,  -7.0f, 1e30f, infinity, -infinity, std::nanf("")};
+    for (const float angle : {range.first, range.last, (range.first + range.last) / 2, halfPi, pi, twoPi})
+        for (const float towards : {-infinity, angle, infinity}) all.push_back(std::nextafter(angle, towards));
+    return all;
+}
+
+inline void demandLight(const Ov::RnPhotoWebData& web, const Ov::RnIntensityDist& light) {
+    const auto isLight = [](float value) { return std::isfinite(value) && value >= 0; };
+    for (const float theta : probes(web.getThetaRange()))
+        for (const float psi : probes(web.getPsiRange())) {
+            demand(isLight(web.getIntensity(theta, psi)), "the web's light is finite");
+            demand(isLight(light.localIntensity(theta, psi)), "light is finite");
+            demand(isLight(light.intensity(theta, psi)), "light is finite in the host's frame");
+            demand(isLight(light.intensityAt({theta, psi, 1 - theta})), "light is finite in any direction");
+        }
+}
+
+/// The web that a format's builder imports, checked; null when it is refused.
+template <class Format>
+RnRef<Ov::RnPhotoWebData> imported(Ov::RnBufferedIO& io, std::size_t size) {
+    RnRef<Ov::RnCastable> object;
+    measured(size, [&] {
+        try {
+            object = immortal<PhotoWebBuilder<Format>>().import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"web", nullptr);
+        } catch (const Ov::RnStreamEx::ExReadError&) {
+        }
+    });
+    demand((takeMessages() == 0) == !!object, "what is refused has a message, and nothing else has");
+    if (!object) return {};
+    auto web = Ov::rnCast<Ov::RnPhotoWebData>(object.get());
+    demandInstalled(*web);
+    demandLight(*web, *makeWebDistribution(*web));
+    return web;
+}
+
+/// Writes a web as a file for other programs, with the facts of the file that it came from, and reads that.
+template <class Format>
+void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+    Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+    auto& builder = immortal<PhotoWebBuilder<Format>>();
+    const bool written = builder.write(*makeWebDistribution(web), stream, FileForm::faithful, facts);
+    demand((takeMessages() == 0) == written, "what is not written has a message, and nothing else has");
+    const auto ordinary = [](float value) {
+        return value == 0 || (std::fabs(value) > 1e-20f && std::fabs(value) < 1e20f);
+    };
+    demand(written || !ordinary(web.getMaxCandela()) || !ordinary(web.getLumens()), "what is read is written");
+    if (!written) return;
+    io->seek(0, 0);
+    demand(builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get())), "what is written is recognised");
+    demand(!!imported<Format>(*io, io->bytes().size()), "what is written is read");
+}
+
+/// Tries bytes as a file of a format.
+template <class Format>
+void tryFile(std::string_view bytes) {
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(bytes);
+    auto& builder = immortal<PhotoWebBuilder<Format>>();
+    builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get()));
+    demand(io->seek(0, 1) == 0 && takeMessages() == 0, "the content test leaves no trace");
+    const auto web = imported<Format>(*io, bytes.size());
+    if (!web) return;
+    FileFacts facts;
+    io->seek(0, 0);
+    demand(builder.readFacts(*io, nullptr, facts), "what is read has facts");
+    if (isDue(bytes, 0)) demandWritten<IesFormat>(*web, facts);
+    if (isDue(bytes, 1)) demandWritten<CibseFormat>(*web, facts);
+    if (isDue(bytes, 2)) demandWritten<NimbFormat>(*web, facts);
+    if (isDue(bytes, 3)) demandWritten<TbtFormat>(*web, facts);
+}
+
+}  // namespace OvPhotometrics::fuzz
