@@ -1,6 +1,7 @@
 #include "host/componentManager/stream.h"
 
 #include <limits>
+#include <new>
 #include <utility>
 
 #include "host/componentManager/componentManager.h"
@@ -127,8 +128,10 @@ RnRef<RnCastable> RnStream::readObject(const RnUid* iid, const wchar_t* name, co
     if (id == RnUid{}) return {};
     int version = 0;
     *this >> version;
-    const auto object = rnCast<RnComponentManager>(RnGetComponentManager())->createObject(id);
-    if (!object) throw RnStreamEx::ExReadError(source, __LINE__, "object stream");
+    const auto builder = rnCast<RnComponentManager>(RnGetComponentManager())->findBuilder(id);
+    if (!builder) throw RnStreamEx::ExReadError(source, __LINE__, "object stream");
+    const auto object = builder->create();
+    if (!object) throw std::bad_alloc();
     const auto adapter = rnCast<RnPersistant>(object.get());
     if (version > adapter->getVersion()) throw RnStreamEx::ExReadError(source, __LINE__, "object stream");
     const bool loaded =

@@ -2,7 +2,6 @@
 
 #include <functional>
 #include <memory>
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -10,6 +9,7 @@
 #include "host/componentManager/devices.h"
 #include "host/componentManager/stream.h"
 #include "host/platform/path.h"
+#include "support/dripDevice.h"
 
 // Made-up objects, builders and a device for the tests of the host, and how their tables are written.
 
@@ -162,22 +162,5 @@ inline RnRef<Note> note(const wchar_t* text, int number = 0, RnRef<RnCastable> c
     result->content = std::move(content);
     return result;
 }
-
-/// Memory that shows its bytes one at a time, so that no token lies wholly in its window.
-class DripDevice : public RnMemoryBuffer {
-public:
-    explicit DripDevice(const std::string& bytes) : _input(bytes) {}
-
-protected:
-    bool readMore() override {
-        char byte;
-        if (!_input.get(byte)) return false;
-        append(&byte, 1);
-        return true;
-    }
-
-private:
-    std::istringstream _input;
-};
 
 }  // namespace Ov

@@ -106,8 +106,8 @@ TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
     std::ostringstream full;
     full.setstate(std::ios::badbit);
     RnStream out(rnCreate<RnOutBuffer>(&full).get(), RnStream::Form::text);
-    for (const auto write :
-         {module.functions().writeIes, module.functions().writeCibse, module.functions().writeTbt})
+    const auto functions = module.functions();
+    for (const auto write : {functions.writeIes, functions.writeCibse, functions.writeNimb, functions.writeTbt})
         raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>(
             [&] { write(*source, out, OvPhotometrics::FileForm::faithful, nullptr, 0); });
     const auto object = importer->import(folder.write("good.ies", goodFile).c_str(), nullptr);

@@ -20,6 +20,9 @@ std::vector<std::filesystem::path> irregularFiles(const std::filesystem::path& f
 /// Whether the C library's printf keeps every rule of its standard, and can judge others.
 extern const bool printfIsExact;
 
+/// Whether the operators new and delete of a program are those of its libraries, too.
+extern const bool heapIsShared;
+
 /// Compiles messages ("5 text", one a line, the text as it is) to a catalogue that replaces the file.
 void compileCatalogue(const std::filesystem::path& file, const std::string& messages);
 

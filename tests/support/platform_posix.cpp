@@ -18,6 +18,7 @@ fs::path makeTemporaryFolder() {
 }
 
 const bool printfIsExact = true;
+const bool heapIsShared = true;
 
 void setVariable(const char* name, const char* value) { setenv(name, value, 1); }
 

@@ -55,6 +55,7 @@ fs::path makeTemporaryFolder() {
     }
 }
 
+const bool heapIsShared = false;
 const bool printfIsExact = false;  // MinGW: "% u" of 1, "%#.o" of 0, "%025.28G" of 1e21
 
 void setVariable(const char* name, const char* value) { _putenv_s(name, value); }

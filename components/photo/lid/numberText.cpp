@@ -1,6 +1,7 @@
 #include "components/photo/lid/numberText.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/lid/reportMessage.h"
@@ -115,6 +116,14 @@ bool NumberText::readFloats(std::size_t count, std::vector<float>& values) {
     values.reserve(std::min(count, static_cast<std::size_t>(device.limit() - device.next()) / 2 + 1));
     for (std::size_t i = 0; i < count && !_ended; ++i) readFloat(values.emplace_back());
     return !_failed;
+}
+
+void writeText(std::string_view bytes, Ov::RnStream& out) {
+    const int count = std::in_range<int>(bytes.size()) ? static_cast<int>(bytes.size()) : -1;
+    if (count < 0 || out.device().writeBytes(bytes.data(), count) != count)
+        throw Ov::RnStreamEx::ExWriteError("components/photo/lid/numberText", __LINE__, "file");
+    out.column = 0;
+    out.pendingSeparator = false;
 }
 
 void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit) {

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <limits>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "host/componentManager/stream.h"
@@ -64,6 +65,10 @@ void writeLine(Ov::RnStream& out, const wchar_t* format, Args... args) {
     out.formattedWrite(format, args...);
     out.endLine();
 }
+
+/// Writes a text that ends its last line, all of it at once. Raises RnStreamEx::ExWriteError where the device does
+/// not take it.
+void writeText(std::string_view bytes, Ov::RnStream& out);
 
 /// Writes values with two decimals, each behind a blank, as lines of less than `limit` characters.
 void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit);

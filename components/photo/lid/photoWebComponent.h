@@ -134,25 +134,33 @@ public:
     }
 
     bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) override {
+        const bool isFaithful = form == FileForm::faithful;
         Record record;
-        if (form == FileForm::asSaved) return Format::fromDistribution(dist, record) && Format::write(record, out);
-        if (!Format::fromDistributionFaithfully(dist, record)) return false;
-        const auto web = webOf(dist);
-        Format::carry(facts, web ? web->getName() : L"", record);
-        return canBeReadBack(record) && Format::write(record, out);
+        if (isFaithful ? !takeFaithfully(dist, facts, record) : !Format::fromDistribution(dist, record))
+            return false;
+        const auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
+        if (!Format::write(record, stream)) return false;
+        text->seek(0, 0);
+        if (isFaithful && !isReadBack(stream)) return false;
+        writeText(text->bytes(), out);
+        return true;
     }
 
 private:
     using Record = typename Format::Record;
 
-    static bool canBeReadBack(const Record& record) {
-        const auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
-        if (!Format::write(record, stream)) return false;
-        text->seek(0, 0);
+    static bool takeFaithfully(Ov::RnIntensityDist& dist, const FileFacts& facts, Record& record) {
+        if (!Format::fromDistributionFaithfully(dist, record)) return false;
+        const auto web = webOf(dist);
+        Format::carry(facts, web ? web->getName() : L"", record);
+        return true;
+    }
+
+    static bool isReadBack(Ov::RnStream& text) {
         Record again;
         const auto web = Ov::rnCreate<typename Format::Web>();
-        return readRecord<Format>(again, stream, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
+        return readRecord<Format>(again, text, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
     }
 };
 

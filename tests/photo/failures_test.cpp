@@ -1,0 +1,249 @@
+#include <cstdlib>
+#include <functional>
+#include <new>
+
+#include "components/messageFile/messageIds.h"
+#include "components/module/fileExports.h"
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/distributions/diffuse.h"
+#include "components/photo/distributions/isotropic.h"
+#include "components/photo/distributions/spotlight.h"
+#include "components/photo/lid/importer.h"
+#include "components/photo/lid/reportMessage.h"
+#include "components/photo/naturallight/daylightData.h"
+#include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
+#include "tests/photo/photoFixture.h"
+#include "tests/support/dripDevice.h"
+
+// What a host asks of every class, while an allocation, all memory or a device fails, at every place in turn.
+
+namespace {
+
+enum class Fault { oneAllocation, allMemory, device };
+
+/// Fails at one place: `left` is how many others are passed before it, negative when there is none.
+struct Trap {
+    Fault fault = Fault::device;
+    long left = -1;
+    bool sprung = false;
+
+    bool springs(Fault here) {
+        if (left < 0 || here != fault || left-- > 0) return false;
+        if (fault != Fault::oneAllocation) left = 0;  // and for good
+        return sprung = true;
+    }
+} trap;
+
+long blocks = 0;  // that are allocated
+
+void* allocate(std::size_t size) {
+    if (trap.springs(Fault::oneAllocation) || trap.springs(Fault::allMemory)) throw std::bad_alloc();
+    void* const block = std::malloc(size > 0 ? size : 1);
+    if (!block) throw std::bad_alloc();
+    ++blocks;
+    return block;
+}
+
+void release(void* block) {
+    if (block) --blocks;
+    std::free(block);
+}
+
+}  // namespace
+
+void* operator new(std::size_t size) { return allocate(size); }
+void* operator new[](std::size_t size) { return allocate(size); }
+void operator delete(void* block) noexcept { release(block); }
+void operator delete[](void* block) noexcept { release(block); }
+void operator delete(void* block, std::size_t) noexcept { release(block); }
+void operator delete[](void* block, std::size_t) noexcept { release(block); }
+
+namespace OvPhotometrics {
+namespace {
+
+struct DeviceFailure {};
+
+/// Memory that is read byte by byte, and may fail at every read and write.
+class FailingDevice : public DripDevice {
+public:
+    explicit FailingDevice(const std::string& bytes = {}) : DripDevice(bytes) {}
+
+protected:
+    bool readMore() override {
+        if (trap.springs(Fault::device)) throw DeviceFailure();
+        return DripDevice::readMore();
+    }
+    char* prepareWrite(std::size_t count) override {
+        if (trap.springs(Fault::device)) throw DeviceFailure();
+        return DripDevice::prepareWrite(count);
+    }
+};
+
+class Failures : public Photo {
+protected:
+    Failures() {
+        // What is kept for the next time is there.
+        Ov::RnPostLoadList().add(*Ov::rnCast<Ov::RnPersistant>(Ov::rnCreate<Isotropic>().get()));
+        reportMessage(messages::outOfMemory);
+        log.take();
+    }
+
+    enum class Outcome { well, refused, noMemory, brokenDevice };
+
+    template <class Work>
+    static Outcome outcomeOf(const Work& work) {
+        try {
+            return work() ? Outcome::well : Outcome::refused;
+        } catch (const Ov::RnStreamEx&) {
+            return Outcome::refused;
+        } catch (const std::bad_alloc&) {
+            return Outcome::noMemory;
+        } catch (const Ov::ExBadCast&) {
+            return Outcome::noMemory;  // there is no distribution to save by
+        } catch (const DeviceFailure&) {
+            return Outcome::brokenDevice;
+        }
+    }
+
+    /// Lets `work` fail at every place in turn, until it goes well. Each time it says so, nothing is left behind,
+    /// and `object` is as it was.
+    template <class Work>
+    void atEveryPlace(const std::string& what, Ov::RnCastable& object, const Work& work) {
+        const std::string original = saved(object, Form::binary);
+        for (const Fault fault : {Fault::oneAllocation, Fault::allMemory, Fault::device}) {
+            load(object, original, Form::binary);
+            const std::string before = saved(object, Form::binary);
+            // Every place of what is small; ever fewer of the thousands of numbers that some formats write.
+            for (long place = 0; !HasFailure(); place += 1 + (place > 200 ? place / 10 : 0)) {
+                SCOPED_TRACE(what + ", fault " + std::to_string(static_cast<int>(fault)) + ", place " +
+                             std::to_string(place));
+                if (!failsAt({fault, place}, work)) break;
+                EXPECT_EQ(saved(object, Form::binary), before);
+            }
+        }
+    }
+
+    /// False when `work` goes well without coming to the place.
+    template <class Work>
+    bool failsAt(Trap place, const Work& work) {
+        const long blocksBefore = blocks;
+        trap = place;
+        const Outcome outcome = outcomeOf(work);
+        const bool sprung = std::exchange(trap, {}).sprung;
+        const bool isTold = !log.take().empty();
+        const long blocksLeft = blocks - blocksBefore;
+        EXPECT_EQ(outcome != Outcome::well, sprung);
+        EXPECT_TRUE(outcome != Outcome::refused || isTold);
+        EXPECT_EQ(outcome == Outcome::brokenDevice, sprung && place.fault == Fault::device);
+        EXPECT_TRUE(!sprung || blocksLeft == 0 || !heapIsShared) << blocksLeft << " blocks are left";
+        return sprung;
+    }
+
+    template <class Interface>
+    static bool clones(Ov::RnCastable& object) {
+        const auto original = Ov::rnQuery<Interface>(&object);
+        return original && original->clone();
+    }
+
+    RnRef<Ov::RnCastable> lamp(auto lamp, int number) {
+        lamp->setFlux(static_cast<float>(number));
+        return lamp;
+    }
+
+    /// A file of the format. Its light and its grid tell it from files of other numbers.
+    template <class Format>
+    std::string file(int number) {
+        const auto source =
+            import(IesText{.lumens = 1000.0 * number, .horizontal = {0, 45.0 * number, 90.0 * number}}.text());
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Form::text);
+        immortal<PhotoWebBuilder<Format>>().write(*makeWebDistribution(*source), stream, FileForm::faithful, {});
+        return io->bytes();
+    }
+};
+
+TEST_F(Failures, OfObjects) {
+    const struct {
+        const char* name;
+        std::function<RnRef<Ov::RnCastable>(int number)> make;
+    } classes[] = {{"IES", [&](int number) { return import <IesFormat>(file<IesFormat>(number)); }},
+                   {"CIBSE", [&](int number) { return import <CibseFormat>(file<CibseFormat>(number)); }},
+                   {"NIMB", [&](int number) { return import <NimbFormat>(file<NimbFormat>(number)); }},
+                   {"TBT", [&](int number) { return import <TbtFormat>(file<TbtFormat>(number)); }},
+                   {"web", [&](int number) { return makeWebDistribution(*import(file<IesFormat>(number))); }},
+                   {"isotropic", [&](int number) { return lamp(Ov::rnCreate<Isotropic>(), number); }},
+                   {"diffuse", [&](int number) { return lamp(Ov::rnCreate<Diffuse>(), number); }},
+                   {"spotlight", [&](int number) { return lamp(Ov::rnCreate<Spotlight>(), number); }},
+                   {"natural light", [&](int number) {
+                        const auto light = Ov::rnCreate<DaylightData>();
+                        light->setDayOfYear(static_cast<std::uint16_t>(number));
+                        return light;
+                    }}};
+    for (const auto& [name, make] : classes) {
+        SCOPED_TRACE(name);
+        const auto object = make(1), other = make(2);
+        auto* const builder = builderTable().find(Ov::rnCast<Ov::RnPersistant>(object.get())->getClassId());
+        atEveryPlace("create", *object, [&] { return builder->create() ? true : throw std::bad_alloc(); });
+        atEveryPlace("clone", *object, [&] {
+            return clones<Ov::RnPhotoWebData>(*object) || clones<Ov::RnIntensityDist>(*object) ||
+                   clones<Ov::RnNaturalLight>(*object);
+        });
+        for (const Form form : {Form::text, Form::binary}) {
+            const std::string bytes = saved(*other, form);
+            const auto whole = Ov::rnCreate<Ov::RnMemoryBuffer>();
+            Ov::RnStream(whole.get(), form) << other.get();
+            atEveryPlace("save", *object, [&] {
+                Ov::RnStream(Ov::rnCreate<FailingDevice>().get(), form) << object.get();
+                return true;
+            });
+            atEveryPlace("read", *object, [&] {
+                Ov::RnPostLoadList list;
+                return !!Ov::RnStream(Ov::rnCreate<FailingDevice>(whole->bytes()).get(), form, &list)
+                             .readObject(nullptr);
+            });
+            const auto target = make(1);
+            atEveryPlace("load", *target, [&] {
+                Ov::RnStream stream(Ov::rnCreate<FailingDevice>(bytes).get(), form);
+                return Ov::rnCast<Ov::RnPersistant>(target.get())
+                    ->load(stream, 0, L"a name too long for its own place", L"");
+            });
+            EXPECT_NE(saved(*target), saved(*object));
+        }
+    }
+}
+
+template <class Format>
+class FailuresOfFiles : public Failures {};
+using Formats = testing::Types<IesFormat, CibseFormat, NimbFormat, TbtFormat>;
+TYPED_TEST_SUITE(FailuresOfFiles, Formats);
+
+TYPED_TEST(FailuresOfFiles, AreToldAndLeaveNothing) {
+    const std::string text = this->template file<TypeParam>(1);
+    const auto web = this->template import <TypeParam>(text);
+    const auto light = makeWebDistribution(*web);
+    auto& importer = immortal<LidImporter>();
+    this->atEveryPlace("import", *web, [&] {
+        return !!importer.import(Ov::rnCreate<FailingDevice>(text).get(), L"a name too long for its own place",
+                                 L"");
+    });
+    this->atEveryPlace("facts", *web, [&] {
+        int count = 0;
+        auto visitor = Ov::rnVisitor<const FileFact&>([&](const FileFact&) { ++count; });
+        const bool well = readFileFacts(*Ov::rnCreate<FailingDevice>(text), nullptr, L"", visitor);
+        EXPECT_EQ(well, count > 0);
+        return well;
+    });
+    const FileFact facts[] = {{L"LUMINAIRE", L"a fact too long for its own place"}, {L"watts", L"12"}};
+    for (const FileForm form : {FileForm::asSaved, FileForm::faithful})
+        this->atEveryPlace("write", *light, [&] {
+            const auto io = Ov::rnCreate<FailingDevice>();
+            Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
+            const bool well = writeFile(TypeParam::Web::classId, *light, stream, form, facts, 2);
+            EXPECT_EQ(well, !io->bytes().empty());
+            return well;
+        });
+}
+
+}  // namespace
+}  // namespace OvPhotometrics
