@@ -59,12 +59,16 @@ public:
 
     bool number(unsigned message, const wchar_t* format, float& value) {
         double read = 0;
-        return fields(1, message, format, &read) && hold(static_cast<float>(read), message, value);
+        if (!fields(1, message, format, &read)) return false;
+        value = static_cast<float>(read);
+        return isWritable(value, message);
     }
 
     bool degrees(unsigned message, const wchar_t* format, float& radians) {
         double read = 0;
-        return fields(1, message, format, &read) && hold(toRadians(read), message, radians);
+        if (!fields(1, message, format, &read)) return false;
+        radians = toRadians(read);
+        return isWritable(static_cast<float>(inDegrees(radians)), message);
     }
 
     bool color(unsigned message, const wchar_t* format, std::array<float, 3>& c) {
@@ -99,11 +103,8 @@ private:
     static bool startsWith(const wchar_t* word, const wchar_t* start) {
         return std::wcsncmp(word, start, std::wcslen(start)) == 0;
     }
-    /// Takes a number over; one that is too large for a setting is none.
-    bool hold(float number, unsigned message, float& setting) {
-        setting = number;
-        return std::isfinite(number) || fail(message);
-    }
+    /// A number that no float holds is none: it could not be written.
+    bool isWritable(float number, unsigned message) { return std::isfinite(number) || fail(message); }
     bool fail(unsigned message) {
         reportFormError(message, _in.computeLineNb());
         return false;
