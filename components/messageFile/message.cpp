@@ -23,13 +23,15 @@ void RnMessageFile::setFileName(const wchar_t* path) {
     _store.reset();
 }
 
+bool RnMessageFile::isThere() {
+    if (!_store && !_fileName.empty()) _store = Store::open(_fileName);
+    return _store != nullptr;
+}
+
 RnMessageFile::Store& RnMessageFile::store() {
-    if (!_store) {
-        if (_fileName.empty()) throw RnMessageFileEx::ExNoFilename();
-        _store = Store::open(_fileName);
-        if (!_store) throw RnMessageFileEx::ExNoCatalogue(_fileName);
-    }
-    return *_store;
+    if (isThere()) return *_store;
+    if (_fileName.empty()) throw RnMessageFileEx::ExNoFilename();
+    throw RnMessageFileEx::ExNoCatalogue(_fileName);
 }
 
 std::wstring RnMessageFile::getText(unsigned id) { return store().text(id); }

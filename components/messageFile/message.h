@@ -34,6 +34,8 @@ public:
     void setFileName(const wchar_t* path);
     const std::wstring& fileName() const { return _fileName; }
 
+    /// Whether the file is open or can be opened, which it then is.
+    bool isThere();
     /// The raw text of a message.
     std::wstring getText(unsigned id);
     /// The text with its arguments put in. They must be what the text's markers say.

@@ -1,5 +1,7 @@
 #include "components/photo/lid/reportMessage.h"
 
+#include <chrono>
+
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
 #include "host/componentManager/processController.h"
@@ -16,22 +18,28 @@ void post(std::wstring text) {
     controller->report(0, lastMessage.c_str());
 }
 
+/// Whether there is a catalogue. One that is missing is looked for again a little later, not for each of the
+/// thousands of faults that a file may have.
+bool hasTexts() {
+    using Clock = std::chrono::steady_clock;
+    static std::wstring missing;
+    static Clock::time_point again;
+    const std::wstring& name = Ov::messageFile().fileName();
+    if (name == missing && Clock::now() < again) return false;
+    if (Ov::messageFile().isThere()) return true;
+    missing = name;
+    again = Clock::now() + std::chrono::milliseconds(10);
+    return false;
+}
+
 /// The formatted text of a message, or its number without a catalogue.
 std::wstring textOf(unsigned id, std::va_list args) {
-    try {
-        return Ov::messageFile().formatV(id, args);
-    } catch (const Ov::RnMessageFileEx&) {
-        return L"Message " + std::to_wstring(id) + L".";
-    }
+    return hasTexts() ? Ov::messageFile().formatV(id, args) : L"Message " + std::to_wstring(id) + L".";
 }
 
 /// Posts a message that holds `detail`, or that alone without a catalogue.
 void postWrapped(const std::wstring& detail, unsigned wrapper, std::va_list args) {
-    try {
-        post(Ov::messageFile().formatV(wrapper, args));
-    } catch (const Ov::RnMessageFileEx&) {
-        post(detail);
-    }
+    post(hasTexts() ? Ov::messageFile().formatV(wrapper, args) : detail);
 }
 
 }  // namespace
