@@ -1,4 +1,5 @@
 #include "components/module/fileExports.h"
+#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/naturallight/calendar.h"
 #include "components/photo/naturallight/clock.h"
 #include "components/photo/naturallight/timeZones.h"

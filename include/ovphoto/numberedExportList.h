@@ -23,6 +23,7 @@
     entry(436, writeCibse) \
     entry(437, writeNimb) \
     entry(438, writeTbt) \
+    entry(439, getIntensities) \
     entry(440, readFileFacts)
 
 // clang-format on

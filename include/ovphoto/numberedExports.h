@@ -8,9 +8,9 @@
 #include "ovphoto/module.h"
 #include "ovphoto/numberedExportList.h"
 
-// Functions that the module exports by number alone: calendar, clock and time zones for a host's dialogs, and
-// files in any of the formats. A host reaches them through Ov::Module::byOrdinal, which asks the system where
-// modules have ordinals, and elsewhere reads the table at the end of this file.
+// Functions that the module exports by number alone: calendar, clock and time zones for a host's dialogs, files in
+// any of the formats, and intensities towards many directions. A host reaches them through Ov::Module::byOrdinal,
+// which asks the system where modules have ordinals, and elsewhere reads the table at the end of this file.
 //
 // Calendar, clock and zones (422 to 434).
 //
@@ -21,7 +21,7 @@
 // Names are in the host's language; their texts are the module's, each valid until its function is called again.
 // The functions that give names take one caller at a time, the others any number.
 //
-// Files (435 to 438 and 440) are described where they stand below.
+// Files (435 to 438 and 440) and intensities (439) are described where they stand below.
 
 namespace OvPhotometrics {
 
@@ -32,8 +32,8 @@ enum class FileForm : std::int32_t {
     asSaved = 0,
     /// A file that is right in other programs: absolute candela (cd per 1000 lm in NIMB and TBT) with six digits
     /// or more where the format has decimals. The grid is the web's own, orientation included, where the format
-    /// can
-    /// hold it and every angle is a multiple of 0.01 degree; else the distribution in the host frame on an even
+    /// can hold it and every angle is a multiple of 0.01 degree; else the distribution in the host frame on an
+    /// even
     /// grid, with steps of the web's smallest, 1 degree at the least, that lose less than 0.1 % of the peak where
     /// they can. What is written has been read back by the format's own reader.
     faithful = 1
@@ -61,6 +61,16 @@ enum class FileForm : std::int32_t {
 struct FileFact {
     const wchar_t* key;   ///< which; as listed above
     const wchar_t* text;  ///< what the file says
+};
+
+/// How directions are given, and in which frame: as the operation of RnIntensityDist named beside takes them.
+enum class DirectionForm : std::int32_t {
+    angles = 0,            ///< `intensity`: theta and psi, radians, host frame
+    vectors = 1,           ///< `intensityAt`: x, y and z of any length but 0, host frame
+    unitVectors = 2,       ///< `intensityAtUnit`: x, y and z of length 1, host frame
+    localAngles = 3,       ///< `localIntensity`: theta and psi, radians, the light's own frame
+    localVectors = 4,      ///< `localIntensityAt`: x, y and z of any length but 0, the light's own frame
+    localUnitVectors = 5,  ///< `localIntensityAtUnit`: x, y and z of length 1, the light's own frame
 };
 
 /// The functions with their types.
@@ -114,6 +124,16 @@ struct NumberedFunctions {
     bool (*writeTbt)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
                      std::int32_t count);
     /// @}
+
+    /// Intensities of any distribution towards `count` directions, for renderers: what its own operation answers
+    /// to each, bit for bit, but faster where the distribution is a web of this module. `directions` holds two
+    /// floats (angles) or three (vectors) for each, one direction after another; `candela` takes `count` floats
+    /// and may not overlap them. Both may be null when `count` is 0. False, and nothing has been written, when
+    /// `light` is null or no distribution, a pointer is null, the count is below 0 or the form is none of those
+    /// above. A zero vector raises the assertion that the single operation raises; what has been written by then
+    /// is not to be used. Any number of threads may ask at once. The wrappers in ovphoto/intensities.h take spans.
+    bool (*getIntensities)(Ov::RnCastable* light, DirectionForm form, const float* directions, std::int64_t count,
+                           float* candela);
 
     /// Reads an input and visits what it says beyond its web, label lines first, each in the order of the file.
     /// The format is that of the web class `format`, or, when that is null, of the first whose content test

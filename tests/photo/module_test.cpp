@@ -10,6 +10,7 @@
 #include "host/platform/module.h"
 #include "host/sdk/util.h"
 #include "ovphoto/classIds.h"
+#include "ovphoto/intensities.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
 #include "tests/support/tempFolder.h"
@@ -108,12 +109,11 @@ TEST_F(ModuleTest, AdaptersShareTheirObject) {
 }
 
 TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
-    for (std::uint32_t ordinal : {0U, 2U, 421U, 439U, 441U, 4711U, 65537U})
+    for (std::uint32_t ordinal : {0U, 2U, 421U, 441U, 4711U, 65537U})
         EXPECT_EQ(module->byOrdinal(ordinal), nullptr);
     std::set<void*> functions;
-    for (std::uint32_t ordinal = 422; ordinal <= 438; ++ordinal) functions.insert(module->byOrdinal(ordinal));
-    functions.insert(module->byOrdinal(440));
-    EXPECT_EQ(functions.size(), 18U);
+    for (std::uint32_t ordinal = 422; ordinal <= 440; ++ordinal) functions.insert(module->byOrdinal(ordinal));
+    EXPECT_EQ(functions.size(), 19U);
     EXPECT_FALSE(functions.contains(nullptr));
 
     EXPECT_EQ(module->byOrdinal<float(bool, int, int, bool)>(422)(true, 12, 30, true), 12.5F);
@@ -134,6 +134,28 @@ TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
     EXPECT_TRUE(module->byOrdinal<bool(int, int*, int*)>(434)(172, &month, &day));
     EXPECT_TRUE(month == 6 && day == 21);
     EXPECT_STREQ(OvPhotometrics::numberedFunctions(*module).getMonthShortName(5), L"May");
+}
+
+TEST_F(ModuleTest, IntensitiesOfManyDirectionsTakeSpans) {
+    const auto functions = OvPhotometrics::numberedFunctions(*module);
+    const auto lamp = manager->createObject(OvPhotometrics::classIds::diffuse);
+    Ov::rnCast<Ov::RnIntensityDist>(lamp.get())->setPeakIntensity(2);
+    const Ov::GeVector3<float> vectors[] = {{0, 0, 1}, {0, 0.6F, 0.8F}, {1, 0, 0}};
+    const OvPhotometrics::DirectionAngles angles[] = {{}, {0.6435011F, 1}, {2, 1}};
+    const auto answers = [&](auto ask, auto directions) {
+        std::vector<float> candela(3);
+        EXPECT_FALSE(ask(functions, lamp.get(), directions, std::span(candela).first(2)));
+        EXPECT_FALSE(ask({}, lamp.get(), directions, candela));
+        EXPECT_TRUE(ask(functions, lamp.get(), directions, candela));
+        EXPECT_EQ(candela[0], 2);
+        EXPECT_FLOAT_EQ(candela[1], 1.6F);
+        EXPECT_EQ(candela[2], 0);
+    };
+    for (const auto ask : {OvPhotometrics::intensities, OvPhotometrics::localIntensities})
+        answers(ask, std::span<const OvPhotometrics::DirectionAngles>(angles));
+    for (const auto ask : {OvPhotometrics::intensitiesAt, OvPhotometrics::intensitiesAtUnit,
+                           OvPhotometrics::localIntensitiesAt, OvPhotometrics::localIntensitiesAtUnit})
+        answers(ask, std::span<const Ov::GeVector3<float>>(vectors));
 }
 
 TEST(CompanionPath, ReplacesTheExtensionOfTheFile) {

@@ -14,46 +14,105 @@ namespace {
 float sine(float a) { return static_cast<float>(std::sin(static_cast<double>(a))); }
 float cosine(float a) { return static_cast<float>(std::cos(static_cast<double>(a))); }
 
-}  // namespace
-
-float Web::intensity(float theta, float psi) const {
+GeVector3<float> unitVector(float theta, float psi) {
     const float s = sine(theta);
     GeVector3<float> direction{s * cosine(psi), s * sine(psi), cosine(theta)};
-    return intensityAtUnit(direction.normalize());
+    return direction.normalize();
 }
 
-float Web::intensityAt(const GeVector3<float>& direction) const {
-    if (!(_maxCandela > 0)) return 0;
-    const GeVector3<float> unit = direction.normalized();
-    if (_identityOrientation) return localIntensityAtUnit(unit);
-    GeVector3<float> local;
-    return localIntensityAtUnit(_web->toWebFrameUnit(local, direction));
+GeVector3<float> vectorAt(const float* v) { return {v[0], v[1], v[2]}; }
+
+}  // namespace
+
+float Web::intensity(float theta, float psi) const { return intensityAtUnit(unitVector(theta, psi)); }
+
+float Web::intensityAt(const Vector& direction) const {
+    return _maxCandela > 0 ? localIntensityAtUnit(fromHost(direction)) : 0;
 }
 
-float Web::intensityAtUnit(const GeVector3<float>& direction) const {
-    if (!(_maxCandela > 0)) return 0;
-    if (_identityOrientation) return localIntensityAtUnit(direction);
-    GeVector3<float> local;
-    return localIntensityAtUnit(_web->toWebFrame(local, direction));
+float Web::intensityAtUnit(const Vector& direction) const {
+    return _maxCandela > 0 ? localIntensityAtUnit(fromHostUnit(direction)) : 0;
 }
 
 float Web::localIntensity(float theta, float psi) const {
-    if (!(_maxCandela > 0)) return 0;
-    return std::min(_multiplier * _web->getIntensity(theta, psi), std::numeric_limits<float>::max());
+    return _maxCandela > 0 ? candelaOf(_web->getIntensity(theta, psi)) : 0;
 }
 
-float Web::localIntensityAt(const GeVector3<float>& direction) const {
+float Web::localIntensityAt(const Vector& direction) const {
     return _maxCandela > 0 ? localIntensityAtUnit(direction.normalized()) : 0;
 }
 
-float Web::localIntensityAtUnit(const GeVector3<float>& direction) const {
-    if (!(_maxCandela > 0)) return 0;
-    const float z = std::clamp(direction.z, -1.0f, 1.0f);
-    if (_cosLast > z || z > _cosFirst) return 0;
-    const float theta = static_cast<float>(std::acos(static_cast<double>(z)));
-    const bool onAxis = direction.x == 0 && direction.y == 0;
-    const double psi = onAxis ? 0 : std::atan2(static_cast<double>(direction.y), static_cast<double>(direction.x));
-    return localIntensity(theta, static_cast<float>(psi));
+float Web::localIntensityAtUnit(const Vector& direction) const {
+    float theta, psi;
+    return _maxCandela > 0 && anglesOf(direction, theta, psi) ? localIntensity(theta, psi) : 0;
+}
+
+bool Web::intensities(DirectionForm form, const float* directions, std::size_t count, float* out) const {
+    const auto web = Ov::rnQuery<RnBasePhotoWebData>(_web.get());
+    if (!web || !(_maxCandela > 0)) return false;
+    const auto vectors = [&](std::size_t floats, auto convert) {
+        intensitiesOfVectors(*web, directions, floats, count, out, convert);
+        return true;
+    };
+    switch (form) {
+        case DirectionForm::angles:
+            return vectors(2, [this](const float* d) { return fromHostUnit(unitVector(d[0], d[1])); });
+        case DirectionForm::vectors:
+            return vectors(3, [this](const float* d) { return fromHost(vectorAt(d)); });
+        case DirectionForm::unitVectors:
+            return vectors(3, [this](const float* d) { return fromHostUnit(vectorAt(d)); });
+        case DirectionForm::localAngles:
+            web->getIntensities(directions, count, out);
+            for (std::size_t k = 0; k < count; ++k) out[k] = candelaOf(out[k]);
+            return true;
+        case DirectionForm::localVectors:
+            return vectors(3, [](const float* d) { return vectorAt(d).normalized(); });
+        case DirectionForm::localUnitVectors:
+            return vectors(3, vectorAt);
+    }
+    return false;
+}
+
+template <class ToLocal>
+void Web::intensitiesOfVectors(const RnBasePhotoWebData& web, const float* directions, std::size_t floats,
+                               std::size_t count, float* out, ToLocal convert) const {
+    constexpr std::size_t together = 256;
+    float angles[together * 2];
+    bool reached[together];
+    for (std::size_t done = 0; done < count; done += together) {
+        const std::size_t group = std::min(together, count - done);
+        for (std::size_t k = 0; k < group; ++k) {
+            float* const to = angles + 2 * k;
+            to[0] = to[1] = 0;
+            reached[k] = anglesOf(convert(directions + floats * (done + k)), to[0], to[1]);
+        }
+        web.getIntensities(angles, group, out + done);
+        for (std::size_t k = 0; k < group; ++k) out[done + k] = reached[k] ? candelaOf(out[done + k]) : 0;
+    }
+}
+
+float Web::candelaOf(float relative) const {
+    return std::min(_multiplier * relative, std::numeric_limits<float>::max());
+}
+
+GeVector3<float> Web::fromHost(const Vector& direction) const {
+    const Vector unit = direction.normalized();
+    Vector local;
+    return _identityOrientation ? unit : _web->toWebFrameUnit(local, direction);
+}
+
+GeVector3<float> Web::fromHostUnit(const Vector& direction) const {
+    Vector local;
+    return _identityOrientation ? direction : _web->toWebFrame(local, direction);
+}
+
+bool Web::anglesOf(const Vector& local, float& theta, float& psi) const {
+    const float z = std::clamp(local.z, -1.0f, 1.0f);
+    if (_cosLast > z || z > _cosFirst) return false;
+    theta = static_cast<float>(std::acos(static_cast<double>(z)));
+    const bool onAxis = local.x == 0 && local.y == 0;
+    psi = onAxis ? 0 : static_cast<float>(std::atan2(static_cast<double>(local.y), static_cast<double>(local.x)));
+    return true;
 }
 
 GeLinearMatrix3<float> Web::getOrientation() const {

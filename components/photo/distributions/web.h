@@ -1,5 +1,6 @@
 #pragma once
 
+#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/photoWeb.h"
 #include "host/componentManager/castImpl.h"
@@ -20,8 +21,8 @@ public:
 };
 
 /// Any photometric web as an intensity distribution. Without a web it is dark, axial, with the ranges {0, 0}.
-class Web final : public Ov::RnDataObject<Web, WebPersistant, Ov::RnWebIntensityDist, Ov::RnWebIntensityDist,
-                                          Ov::RnIntensityDist> {
+class Web final : public Ov::RnDataObject<Web, WebPersistant, ManyIntensities, Ov::RnWebIntensityDist,
+                                          Ov::RnIntensityDist, ManyIntensities> {
 public:
     static constexpr BuilderFacts facts{classIds::webDistribution, distributionCategory, L"Web Distribution",
                                         L"Web Light Intensity Distribution"};
@@ -51,10 +52,24 @@ public:
     void hook() override {}
     Ov::RnPhotoWebData* getWeb() const override { return _web.get(); }
     void setWeb(Ov::RnCastable* web) override;
+    bool intensities(DirectionForm form, const float* directions, std::size_t count, float* out) const override;
 
 private:
     friend class WebPersistant;
 
+    using Vector = GeVector3<float>;
+
+    /// At most the largest number.
+    float candelaOf(float relative) const;
+    // Directions in the web's frame.
+    Vector fromHost(const Vector& direction) const;
+    Vector fromHostUnit(const Vector& direction) const;
+    /// Whether the web reaches there; then the angles are set.
+    bool anglesOf(const Vector& local, float& theta, float& psi) const;
+
+    template <class ToLocal>
+    void intensitiesOfVectors(const RnBasePhotoWebData& web, const float* directions, std::size_t floats,
+                              std::size_t count, float* out, ToLocal convert) const;
     void hold(RnRef<Ov::RnPhotoWebData> web);
 
     float _multiplier = 0;  // candela for a relative value of 1

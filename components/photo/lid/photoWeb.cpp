@@ -312,4 +312,8 @@ GeVector3<float>& RnBasePhotoWebData::toWebFrameUnit(GeVector3<float>& out,
 
 float RnBasePhotoWebData::getIntensity(float theta, float psi) const { return evaluateWeb(*this, theta, psi); }
 
+void RnBasePhotoWebData::getIntensities(const float* angles, std::size_t count, float* out) const {
+    for (std::size_t k = 0; k < count; ++k) out[k] = getIntensity(angles[2 * k], angles[2 * k + 1]);
+}
+
 }  // namespace OvPhotometrics

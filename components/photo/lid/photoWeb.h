@@ -5,6 +5,7 @@
 #include <string>
 
 #include "components/photo/lid/angleSearch.h"
+#include "components/photo/lid/gridEvaluation.h"
 #include "ovphoto/photoWebData.h"
 
 // The photometric web in memory: the record that a format's reader fills, and the class behind RnPhotoWebData that
@@ -138,6 +139,14 @@ public:
         return visitor.finish();
     }
     float getIntensity(float theta, float psi) const override;
+
+    /// Id by which the module knows its own webs among those of the host.
+    static constexpr Ov::RnUid iid{0x7c1e9f10, 0x4a5b11ef, 0x9c6e0b62, 0x5d83a4f7};
+    /// `getIntensity` towards `count` directions, a theta and a psi each.
+    virtual void getIntensities(const float* angles, std::size_t count, float* out) const;
+    WebGrid grid() const {
+        return {_thetas.get(), _psis, _candelas.get(), _nthetas, _npsis, _symmetry, _psiTruncated};
+    }
 
 protected:
     friend bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);

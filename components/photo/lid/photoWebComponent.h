@@ -1,6 +1,7 @@
 #pragma once
 
 #include "components/photo/lid/fileFormat.h"
+#include "components/photo/lid/gridEvaluation.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/numberText.h"
 #include "components/photo/lid/photoWeb.h"
@@ -60,15 +61,19 @@ bool recordToWeb(const typename Format::Record& record, typename Format::Web& we
 
 /// Base of a format's web class `Self`.
 template <class Self, class Format>
-class PhotoWebOf
-    : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData, Ov::RnPhotoWebData> {
+class PhotoWebOf : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData,
+                                           Ov::RnPhotoWebData, RnBasePhotoWebData> {
 public:
     static constexpr BuilderFacts facts = Format::facts;
     static constexpr Ov::RnUid classId = Format::facts.classId;
 
     RnRef<Ov::RnPhotoWebData> clone() const override { return Ov::rnCreate<Self>(self()); }
-    /// The shared evaluation, with this class's own queries resolved at compile time.
+    // The shared evaluation: of one direction with this class's own queries, of many straight from the grid. A
+    // class that overrides a query gives its own `getIntensities` too.
     float getIntensity(float theta, float psi) const override { return evaluateWeb(self(), theta, psi); }
+    void getIntensities(const float* angles, std::size_t count, float* out) const override {
+        evaluateGrid(this->grid(), angles, count, out);
+    }
 
 private:
     const Self& self() const { return static_cast<const Self&>(*this); }

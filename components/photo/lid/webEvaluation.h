@@ -29,14 +29,19 @@ namespace detail {
 /// Where `a` lies between a0 and a0 + width, from 0 to 1; 0 when they do not ascend.
 inline float fraction(float a, float a0, float width) { return width > 0 ? (a - a0) / width : 0; }
 
-/// The plane of the stored range that psi stands for.
+/// The plane of the stored range that psi stands for. Every step is worked out, and chosen or not: directions are
+/// random, and branches on them slow.
 inline float foldPsi(float psi, PhotoWebSymmetry symmetry) {
-    if (psi < 0) psi += twoPi;
-    if (psi >= twoPi) psi -= twoPi;
     const bool quarter = symmetry == PhotoWebSymmetry::Quarter;
-    if ((quarter || symmetry == PhotoWebSymmetry::Half) && psi > pi) psi = twoPi - psi;
-    if (quarter && psi > halfPi) psi = pi - psi;
-    return psi;
+    const bool half = symmetry == PhotoWebSymmetry::Half || quarter;
+    const float above = psi + twoPi;
+    psi = psi < 0 ? above : psi;
+    const float below = psi - twoPi;
+    psi = psi >= twoPi ? below : psi;
+    const float acrossHalf = twoPi - psi;
+    psi = half && psi > pi ? acrossHalf : psi;
+    const float acrossQuarter = pi - psi;
+    return quarter && psi > halfPi ? acrossQuarter : psi;
 }
 
 /// What an interpolation gives as light: 0 where it swings below, the largest number where that is exceeded.
@@ -91,8 +96,8 @@ float evaluateWeb(const Web& web, float theta, float psi) {
     }
 
     web.getCandelaBlock({j - 1, j + 2}, columns, block);
-    const float rows[4] = {catmullRom(block, u), catmullRom(block + 4, u), catmullRom(block + 8, u),
-                           catmullRom(block + 12, u)};
+    float rows[4];
+    for (int k = 0; k < 4; ++k) rows[k] = catmullRom(block + 4 * k, u);
     return detail::asLight(catmullRom(rows, v));
 }
 

@@ -1,4 +1,6 @@
+#include <bit>
 #include <limits>
+#include <random>
 
 #include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
@@ -181,6 +183,115 @@ TEST_F(Distributions, OneWebIsShared) {
         EXPECT_EQ(light->intensityAtUnit(host), light->localIntensityAtUnit(light->toLocal(host)));
     }
     EXPECT_EQ(holders(), alone);
+}
+
+/// A web that the module does not know as one of its own.
+class Stripes final : public Ov::RnCastHeap<Ov::RnCastImpl<RnBasePhotoWebData, Ov::RnPhotoWebData>> {
+public:
+    RnRef<Ov::RnPhotoWebData> clone() const override { return {}; }
+    float getIntensity(float theta, float) const override { return std::fmod(theta, 0.2f); }
+};
+
+TEST_F(Distributions, ManyIntensitiesAreTheSingleOnes) {
+    using Light = Ov::RnIntensityDist;
+    using Vector = GeVector3<float>;
+    constexpr float inf = std::numeric_limits<float>::infinity();
+    const auto lamp = Ov::rnCreate<Isotropic>();
+    lamp->setFlux(1000);
+    const auto diffuse = Ov::rnCreate<Diffuse>();
+    diffuse->setFlux(1000);
+    const auto turned = import(IesText{.horizontal = {90, 180, 270}}.text());
+    const auto stripes = Ov::rnCreate<Stripes>();
+    PhotoWebRecord rec;
+    photoWebRecordInit(rec, 2, 1, PhotoWebSymmetry::Axial, false, true, nullptr);
+    rec.thetas[0] = 0, rec.thetas[1] = 3;
+    for (int i : {0, 1}) photoWebRecordSetCandela(rec, i, 0, 5);
+    ASSERT_TRUE(photoWebInstall(*stripes, rec));
+    const auto upsideDown = makeWebDistribution(*turned);
+    upsideDown->setPeakIntensity(-3);  // dark is 0, not -0, where the web does not reach
+    const RnRef<Light> lights[] = {
+        lamp,
+        diffuse,
+        makeSpotlight(30, 60, 9),
+        Ov::rnCreate<Web>(),
+        makeWebDistribution(*import(IesText{.vertical = {0, 45, 90}}.text())),
+        makeWebDistribution(*import(IesText{.horizontal = {0, 90, 180, 360}}.text())),
+        makeWebDistribution(
+            *import(IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}}.text())),
+        makeWebDistribution(*stripes),
+        upsideDown};
+
+    const float marks[] = {0,          -0.0f,  1,     -1,  0.6f, 1.57079633f,
+                           3.1415927f, 1e-30f, 1e30f, inf, -inf, std::nanf("")};
+    std::vector<float> pairs, triples;
+    for (const float a : marks)
+        for (const float b : marks) {
+            pairs.insert(pairs.end(), {a, b});
+            for (const float c : marks) triples.insert(triples.end(), {a, b, c});
+        }
+    std::mt19937 random(5);
+    std::normal_distribution<float> normal;
+    for (int k = 0; k < 2 * 999; ++k) pairs.push_back(3 * normal(random));
+    for (int k = 0; k < 999; ++k) {
+        const Vector v = Vector{normal(random), normal(random), normal(random)}.normalized();
+        triples.insert(triples.end(), {v.x, v.y, v.z});
+    }
+
+    for (const RnRef<Light>& light : lights) {
+        const auto compare = [&](DirectionForm form, const std::vector<float>& directions, std::size_t floats,
+                                 auto single) {
+            SCOPED_TRACE(testing::Message() << &light - lights << " form " << static_cast<int>(form));
+            std::vector<float> accepted, expected;
+            for (const float* d = directions.data(); d != directions.data() + directions.size(); d += floats) {
+                float candela = 7;
+                try {
+                    expected.push_back(single(d));
+                    accepted.insert(accepted.end(), d, d + floats);
+                } catch (const Ov::ExAssertion&) {
+                    EXPECT_THROW(getIntensities(light.get(), form, d, 1, &candela), Ov::ExAssertion);
+                }
+            }
+            std::vector<float> candela(expected.size(), 7);
+            const auto count = static_cast<std::int64_t>(expected.size());
+            EXPECT_TRUE(getIntensities(light.get(), form, accepted.data(), count, candela.data()));
+            for (std::size_t k = 0; k < expected.size(); ++k)
+                ASSERT_EQ(std::bit_cast<std::uint32_t>(candela[k]), std::bit_cast<std::uint32_t>(expected[k]))
+                    << k;
+        };
+        const auto vector = [](const float* d) { return Vector{d[0], d[1], d[2]}; };
+        using enum DirectionForm;
+        compare(angles, pairs, 2, [&](auto d) { return light->intensity(d[0], d[1]); });
+        compare(vectors, triples, 3, [&](auto d) { return light->intensityAt(vector(d)); });
+        compare(unitVectors, triples, 3, [&](auto d) { return light->intensityAtUnit(vector(d)); });
+        compare(localAngles, pairs, 2, [&](auto d) { return light->localIntensity(d[0], d[1]); });
+        compare(localVectors, triples, 3, [&](auto d) { return light->localIntensityAt(vector(d)); });
+        compare(localUnitVectors, triples, 3, [&](auto d) { return light->localIntensityAtUnit(vector(d)); });
+    }
+}
+
+TEST_F(Distributions, WhatCannotBeAnsweredIsRefused) {
+    const auto light = makeWebDistribution(*import(IesText{}.text()));
+    const float up[3] = {0, 0, 1};
+    float candela = 7;
+    const struct {
+        Ov::RnCastable* light;
+        int form;
+        const float* directions;
+        int count;
+        float* candela;
+        bool answered;
+    } cases[] = {{light.get(), 1, up, 1, &candela, true},      {light.get(), 1, nullptr, 0, nullptr, true},
+                 {light.get(), 1, up, 0, &candela, true},      {nullptr, 1, up, 1, &candela, false},
+                 {light->getWeb(), 1, up, 1, &candela, false}, {light.get(), 1, nullptr, 1, &candela, false},
+                 {light.get(), 1, up, 1, nullptr, false},      {light.get(), 1, up, -1, &candela, false},
+                 {light.get(), 6, up, 1, &candela, false},     {light.get(), -1, up, 1, &candela, false}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(&c - cases);
+        candela = 7;
+        EXPECT_EQ(getIntensities(c.light, static_cast<DirectionForm>(c.form), c.directions, c.count, c.candela),
+                  c.answered);
+        EXPECT_EQ(candela, c.answered && c.count ? light->intensityAt({0, 0, 1}) : 7);
+    }
 }
 
 TEST_F(Distributions, LoadingBringsDerivedValuesUpToDate) {

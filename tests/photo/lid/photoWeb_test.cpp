@@ -1,3 +1,4 @@
+#include <bit>
 #include <cmath>
 #include <functional>
 #include <limits>
@@ -232,6 +233,56 @@ TEST_F(PhotoWeb, AnOverriddenQueryChangesTheEvaluation) {
     EXPECT_NE(shifted->getIntensity(1, 1), plain->getIntensity(1, 1));
     for (float theta = 0; theta < 3.1f; theta += 0.03f)
         EXPECT_EQ(plain->getIntensity(theta, theta), plain->RnBasePhotoWebData::getIntensity(theta, theta));
+}
+
+TEST_F(PhotoWeb, ManyDirectionsAreAnsweredAsEachIs) {
+    constexpr float inf = std::numeric_limits<float>::infinity();
+    const Grid grids[] = {
+        {.nthetas = 19, .npsis = 8, .symmetry = Full, .lastPsi = 315},
+        {.nthetas = 73, .npsis = 37, .symmetry = Full, .lastPsi = 360, .firstPsi = 0.2},
+        {.npsis = 2, .symmetry = Full, .lastPsi = 90},
+        {.npsis = 9, .symmetry = Full, .lastPsi = 180, .truncated = true},
+        {},
+        {.nthetas = 2, .npsis = 2, .lastTheta = 90, .lastPsi = 120},
+        {.npsis = 3, .lastPsi = 90, .firstTheta = 30, .truncated = true},
+        {.npsis = 4, .symmetry = Quarter, .lastPsi = 90},
+        {.nthetas = 3, .npsis = 2, .symmetry = Quarter, .lastPsi = 60},
+        {.npsis = 1, .symmetry = Axial, .truncated = true},
+    };
+    std::mt19937 random(3);
+    std::uniform_real_distribution<float> wide(-7, 7);
+    for (const Grid& grid : grids) {
+        for (const bool even : {true, false}) {
+            SCOPED_TRACE(testing::Message() << &grid - grids << (even ? " even" : " uneven"));
+            PhotoWebRecord rec;
+            grid.fill(rec, [&](double, double) { return wide(random); });
+            for (int i = 1; i + 1 < grid.nthetas && !even; ++i)
+                if (float* const theta = &rec.thetas[static_cast<std::size_t>(i)]; i % 3)
+                    *theta = theta[-1] + (i % 3 == 1 ? 0 : 0.01f);
+            const auto web = Ov::rnCreate<PhotoWebIES>();
+            ASSERT_TRUE(photoWebInstall(*web, rec));
+
+            std::vector<float> marks = {0,      -0.0f, 1e-30f, pi,  -pi,  twoPi,
+                                        halfPi, 7,     1e30f,  inf, -inf, std::nanf("")};
+            for (int i = 0; i < web->getThetaCount(); ++i) marks.push_back(web->getTheta(i));
+            for (int j = 0; j < web->getPsiCount(); ++j) marks.push_back(web->getPsi(j));
+            for (std::size_t k = marks.size(); k-- > 0;)
+                for (const float side : {-inf, inf}) marks.push_back(std::nextafter(marks[k], side));
+            std::vector<float> angles;
+            for (const float theta : marks)
+                for (const float psi : marks) angles.insert(angles.end(), {theta, psi});
+            for (int k = 0; k < 999; ++k) angles.push_back(wide(random));
+            const std::size_t count = angles.size() / 2;
+            std::vector<float> out(count);
+            for (int width = 0; width <= static_cast<int>(widestInstructions()); ++width) {
+                evaluateGrid(web->grid(), angles.data(), count, out.data(), static_cast<Instructions>(width));
+                for (std::size_t k = 0; k < count; ++k)
+                    ASSERT_EQ(std::bit_cast<std::uint32_t>(out[k]),
+                              std::bit_cast<std::uint32_t>(web->getIntensity(angles[2 * k], angles[2 * k + 1])))
+                        << width << ": " << angles[2 * k] << " " << angles[2 * k + 1];
+            }
+        }
+    }
 }
 
 }  // namespace
