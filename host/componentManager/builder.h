@@ -48,7 +48,8 @@ public:
     virtual RnRef<RnCastable> create() = 0;
 };
 
-/// Imports objects of one class from files; the second base of a builder.
+/// Imports objects of one class from files; the second base of a builder. One caller at a time imports into a
+/// module.
 class OVHOST_API RnImportBuilder : public RnCastable {
 public:
     /// Id of the interface.

@@ -7,6 +7,9 @@
 namespace Ov {
 
 /// Imports files of a family of formats without being told which.
+///
+/// Threads:  one caller at a time for all importers and importing builders of a module: its readers keep what they
+///           are at, and its last message, for the module as a whole.
 class OVHOST_API RnImporter : public RnCastable {
 public:
     /// Id of the interface.

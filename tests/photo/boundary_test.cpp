@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <sstream>
 
 #include "host/componentManager/componentManager.h"
@@ -114,14 +115,44 @@ TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
     raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>([&] { out << object.get(); });
 }
 
-TEST_F(Boundary, ACatalogueThatIsMissingIsTheHostsToCatch) {
-    const std::wstring alone = folder.wide("alone" + std::filesystem::path(OVPHOTO_MODULE).extension().string());
-    std::filesystem::copy_file(OVPHOTO_MODULE, nativePath(alone));
-    const LoadedModule module(alone);
-    raises<std::runtime_error>([&] { module.functions().getMonthName(6); });
-    EXPECT_THROW(iesImporter()->import(folder.write("cut.ies", "IESNA91").c_str(), nullptr),
-                 RnStreamEx::ExReadError);
-    EXPECT_EQ(reported.substr(0, 8), L"Message ");
+TEST_F(Boundary, WithoutACatalogueMessagesAreNumbersAndNamesAreTheHostsToCatch) {
+    namespace fs = std::filesystem;
+    const fs::path companion = fs::path(OVPHOTO_MODULE).replace_filename("libOVphotoRes.dll");
+    const fs::path own = nativePath(folder.wide("aloneRes.dll"));
+    const std::wstring alone = folder.wide("alone" + fs::path(OVPHOTO_MODULE).extension().string());
+    const std::wstring cut = folder.write("cut.ies", "IESNA91");
+    fs::copy_file(OVPHOTO_MODULE, nativePath(alone));
+    const struct {
+        const char* name;
+        std::function<void()> make;
+    } cases[] = {{"missing", [] {}},
+                 {"empty", [&] { folder.write("aloneRes.dll", ""); }},
+                 {"of another kind", [&] { folder.write("aloneRes.dll", std::string(100000, 'x')); }},
+                 {"cut short",
+                  [&] {
+                      fs::copy_file(companion, own);
+                      fs::resize_file(own, fs::file_size(own) / 2);
+                  }},
+                 {"a folder", [&] { fs::create_directory(own); }}};
+    for (const auto& [name, make] : cases) {
+        SCOPED_TRACE(name);
+        fs::remove(own);
+        make();
+        const LoadedModule module(alone);
+        const auto functions = module.functions();
+        raises<std::runtime_error>([&] { functions.getMonthName(6); });
+        reported.clear();
+        EXPECT_THROW(iesImporter()->import(cut.c_str(), nullptr), RnStreamEx::ExReadError);
+        EXPECT_EQ(reported.substr(0, 8), L"Message ");
+        // Renamed to its place, a whole one is found, and stays when another takes its place.
+        fs::remove(own);
+        fs::copy_file(companion, folder.path() / "new");
+        fs::rename(folder.path() / "new", own);
+        EXPECT_STREQ(functions.getMonthName(6), L"June");
+        std::error_code isProtected;
+        fs::rename(nativePath(folder.write("other", "")), own, isProtected);
+        EXPECT_STREQ(functions.getMonthName(7), L"July");
+    }
 }
 
 TEST_F(Boundary, WhatAHostThrowsComesBackToIt) {
