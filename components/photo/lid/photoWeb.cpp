@@ -21,6 +21,13 @@ std::size_t count(int n) {
 
 std::unique_ptr<float[]> newFloats(std::size_t n) { return std::make_unique_for_overwrite<float[]>(n); }
 
+/// Without a way out of the loop, which wide instructions can then do.
+bool allFinite(const float* values, std::size_t n) {
+    int finite = 1;
+    for (std::size_t k = 0; k < n; ++k) finite &= std::isfinite(values[k]);
+    return finite != 0;
+}
+
 bool ascends(const float* angles, int n) { return std::is_sorted(angles, angles + n); }
 
 /// The flux integral over theta of many rows on one list of angles: the sines serve all rows.
@@ -258,9 +265,7 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     } else {
         std::copy_n(rec.candelas.get(), values, candelas.get());
     }
-    const auto finite = [](float value) { return std::isfinite(value); };
-    if (!finite(rec.maxCandela) || !finite(lumens) ||
-        !std::all_of(candelas.get(), candelas.get() + values, finite))
+    if (!std::isfinite(rec.maxCandela) || !std::isfinite(lumens) || !allFinite(candelas.get(), values))
         return false;
 
     web._name = std::move(name);

@@ -138,8 +138,17 @@ int nimbReadLine(wchar_t* buffer73, Ov::RnStream& s) {
     int c = s.getChar();
     if (c < 0) return -1;
     int length = 0;
-    for (; c >= 0 && c != '\n' && c != '\r'; c = s.getChar())
+    const auto ends = [](int character) { return character < 0 || character == '\n' || character == '\r'; };
+    Ov::RnBufferedIO& device = s.device();
+    while (!ends(c)) {
         if (length < nimbLineLength) buffer73[length++] = static_cast<wchar_t>(c);
+        // What the device holds ready of the line.
+        const char* p = device.next();
+        for (; p != device.limit() && length < nimbLineLength && *p != '\n' && *p != '\r'; ++p)
+            buffer73[length++] = static_cast<unsigned char>(*p);
+        device.advanceTo(p);
+        c = s.getChar();
+    }
     if (c == '\r') {
         const int after = s.getChar();
         if (after != '\n') s.ungetChar(after);

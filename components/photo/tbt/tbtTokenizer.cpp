@@ -46,7 +46,8 @@ std::wstring TbtTokenizer::text() const {
 bool TbtTokenizer::number(float& value) const {
     if (_kind != TbtToken::number) return false;
     // The zero makes a number of a lone point, too.
-    if (!Ov::convertReal("0" + _text, value)) value = std::numeric_limits<float>::infinity();
+    if (!(_text.front() == '.' ? Ov::convertReal("0" + _text, value) : Ov::convertReal(_text, value)))
+        value = std::numeric_limits<float>::infinity();
     return true;
 }
 
@@ -84,7 +85,24 @@ void TbtTokenizer::takeDigits() {
     while (Ov::isDigit(_in.peekChar())) takeToken();
 }
 
+/// Takes a number without an exponent at once where the device holds it and what follows ready. False, and nothing
+/// is consumed, where it does not.
+bool TbtTokenizer::takeReadyNumber() {
+    Ov::RnBufferedIO& device = _in.device();
+    const char* const limit = device.limit();
+    const char* end = device.next();
+    while (end != limit && Ov::isDigit(*end)) ++end;
+    if (end != limit && *end == '.') ++end;
+    while (end != limit && Ov::isDigit(*end)) ++end;
+    const auto length = static_cast<std::size_t>(end - device.next());
+    if (end == limit || *end == 'e' || *end == 'E' || length > longestToken) return false;
+    _text.assign(device.next(), length);
+    device.advanceTo(end);
+    return true;
+}
+
 TbtToken TbtTokenizer::takeNumber() {
+    if (takeReadyNumber()) return TbtToken::number;
     takeDigits();
     if (takeIf('.')) takeDigits();
     if (takeIf('e') || takeIf('E')) {

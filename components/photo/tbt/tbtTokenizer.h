@@ -44,6 +44,7 @@ private:
     void takeToken();
     bool takeIf(char c);
     void takeDigits();
+    bool takeReadyNumber();
     TbtToken takeNumber();
     TbtToken takeMark();
     void skipBlank();
