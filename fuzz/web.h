@@ -19,9 +19,10 @@
 
 namespace OvPhotometrics::fuzz {
 
+inline bool isFinite(float value) { return std::isfinite(value); }
+
 inline bool isWhole(const std::vector<float>& angles) {
-    return std::is_sorted(angles.begin(), angles.end()) &&
-           std::all_of(angles.begin(), angles.end(), [](float angle) { return std::isfinite(angle); });
+    return std::is_sorted(angles.begin(), angles.end()) && std::all_of(angles.begin(), angles.end(), isFinite);
 }
 
 /// The angles of a web, one axis.
@@ -50,11 +51,12 @@ inline void demandInstalled(const Ov::RnPhotoWebData& web) {
     const float peak = web.getMaxCandela();
     demand(std::isfinite(peak) && peak >= 0 && std::isfinite(web.getLumens()), "peak and flux are finite");
     float largest = -std::numeric_limits<float>::infinity();
-    for (int j = 0; j < web.getPsiCount(); ++j)
-        for (int i = 0; i < web.getThetaCount(); ++i) {
-            demand(std::isfinite(web.getCandela(j, i)), "values are finite");
-            largest = std::max(largest, web.getCandela(j, i));
-        }
+    std::vector<float> row(thetas.size());
+    for (int j = 0; j < web.getPsiCount(); ++j) {
+        web.getCandelaBlock({j, j}, {0, web.getThetaCount() - 1}, row.data());
+        demand(std::all_of(row.begin(), row.end(), isFinite), "values are finite");
+        largest = std::max(largest, *std::max_element(row.begin(), row.end()));
+    }
     demand(peak > 0 ? largest == 1 : largest <= 0 && web.getLumens() == 0, "values are relative to the peak");
 
     const auto m = web.getOrientation();
@@ -132,13 +134,16 @@ void tryFile(std::string_view bytes) {
     demand(io->seek(0, 1) == 0 && takeMessages() == 0, "the content test leaves no trace");
     const auto web = imported<Format>(*io, bytes.size());
     if (!web) return;
-    FileFacts facts;
-    io->seek(0, 0);
-    demand(builder.readFacts(*io, nullptr, facts), "what is read has facts");
-    if (isDue(bytes, 0)) demandWritten<IesFormat>(*web, facts);
-    if (isDue(bytes, 1)) demandWritten<CibseFormat>(*web, facts);
-    if (isDue(bytes, 2)) demandWritten<NimbFormat>(*web, facts);
-    if (isDue(bytes, 3)) demandWritten<TbtFormat>(*web, facts);
+    const auto facts = [&] {
+        FileFacts all;
+        io->seek(0, 0);
+        demand(builder.readFacts(*io, nullptr, all), "what is read has facts");
+        return all;
+    };
+    if (isDue(bytes, 0)) demandWritten<IesFormat>(*web, facts());
+    if (isDue(bytes, 1)) demandWritten<CibseFormat>(*web, facts());
+    if (isDue(bytes, 2)) demandWritten<NimbFormat>(*web, facts());
+    if (isDue(bytes, 3)) demandWritten<TbtFormat>(*web, facts());
 }
 
 }  // namespace OvPhotometrics::fuzz
