@@ -3,6 +3,11 @@
 option(OVPHOTO_TESTS "Build the tests" ON)
 option(OVPHOTO_BENCH "Build the benchmarks" OFF)
 option(OVPHOTO_FUZZ "Build the fuzz targets for libFuzzer, which needs Clang and the sanitizer fuzzer-no-link" OFF)
+set(pictures ON)
+if(WIN32)
+  set(pictures OFF)  # Debian has no Cairo for MinGW
+endif()
+option(OVPHOTO_PICTURES "Build the tool with pictures and reports, which needs Cairo" ${pictures})
 set(OVPHOTO_SANITIZE "" CACHE STRING "Sanitizers, such as address,undefined")
 option(OVPHOTO_COVERAGE "Count what the tests run" OFF)
 

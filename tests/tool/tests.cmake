@@ -1,4 +1,5 @@
-ovphoto_add_test(tool/numbers_test ${PROJECT_SOURCE_DIR}/tools/ovphoto/numbers.cpp)
+ovphoto_add_test(tool/numbers_test)
+target_link_libraries(tool_numbers_test PRIVATE ovphoto_numbers)
 
 # These run the built tool as a process, in a shell: one for another system is run by those of this one.
 if(NOT CMAKE_CROSSCOMPILING)

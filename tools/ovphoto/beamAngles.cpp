@@ -9,32 +9,25 @@ using namespace Ov;
 
 namespace {
 
-using Vector = GeVector3<double>;
-
-/// A great circle of directions in the web's frame: angle 0 lies at `axis`, 90 degrees at `side`.
-struct Plane {
-    const char* name;
-    Vector axis;
-    Vector side;
-};
+using OvPlot::AngleSpan;
+using OvPlot::Vector;
 
 constexpr int samplesPerDegree = 10;
 constexpr int samples = 360 * samplesPerDegree;
 
-/// The intensity in a plane as a function of the angle in degrees, of period 360.
+/// The intensity in a plane as a function of the angle in degrees, of period 360: angle 0 lies at `axis`, 90
+/// degrees at `side`.
 class Curve {
 public:
-    Curve(const RnIntensityDist& light, const Plane& plane) : _light(light), _plane(plane) {}
+    Curve(const RnIntensityDist& light, const Vector& axis, const Vector& side)
+        : _light(light), _axis(axis), _side(side) {}
 
     float operator()(double degrees) const {
         const double angle = degrees * std::numbers::pi / 180;
         const double c = std::cos(angle);
         const double s = std::sin(angle);
-        const double x = c * _plane.axis.x + s * _plane.side.x;
-        const double y = c * _plane.axis.y + s * _plane.side.y;
-        const double z = c * _plane.axis.z + s * _plane.side.z;
-        return _light.localIntensity(static_cast<float>(std::atan2(std::hypot(x, y), z)),
-                                     static_cast<float>(std::atan2(y, x)));
+        return OvPlot::intensityTowards(
+            _light, {c * _axis.x + s * _side.x, c * _axis.y + s * _side.y, c * _axis.z + s * _side.z});
     }
 
     /// The angle of the peak, that nearest to the axis where several are the same.
@@ -66,16 +59,17 @@ public:
         return {};
     }
 
-    std::optional<double> widthAt(float level, double start) const {
+    std::optional<AngleSpan> spanAt(float level, double start) const {
         const auto right = fallsTo(level, start, 1);
         const auto left = fallsTo(level, start, -1);
         if (!right || !left) return {};
-        return *right - *left;
+        return AngleSpan{*left, *right};
     }
 
 private:
     const RnIntensityDist& _light;
-    const Plane& _plane;
+    Vector _axis;
+    Vector _side;
 };
 
 Vector turned(const GeLinearMatrix3<float>& matrix, double x, double y, double z) {
@@ -92,31 +86,29 @@ Vector photometricAxis(const RnPhotoWebData& web) {
     return {axis.x, axis.y, 0};
 }
 
-std::vector<Plane> mainPlanes(const RnPhotoWebData& web) {
-    if (web.isPsiTruncated()) {
-        const Vector axis = photometricAxis(web);
-        return {{"horizontal", axis, {-axis.y, axis.x, 0}}, {"vertical", axis, {0, 0, -1}}};
-    }
-    const GeLinearMatrix3<float> matrix =
-        web.hasIdentityOrientation() ? GeLinearMatrix3<float>() : web.getOrientation();
-    const Vector axis = turned(matrix, 0, 0, 1);
-    return {{"C0-C180", axis, turned(matrix, 1, 0, 0)}, {"C90-C270", axis, turned(matrix, 0, 1, 0)}};
+BeamAngles anglesIn(const char* plane, const Curve& curve) {
+    const double start = curve.peak();
+    const float peak = curve(start);
+    if (!(peak > 0)) return {plane, {}, {}};
+    return {plane, curve.spanAt(peak * 0.5F, start), curve.spanAt(peak * 0.1F, start)};
 }
 
 }  // namespace
 
-std::vector<BeamAngles> beamAngles(const RnWebIntensityDist& light) {
-    std::vector<BeamAngles> result;
-    for (const Plane& plane : mainPlanes(*light.getWeb())) {
-        const Curve curve(light, plane);
-        const double start = curve.peak();
-        const float peak = curve(start);
-        BeamAngles& angles = result.emplace_back(BeamAngles{plane.name, {}, {}});
-        if (!(peak > 0)) continue;
-        angles.beam = curve.widthAt(peak * 0.5F, start);
-        angles.field = curve.widthAt(peak * 0.1F, start);
+OvPlot::LightFrame mainFrame(const RnPhotoWebData& web) {
+    if (web.isPsiTruncated()) {
+        const Vector axis = photometricAxis(web);
+        return {axis, {-axis.y, axis.x, 0}, {0, 0, -1}, true};
     }
-    return result;
+    const GeLinearMatrix3<float> matrix =
+        web.hasIdentityOrientation() ? GeLinearMatrix3<float>() : web.getOrientation();
+    return {turned(matrix, 0, 0, 1), turned(matrix, 1, 0, 0), turned(matrix, 0, 1, 0), false};
+}
+
+std::vector<BeamAngles> beamAngles(const RnWebIntensityDist& light) {
+    const OvPlot::LightFrame frame = mainFrame(*light.getWeb());
+    return {anglesIn(frame.aimed ? "horizontal" : "C0-C180", {light, frame.down, frame.c0}),
+            anglesIn(frame.aimed ? "vertical" : "C90-C270", {light, frame.down, frame.c90})};
 }
 
 }  // namespace OvTool

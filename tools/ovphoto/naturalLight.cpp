@@ -92,6 +92,10 @@ std::vector<std::string> outOfRange(const RnNaturalLight& light) {
     return notes;
 }
 
+const char* skyText(float cover) {
+    return cover < 0.35F ? "clear" : cover <= 0.75F ? "partly cloudy" : "overcast";
+}
+
 std::string dateText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
     const std::string day = "day " + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
     if (light.getMonth() == 0) return day;

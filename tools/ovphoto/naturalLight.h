@@ -23,6 +23,9 @@ std::string savedLight(Ov::RnNaturalLight& light, Ov::RnStream::Form form);
 /// Which settings lie outside their ranges, and what is computed with instead.
 std::vector<std::string> outOfRange(const Ov::RnNaturalLight& light);
 
+/// "clear", "partly cloudy" or "overcast".
+const char* skyText(float cover);
+
 /// "21 June, day 172".
 std::string dateText(const Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions);
 

@@ -16,6 +16,7 @@ constexpr Command allCommands[] = {
     {"convert", "Write photometric files in another format", declareConvert},
     {"make", "Write an isotropic, diffuse or spotlight distribution as a photometric file", declareMake},
     {"check", "Read files and folders and list their faults", declareCheck},
+    {"plot", "Draw a diagram of photometric files, the sky, or the sun's paths", declarePlot},
     {"sun", "Show where the sun stands and what light it and the sky give", declareSun},
     {"sky", "Show the sky's luminance in a direction, or its light on a surface", declareSky},
     {"settings", "Show or write saved settings of natural light", declareSettings},

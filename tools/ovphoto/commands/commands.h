@@ -41,6 +41,8 @@ Action declareIntensity(CLI::App& app);
 Action declareConvert(CLI::App& app);
 Action declareMake(CLI::App& app);
 Action declareCheck(CLI::App& app);
+Action declarePlot(CLI::App& app);
+Action declareReport(CLI::App& app);
 Action declareSun(CLI::App& app);
 Action declareSky(CLI::App& app);
 Action declareSettings(CLI::App& app);

@@ -130,8 +130,8 @@ std::string orientationText(const RnPhotoWebData& web) {
 }
 
 void printBeamAngles(const RnPhotoWebData& web, const RnWebIntensityDist& light) {
-    const auto angleText = [](const std::optional<double>& angle) {
-        return padLeft(angle ? shortNumber(std::round(*angle * 10) / 10) + " deg" : "-", 9);
+    const auto angleText = [](const std::optional<OvPlot::AngleSpan>& angle) {
+        return padLeft(angle ? shortNumber(std::round(angle->width() * 10) / 10) + " deg" : "-", 9);
     };
     Table table;
     table.add({web.isPsiTruncated() ? "Plane through the axis" : "Plane", "beam, 50 %", "field, 10 %"});

@@ -64,10 +64,6 @@ const char* polarText(RnNaturalLight& light) {
     return daylight < noise ? "the sun stays down" : daylight > hoursInDay - noise ? "the sun stays up" : nullptr;
 }
 
-const char* skyText(float cover) {
-    return cover < 0.35F ? "clear" : cover <= 0.75F ? "partly cloudy" : "overcast";
-}
-
 void addPlaceAndTime(Table& table, RnNaturalLight& light, const NumberedFunctions& functions) {
     const std::string equation = fixedNumber(60 * light.getEquationOfTime(), 1) + " min";
     const char* saving = light.getDaylightSaving() ? ", daylight saving time" : "";

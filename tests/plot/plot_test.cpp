@@ -1,0 +1,103 @@
+#include <gmock/gmock.h>
+
+#include "tests/plot/svgPath.h"
+#include "tool/toolRun.h"
+
+namespace {
+
+class ToolPlot : public testing::Test {
+protected:
+    ToolPlot() {
+        folder.write("good.ies", IesFile().text());
+        folder.write("bad.ies", "IESNA91\nTILT=NONE\nx\n");
+    }
+    ToolResult run(const std::string& arguments) { return runTool("plot " + arguments, folder); }
+    std::string bytes(const std::string& name) { return readBytes(folder.path() / name); }
+    std::size_t fileCount() {
+        return static_cast<std::size_t>(std::distance(std::filesystem::directory_iterator(folder.path()), {}));
+    }
+
+    TempFolder folder;
+};
+
+TEST_F(ToolPlot, EveryKindIsWrittenInEveryFormat) {
+    for (const std::string what :
+         {"good.ies", "good.ies --kind cartesian --planes 0,45,90.5", "good.ies --kind cone",
+          "good.ies --kind isolux --height 2.5", "good.ies --kind solid --dark", "--sky",
+          "--sun-path --latitude 80 --date 6-21", "good.ies good.ies --size 700x300"}) {
+        for (const auto& [file, start] : {std::pair{"a.svg", "<?xml"}, {"a.PNG", "\x89PNG"}, {"a.pdf", "%PDF"}}) {
+            const ToolResult result = run(what + " -o " + file);
+            EXPECT_EQ(result.status, 0) << what << result.err;
+            EXPECT_EQ(result.err + result.out, "") << what;
+            EXPECT_THAT(bytes(file), testing::StartsWith(start)) << what;
+        }
+    }
+}
+
+TEST_F(ToolPlot, IlluminancesAreThoseOfTheCandelaWhateverTheUnitOfTheFile) {
+    IesFile file;  // 628 lm, so that a TBT file holds other values
+    file.candela = [](double v, double) { return 100 - v; };
+    folder.write("in.ies", file.text());
+    ASSERT_EQ(runTool("convert in.ies in.tbt", folder).status, 0);
+    ASSERT_EQ(run("in.ies --kind isolux -o a.svg").status, 0);
+    ASSERT_EQ(run("in.tbt --kind isolux -o b.svg").status, 0);
+    const OvPlot::Path a = longestPath(bytes("a.svg")), b = longestPath(bytes("b.svg"));
+    ASSERT_EQ(a.size(), b.size());
+    for (std::size_t i = 0; i < a.size(); ++i) EXPECT_LT(distance(a[i], b[i]), 0.2);
+}
+
+TEST_F(ToolPlot, WrongInputIsToldAndLeavesNothing) {
+    folder.write("old.svg", "old");
+    std::filesystem::create_directory(folder.path() / "folder.svg");
+    const std::size_t before = fileCount();
+    const struct {
+        int status;
+        const char* arguments;
+        const char* told;
+    } cases[] = {
+        {2, "-o a.svg", "FILE, --sky or --sun-path"},
+        {2, "good.ies", "--out"},
+        {2, "good.ies -o a.gif", "a.gif: does not end in .svg, .png or .pdf"},
+        {2, "good.ies -o a.svg --planes ''", "--planes"},
+        {2, "good.ies -o a.svg --planes 0,", "'0,'"},
+        {2, "good.ies -o a.svg --planes 360", "'360'"},
+        {2, "good.ies -o a.svg --planes 1,2,3,4,5,6,7,8,9", "--planes"},
+        {2, "good.ies -o a.svg --size 0x600", "'0x600'"},
+        {2, "good.ies -o a.svg --size 600x8001", "'600x8001'"},
+        {2, "good.ies -o a.svg --size 600", "'600'"},
+        {2, "good.ies -o a.svg --size 99999999999x600", "--size"},
+        {2, "good.ies -o a.svg --kind pie", "'pie'"},
+        {2, "good.ies -o a.svg --height 0", "'0'"},
+        {2, "good.ies -o a.svg --latitude 3", "--sky"},
+        {2, "good.ies --sky -o a.svg", "--sky"},
+        {2, "--sky --sun-path -o a.svg", "--s"},
+        {2, "--sky --kind polar -o a.svg", "--kind"},
+        {2, "good.ies good.ies --kind cone -o a.svg", "shows one"},
+        {2, "good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies -o a.svg", "8"},
+        {1, "good.ies bad.ies good.ies -o old.svg", "bad.ies: "},
+        {1, "gone.ies -o old.svg", "gone.ies: cannot be opened"},
+        {1, "good.ies -o none/a.svg", "none/a.svg: cannot be written"},
+        {1, "good.ies -o folder.svg", "is a folder"},
+        {1, "--sky --from bad.ies -o a.svg", "bad.ies"},
+    };
+    for (const auto& c : cases) {
+        const ToolResult result = run(c.arguments);
+        EXPECT_EQ(result.status, c.status) << c.arguments << result.err;
+        EXPECT_TRUE(result.says(c.told)) << c.arguments << result.err;
+    }
+    EXPECT_EQ(fileCount(), before);
+    EXPECT_EQ(bytes("old.svg"), "old");
+}
+
+TEST_F(ToolPlot, NamesOfAnyBytesAreDrawn) {
+    IesFile file;
+    std::string text = file.text();
+    text.replace(text.find("[TEST] one"), 10, "[LUMINAIRE] <script>alert(1)</script> \xff & \"");
+    folder.write("odd.ies", text);
+    ASSERT_EQ(run("odd.ies good.ies odd.ies -o a.svg").status, 0);
+    ASSERT_EQ(run("odd.ies -o b.svg").status, 0);
+    EXPECT_EQ(bytes("b.svg").find("<script"), std::string::npos);
+    EXPECT_THAT(bytes("b.svg"), testing::HasSubstr("<title>&lt;script&gt;alert(1)"));
+}
+
+}  // namespace

@@ -1,0 +1,22 @@
+#include <iostream>
+
+#include "tools/ovphoto/commands/pictureOptions.h"
+
+// In place of the pictures, in builds without Cairo.
+
+namespace OvTool {
+
+namespace {
+
+int refuse() {
+    std::cerr << "ovphoto: this build has no pictures: it was made without Cairo\n";
+    return exitUsage;
+}
+
+}  // namespace
+
+int runPlot(const PlotOptions&, const HostSession&) { return refuse(); }
+
+int runReport(const ReportOptions&, const HostSession&) { return refuse(); }
+
+}  // namespace OvTool

@@ -1,0 +1,136 @@
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <iostream>
+#include <numbers>
+
+#include "host/platform/path.h"
+#include "tools/ovphoto/commands/pictureOptions.h"
+#include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/pictures/drawnFile.h"
+#include "tools/plot/picture.h"
+#include "tools/plot/skyDiagram.h"
+
+namespace OvTool {
+
+namespace {
+
+using OvPlot::Canvas;
+using OvPlot::PictureFormat;
+
+std::optional<PictureFormat> formatOf(const std::string& path) {
+    static constexpr std::pair<const char*, PictureFormat> endings[] = {
+        {".svg", PictureFormat::svg}, {".png", PictureFormat::png}, {".pdf", PictureFormat::pdf}};
+    for (const auto& [ending, format] : endings)
+        if (CLI::detail::to_lower(path).ends_with(ending)) return format;
+    return {};
+}
+
+void (*drawerOf(PictureKind kind))(Canvas&, const OvPlot::Diagram&) {
+    switch (kind) {
+        case PictureKind::cartesian:
+            return OvPlot::drawCartesian;
+        case PictureKind::cone:
+            return OvPlot::drawCone;
+        case PictureKind::isolux:
+            return OvPlot::drawIsolux;
+        case PictureKind::solid:
+            return OvPlot::drawSolid;
+        default:
+            return OvPlot::drawPolar;
+    }
+}
+
+/// The files' lights; none, after their reasons, when one is refused.
+std::optional<std::vector<DrawnFile>> readAll(const PlotOptions& options, const HostSession& session) {
+    std::vector<DrawnFile> files;
+    for (const std::string& path : options.files) {
+        ReadResult result = session.read(path, options.as);
+        showReasons(result);
+        if (auto file = drawnFile(session, result)) files.push_back(std::move(*file));
+    }
+    return files.size() == options.files.size() ? std::optional(std::move(files)) : std::nullopt;
+}
+
+int write(const PlotOptions& options, PictureFormat format, const std::string& title,
+          const std::function<void(Canvas&)>& draw) {
+    const std::string bytes =
+        OvPlot::drawPicture(format, {options.width, options.rows},
+                            options.dark ? OvPlot::darkPalette() : OvPlot::lightPalette(), title, draw);
+    const std::string error = writeFile(options.out, bytes);
+    if (error.empty()) return exitWell;
+    std::cerr << options.out << ": " << error << '\n';
+    return exitFailed;
+}
+
+int plotLights(const PlotOptions& options, PictureFormat format, const HostSession& session) {
+    const auto files = readAll(options, session);
+    if (!files) return exitFailed;
+    std::vector<WebLight> lights;
+    const bool needsCandela = options.kind == PictureKind::cone || options.kind == PictureKind::isolux;
+    OvPlot::Diagram diagram =
+        needsCandela ? trueDiagramOf(session, files->front(), lights) : diagramOf(session, *files, lights);
+    diagram.planes = options.planes;
+    diagram.height = options.height;
+    return write(options, format, diagram.title, [&](Canvas& canvas) { drawerOf(options.kind)(canvas, diagram); });
+}
+
+std::string degreesText(float radians) { return fixedNumber(radians * 180 / std::numbers::pi, 1) + "\u00b0"; }
+
+OvPlot::SkyCaption captionOf(Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+    light.getSolarTime();  // where it was given, the local time follows from it
+    OvPlot::SkyCaption caption;
+    caption.subtitle = sideText(light.getLatitude(), 'N', 'S') + ", " + sideText(light.getLongitude(), 'W', 'E') +
+                       "; " + dateText(light, functions) + "; " + clockText(functions, light.getLocalTime()) +
+                       ", " + utcText(functions, light.getTimeZoneHours()) +
+                       (light.getDaylightSaving() ? ", daylight saving" : "");
+    const float altitude = light.getSolarAltitude();
+    caption.notes = {altitude > 0 ? "Sun " + degreesText(altitude) + " high, azimuth " +
+                                        degreesText(light.getSolarAzimuth()) + " from south to west"
+                                  : "The sun is " + degreesText(-altitude) + " below the horizon"};
+    return caption;
+}
+
+int plotSky(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
+            const OvPhotometrics::NumberedFunctions& functions) {
+    OvPlot::SkyCaption caption = captionOf(light, functions);
+    caption.title = std::string("Luminance of the ") + skyText(light.getSkyCover()) + " sky";
+    caption.subtitle += "; looking up";
+    caption.notes.push_back("Zenith " + shortNumber(light.getZenithLuminance()) + " cd/m\u00b2");
+    caption.notes.push_back("Skylight on the ground " + fixedNumber(light.getSkyHorizontalIlluminance(), 0) +
+                            " lx");
+    return write(options, format, caption.title, [&](Canvas& canvas) { OvPlot::drawSky(canvas, light, caption); });
+}
+
+int plotSunPath(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
+                const OvPhotometrics::NumberedFunctions& functions) {
+    OvPlot::SkyCaption caption = captionOf(light, functions);
+    caption.title = "Paths of the sun";
+    std::array<std::string, 12> months;
+    for (std::size_t i = 0; i < months.size(); ++i)
+        months[i] = Ov::toUtf8(functions.getMonthShortName(static_cast<int>(i) + 1));
+    return write(options, format, caption.title,
+                 [&](Canvas& canvas) { OvPlot::drawSunPath(canvas, light, caption, months); });
+}
+
+int plotNaturalLight(const PlotOptions& options, PictureFormat format, const HostSession& session) {
+    const auto light = makeLight(session, options.light, false);
+    if (!light) return exitFailed;
+    showOutOfRange(*light);
+    return (options.kind == PictureKind::sky ? plotSky : plotSunPath)(options, format, *light,
+                                                                      session.functions());
+}
+
+}  // namespace
+
+int runPlot(const PlotOptions& options, const HostSession& session) {
+    const auto format = formatOf(options.out);
+    if (!format) {
+        std::cerr << options.out << ": does not end in .svg, .png or .pdf\n";
+        return exitUsage;
+    }
+    const bool ofSky = options.kind == PictureKind::sky || options.kind == PictureKind::sunPath;
+    return (ofSky ? plotNaturalLight : plotLights)(options, *format, session);
+}
+
+}  // namespace OvTool

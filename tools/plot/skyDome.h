@@ -1,0 +1,32 @@
+#pragma once
+
+#include "tools/plot/canvas.h"
+#include "tools/plot/lightFrame.h"
+
+namespace OvPlot {
+
+/// The sky's half sphere on paper. Azimuths count from south towards west, as natural light has them.
+struct SkyDome {
+    Point centre;
+    double radius = 1;
+    bool mirrored = false;  // seen from below: east on the left
+
+    /// Degrees.
+    Point at(double altitude, double azimuth) const {
+        const double r = radius * (90 - altitude) / 90;
+        const double x = -r * std::sin(radians(azimuth));
+        return centre + Point{mirrored ? -x : x, r * std::cos(radians(azimuth))};
+    }
+    /// The point `beyond` the horizon.
+    Point outside(double beyond, double azimuth) const { return at(-90 * beyond / radius, azimuth); }
+};
+
+struct CompassPoint {
+    const char* name;
+    double azimuth;
+};
+inline constexpr CompassPoint compassPoints[] = {{"N", 180}, {"E", -90}, {"S", 0}, {"W", 90}};
+
+inline double degrees(double radian) { return radian * 180 / std::numbers::pi; }
+
+}  // namespace OvPlot
