@@ -18,7 +18,7 @@ void demand(bool kept, const char* promise);
 /// The number of messages reported since the last call.
 int takeMessages();
 
-/// Whether the slow part `part` is tried with this input: by the engine with one input in 32, by the replay with
+/// Whether the slow part `part` is tried with this input: by the engine with one input in 128, by the replay with
 /// all.
 bool isDue(std::string_view input, std::size_t part);
 
