@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <array>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "fuzz/fuzz.h"
@@ -24,14 +25,13 @@ struct Outcome {
 
     Outcome(const Ov::RnRef<Ov::RnBufferedIO>& device, const wchar_t* format, std::size_t size) {
         fields.fill(std::vector<wchar_t>(size + 2, L'?'));  // a text may be as long as the input
-        auto* const f = fields.data();
-        measured(size, [&] {
-            Ov::RnStream stream(device.get(), Ov::RnStream::Form::text);
-            count = stream.formattedRead(format, f[0].data(), f[1].data(), f[2].data(), f[3].data(), f[4].data(),
-                                         f[5].data(), f[6].data(), f[7].data(), f[8].data(), f[9].data(),
-                                         f[10].data(), f[11].data());
-        });
+        Ov::RnStream stream(device.get(), Ov::RnStream::Form::text);
+        measured(size, [&] { count = read(stream, format, std::make_index_sequence<mostFields>()); });
         for (int c = device->getChar(); c >= 0; c = device->getChar()) rest += static_cast<char>(c);
+    }
+    template <std::size_t... k>
+    int read(Ov::RnStream& stream, const wchar_t* format, std::index_sequence<k...>) {
+        return stream.formattedRead(format, fields[k].data()...);
     }
     bool operator==(const Outcome&) const = default;
 };
