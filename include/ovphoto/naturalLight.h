@@ -53,9 +53,8 @@ struct NaturalLightSettings {
 /// points east, +Y north, +Z up. Directions are scene directions, towards the light. Range:    setters take any
 /// value and getters give it back; only the computation limits it (day 1 to 365, latitude
 ///           to the poles, a longitude or meridian from 180 degrees on counts as -180, sky cover 0 to 1).
-/// Lazy:     the values below "derived" are computed together by the first of them that is asked for after a
-/// change,
-///           which is why those operations are not const. Getters of settings never compute: after `setSolarTime`
+/// Lazy:     the values below "derived" are computed together by the first of them that is asked for after
+///           a change, which is why those operations are not const. Getters of settings never compute: after `setSolarTime`
 ///           the local time follows when a derived value is next asked for.
 /// Threads:  one at a time.
 class RnNaturalLight : public RnCastable {

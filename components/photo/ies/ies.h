@@ -13,13 +13,11 @@
 //   header     any number of lines, the first often "IESNA91" or "IESNA:LM-63-2002", kept as they stand
 //   TILT=...   NONE, INCLUDE, or the name of a tilt file; with INCLUDE the tilt block follows
 //   numbers    lamps, lumens per lamp, candela multiplier, vertical count, horizontal count, photometric type,
-//   units
-//              type, width, length, height, ballast factor, ballast-lamp factor, input watts; vertical angles,
+//              units type, width, length, height, ballast factor, ballast-lamp factor, input watts; vertical angles,
 //              horizontal angles, and the candelas of each horizontal angle
 //
 // Units:    degrees and candela in the file, candela being value times multiplier and both ballast factors;
-// radians
-//           and values relative to the peak in an installed web.
+//           radians and values relative to the peak in an installed web.
 // Errors:   false, after reported messages (12932 to 12968); only a host without its services raises, ExBadCast.
 // Threads:  one at a time, as messages are reported.
 // More:     docs/formats/ies.md

@@ -33,8 +33,7 @@ struct SolarPosition {
 SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, double solarTime);
 
 /// Solar time of sunrise, 0..12; the sun sets at 24 less it. A sun that stays up rises at 0, one that stays down
-/// at
-/// 12. At a pole with the declination 0 it is 6.
+/// at 12. At a pole with the declination 0 it is 6.
 double sunriseSolarTime(const LatitudeTerms& latitude, double declination);
 
 }  // namespace OvPhotometrics
