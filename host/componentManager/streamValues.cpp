@@ -173,12 +173,12 @@ std::wstring readBinaryText(RnStream& stream) {
     std::wstring text;
     std::array<unsigned char, 4096> block;
     for (auto left = readLittle<std::uint32_t>(stream); left > 0;) {
-        const auto units = std::min<std::uint32_t>(left, block.size() / 2);
+        const auto units = std::min<std::size_t>(left, block.size() / 2);
         readRaw(stream, block.data(), static_cast<int>(2 * units));
         for (std::size_t i = 0; i < 2 * units; i += 2) {
             appendUnit(text, static_cast<char16_t>(block[i] | block[i + 1] << 8));
         }
-        left -= units;
+        left -= static_cast<std::uint32_t>(units);
     }
     return text;
 }
@@ -267,6 +267,7 @@ void readValue(RnStream& stream, std::wstring& value) {
         readValue(*this, value);                                        \
         return *this;                                                   \
     }
+// The interface takes values. NOLINTNEXTLINE(performance-unnecessary-value-param)
 OV_STREAM_TYPES(OV_STREAM_VALUE)
 #undef OV_STREAM_VALUE
 

@@ -185,9 +185,8 @@ std::string failureOf(F function) {
 
 TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
     const std::wstring text = folder.write("text\u00E9.so", "text"), host = fromUtf8(OVPHOTO_HOST);
-    for (const auto& [path, reason] :
-         {std::pair{folder.wide("l\xC3\xA4mp.so"), ": no such file"}, std::pair{folder.wide(), ": it is a folder"},
-          std::pair{L"libm.so.6"s, ": no such file"}}) {
+    for (const auto& path : {folder.wide("l\xC3\xA4mp.so"), folder.wide(), L"libm.so.6"s}) {
+        const std::string reason = path == folder.wide() ? ": it is a folder" : ": no such file";
         bool recognised = true;
         EXPECT_FALSE(nut.canImport(path.c_str(), nullptr));
         EXPECT_THAT(failureOf<std::runtime_error>([&] { nut.import(path.c_str(), nullptr); }),

@@ -77,37 +77,6 @@ TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
     EXPECT_EQ(seen, 1);
 }
 
-TEST_F(ModuleTest, ImportsAFileNamedByItsPathAndReportsFaults) {
-    TempFolder folder;
-    const auto good = folder.write("lamp.one.ies", "IESNA91\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1");
-    const auto bad = folder.write("bad.ies", "IESNA91\nTILT=NONE\n0");
-    const auto builder = manager->findBuilder(OvPhotometrics::classIds::iesWeb);
-    const auto importer = Ov::rnCast<Ov::RnImportBuilder>(builder.get());
-    const auto object = importer->import(good.c_str(), nullptr);
-    const auto web = Ov::rnCast<Ov::RnPhotoWebData>(object.get());
-    EXPECT_STREQ(web->getName(), L"lamp.one");
-    EXPECT_TRUE(web->isLoaded());
-    EXPECT_EQ(web->getMaxCandela(), 5);
-
-    std::wstring reported;
-    Ov::setMessageReporter([&](int, const wchar_t* text) { reported += text; });
-    EXPECT_THROW(importer->import(bad.c_str(), nullptr), Ov::RnStreamEx::ExReadError);
-    EXPECT_THROW(importer->import(folder.wide().c_str(), nullptr), Ov::RnStreamEx::ExReadError);
-    Ov::setMessageReporter(nullptr);
-    EXPECT_NE(reported.find(L"is 0; it must be at least 1"), std::wstring::npos) << Ov::toUtf8(reported);
-}
-
-TEST_F(ModuleTest, AdaptersShareTheirObject) {
-    const auto object = manager->createObject(OvPhotometrics::classIds::iesWeb);
-    const auto first = Ov::rnCast<Ov::RnPersistant>(object.get());
-    const auto second = Ov::rnCast<Ov::RnPersistant>(object.get());
-    EXPECT_NE(first.get(), second.get());
-    EXPECT_EQ(first->getClassId(), OvPhotometrics::classIds::iesWeb);
-    EXPECT_EQ(object->getInterface(Ov::RnBufferedIO::iid), nullptr);
-    EXPECT_TRUE(object->hasInterface(Ov::RnPersistant::iid));
-    EXPECT_FALSE(object->hasInterface(Ov::RnBufferedIO::iid));
-}
-
 TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
     for (std::uint32_t ordinal : {0U, 2U, 421U, 441U, 4711U, 65537U})
         EXPECT_EQ(module->byOrdinal(ordinal), nullptr);

@@ -97,7 +97,7 @@ const char* skyText(float cover) {
 }
 
 std::string dateText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
-    const std::string day = "day " + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
+    std::string day = "day " + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
     if (light.getMonth() == 0) return day;
     const std::string month = toUtf8(functions.getMonthName(light.getMonth()));
     return std::to_string(light.getDayOfMonth()) + " " + month + ", " + day;

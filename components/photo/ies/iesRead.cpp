@@ -140,8 +140,11 @@ bool iesReadTilt(IesTilt& tilt, Ov::RnStream& in) {
 }
 
 bool iesReadRecord(IesFileRecord& rec, Ov::RnStream& in, const wchar_t* basePath) {
-    rec = IesFileRecord();
-    if (withinMemory([&] { return readFile(rec, in, basePath); })) return true;
+    const auto read = [&] {
+        rec = IesFileRecord();  // whose empty lines take memory
+        return readFile(rec, in, basePath);
+    };
+    if (withinMemory(read)) return true;
     rec = IesFileRecord();
     return false;
 }

@@ -97,7 +97,7 @@ float evaluateWeb(const Web& web, float theta, float psi) {
 
     web.getCandelaBlock({j - 1, j + 2}, columns, block);
     float rows[4];
-    for (int k = 0; k < 4; ++k) rows[k] = catmullRom(block + 4 * k, u);
+    for (std::size_t k = 0; k < 4; ++k) rows[k] = catmullRom(block + 4 * k, u);
     return detail::asLight(catmullRom(rows, v));
 }
 

@@ -9,12 +9,6 @@ namespace {
 
 using Settings = Ov::NaturalLightSettings;
 
-/// A device whose source fails.
-class BrokenDevice : public Ov::RnMemoryBuffer {
-protected:
-    bool readMore() override { throw Ov::RnStreamEx::ExReadError("test", 7, "broken"); }
-};
-
 class LightForms : public Photo {
 protected:
     bool load(const std::string& bytes, Form form) { return Photo::load(*light, bytes, form); }
@@ -245,22 +239,13 @@ TEST_F(LightForms, FormsOfOtherReleases) {
     const std::string release2 = "Marovendel Natural Light Version 1, Release 2\n" + common + overrides;
     EXPECT_EQ(refusal(release2 + accuracy, Form::text).substr(0, 11), "12896 12921");
     EXPECT_EQ(refusal(release2 + "Sky Casts Shadows: no\n", Form::text).substr(0, 11), "12896 12924");
+    Ov::messageFile().setFileName(L"");
+    EXPECT_EQ(refusal("", Form::binary), "Message 12898.");
     for (const char version : {'\0', '\2'}) {
         light->setLatitude(3);
         EXPECT_TRUE(load({version, 0, 3, 0}, Form::binary));
         EXPECT_EQ(settings(), Settings());
     }
-}
-
-TEST_F(LightForms, FailuresOfTheStreamPassThrough) {
-    for (const Form form : {Form::text, Form::binary}) {
-        Ov::RnStream stream(Ov::rnCreate<BrokenDevice>().get(), form);
-        EXPECT_THROW(Ov::rnCast<Ov::RnPersistant>(light.get())->load(stream, 0, nullptr, nullptr),
-                     Ov::RnStreamEx::ExReadError);
-    }
-    EXPECT_EQ(log.take(), "");
-    Ov::messageFile().setFileName(L"");
-    EXPECT_EQ(refusal("", Form::binary), "Message 12898.");
 }
 
 }  // namespace
