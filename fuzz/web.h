@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/ies/photoWebIES.h"
 #include "components/photo/lid/component.h"
 #include "components/photo/nimb/photoWebNIMB.h"
@@ -78,15 +79,31 @@ inline std::vector<float> probes(AngleRange range) {
     return all;
 }
 
-inline void demandLight(const Ov::RnPhotoWebData& web, const Ov::RnIntensityDist& light) {
-    const auto isLight = [](float value) { return std::isfinite(value) && value >= 0; };
+inline void demandLight(const Ov::RnPhotoWebData& web, Ov::RnIntensityDist& light) {
+    std::vector<float> angles, vectors;
     for (const float theta : probes(web.getThetaRange()))
         for (const float psi : probes(web.getPsiRange())) {
-            demand(isLight(web.getIntensity(theta, psi)), "the web's light is finite");
-            demand(isLight(light.localIntensity(theta, psi)), "light is finite");
-            demand(isLight(light.intensity(theta, psi)), "light is finite in the host's frame");
-            demand(isLight(light.intensityAt({theta, psi, 1 - theta})), "light is finite in any direction");
+            angles.insert(angles.end(), {theta, psi});
+            vectors.insert(vectors.end(), {theta, psi, 1 - theta});
         }
+    // One by one and all at once.
+    const auto demandAll = [&](DirectionForm form, const std::vector<float>& directions, auto candela) {
+        const std::size_t count = angles.size() / 2, floats = directions.size() / count;
+        std::vector<float> together(count);
+        demand(getIntensities(&light, form, directions.data(), static_cast<std::int64_t>(count), together.data()),
+               "many directions are answered");
+        for (std::size_t k = 0; k < count; ++k) {
+            const float alone = candela(&directions[k * floats]);
+            demand(std::isfinite(alone) && alone >= 0, "light is finite");
+            demand(alone == together[k], "many directions are answered as one is");
+        }
+    };
+    demandAll(DirectionForm::localAngles, angles,
+              [&](const float* d) { return light.localIntensity(d[0], d[1]); });
+    demandAll(DirectionForm::angles, angles, [&](const float* d) { return light.intensity(d[0], d[1]); });
+    demandAll(DirectionForm::vectors, vectors, [&](const float* d) {
+        return light.intensityAt({d[0], d[1], d[2]});
+    });
 }
 
 /// The web that a format's builder imports, checked; null when it is refused.
