@@ -28,6 +28,12 @@ FileFormat* recognise(Ov::RnBufferedIO& io) {
     return first;
 }
 
+void visitAll(const FileFacts& facts, Ov::RnEnumerator<const FileFact&>& visitor) {
+    for (const auto& [key, text] : facts)
+        if (visitor.visit({key.c_str(), text.c_str()}) != Ov::RnEnum::goOn) return;
+    visitor.finish();
+}
+
 }  // namespace
 
 bool writeFile(const Ov::RnUid& classId, Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form,
@@ -49,10 +55,18 @@ bool readFileFacts(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t*
     FileFormat* const reader = format ? formatOf(builderTable().find(*format)) : recognise(io);
     FileFacts facts;
     if (!reader || !reader->readFacts(io, basePath, facts)) return false;
-    for (const auto& [key, text] : facts)
-        if (visitor.visit({key.c_str(), text.c_str()}) != Ov::RnEnum::goOn) return true;
-    visitor.finish();
+    visitAll(facts, visitor);
     return true;
+}
+
+Ov::RnRef<Ov::RnCastable> importWithFacts(Ov::RnBufferedIO& io, const Ov::RnUid& format, const wchar_t* name,
+                                          const wchar_t* basePath, Ov::RnEnumerator<const FileFact&>& visitor) {
+    FileFormat* const reader = formatOf(builderTable().find(format));
+    if (!reader) return {};
+    FileFacts facts;
+    auto web = reader->importWithFacts(io, name, basePath, facts);
+    visitAll(facts, visitor);
+    return web;
 }
 
 }  // namespace OvPhotometrics

@@ -23,5 +23,7 @@ inline constexpr auto& writeTbt = writeFileOf<classIds::tbtWeb>;
 
 bool readFileFacts(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t* basePath,
                    Ov::RnEnumerator<const FileFact&>& visitor);
+Ov::RnRef<Ov::RnCastable> importWithFacts(Ov::RnBufferedIO& io, const Ov::RnUid& format, const wchar_t* name,
+                                          const wchar_t* basePath, Ov::RnEnumerator<const FileFact&>& visitor);
 
 }  // namespace OvPhotometrics

@@ -24,6 +24,7 @@
     entry(437, writeNimb) \
     entry(438, writeTbt) \
     entry(439, getIntensities) \
-    entry(440, readFileFacts)
+    entry(440, readFileFacts) \
+    entry(441, importWithFacts)
 
 // clang-format on

@@ -21,7 +21,7 @@
 // Names are in the host's language; their texts are the module's, each valid until its function is called again.
 // The functions that give names take one caller at a time, the others any number.
 //
-// Files (435 to 438 and 440) and intensities (439) are described where they stand below.
+// Files (435 to 438, 440 and 441) and intensities (439) are described where they stand below.
 
 namespace OvPhotometrics {
 
@@ -141,6 +141,14 @@ struct NumberedFunctions {
     /// known format. One caller at a time.
     bool (*readFileFacts)(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t* basePath,
                           Ov::RnEnumerator<const FileFact&>& visitor);
+
+    /// Both in one reading: imports a web as the builder of the web class `format` does, which raises
+    /// RnStreamEx::ExReadError where it refuses, and then visits what the file says beyond it. `name`, which
+    /// becomes the web's, and `basePath` may be null. Null, and nothing has been read, where `format` is no web
+    /// class. One caller at a time.
+    Ov::RnRef<Ov::RnCastable> (*importWithFacts)(Ov::RnBufferedIO& io, const Ov::RnUid& format,
+                                                 const wchar_t* name, const wchar_t* basePath,
+                                                 Ov::RnEnumerator<const FileFact&>& visitor);
 };
 
 /// The functions of a loaded module (an Ov::Module); null where it has none.

@@ -42,8 +42,8 @@ Json convert(const Conversion& conversion, const HostSession& session, const Rea
     if (!source.format.empty()) report["format"] = source.format;
     if (!source.web) return report;
 
-    const std::vector<Fact> facts = readFacts(session, source);
-    const WebLight light = lightOf(session, source, facts);
+    const std::vector<Fact>& facts = source.facts;
+    const WebLight light = lightOf(session, source);
     std::vector<std::string> messages;
     const auto made = writeAnew(conversion, session, source, facts, light, messages);
     if (made && made->light) {

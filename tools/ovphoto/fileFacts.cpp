@@ -2,9 +2,7 @@
 
 #include <algorithm>
 
-#include "host/componentManager/devices.h"
 #include "host/platform/path.h"
-#include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
@@ -12,18 +10,6 @@ namespace OvTool {
 using namespace Ov;
 
 namespace {
-
-std::vector<Fact> readFrom(const HostSession& session, const ReadResult& result, RnBufferedIO& io) {
-    std::vector<std::string> knownMessages;  // from the first reading
-    const MessageCollector collector(knownMessages);
-    std::vector<Fact> facts;
-    auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&facts](const OvPhotometrics::FileFact& fact) {
-        facts.push_back({fact.key, fact.text});
-    });
-    const std::wstring folder = pathFolder(fromUtf8(result.file));
-    session.functions().readFileFacts(io, &result.classId, folder.c_str(), collect);
-    return facts;
-}
 
 /// Header keywords are in capitals.
 bool isKeyword(std::wstring_view key) {
@@ -77,16 +63,6 @@ std::wstring labelsOf(const std::vector<Fact>& facts) {
 }
 
 }  // namespace
-
-std::vector<Fact> readFacts(const HostSession& session, const ReadResult& result) {
-    std::string error;
-    const RnRef<RnBufferedIO> io = openFile(result.file, error);
-    return io ? readFrom(session, result, *io) : std::vector<Fact>();
-}
-
-std::vector<Fact> readFacts(const HostSession& session, const ReadResult& result, const std::string& bytes) {
-    return readFrom(session, result, *rnCreate<RnMemoryBuffer>(bytes));
-}
 
 const std::wstring* findFact(const std::vector<Fact>& facts, std::wstring_view key) {
     const auto found = std::find_if(facts.begin(), facts.end(), [&](const Fact& fact) { return fact.key == key; });

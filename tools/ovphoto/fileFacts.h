@@ -8,19 +8,9 @@
 #include "tools/ovphoto/hostSession.h"
 #include "tools/ovphoto/json.h"
 
-// What files say beyond their webs; the keys are listed in ovphoto/numberedExports.h.
+// What files say beyond their webs.
 
 namespace OvTool {
-
-struct Fact {
-    std::wstring key;
-    std::wstring text;
-};
-
-/// The facts of a file that was read, in the order of the file; none when it cannot be read again.
-std::vector<Fact> readFacts(const HostSession& session, const ReadResult& result);
-/// The same of bytes that were read.
-std::vector<Fact> readFacts(const HostSession& session, const ReadResult& result, const std::string& bytes);
 
 /// The text of the first fact of a key, or null; and that text as a number.
 const std::wstring* findFact(const std::vector<Fact>& facts, std::wstring_view key);

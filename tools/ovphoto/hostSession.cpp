@@ -106,8 +106,11 @@ void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string
     result.format = formatName(*builder);
     result.classId = builder->getClassId();
     const std::wstring path = fromUtf8(result.file);
-    const auto importer = rnCast<RnImportBuilder>(builder.get());
-    const auto object = importer->import(&io, pathStem(path).c_str(), pathFolder(path).c_str());
+    auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&result](const OvPhotometrics::FileFact& fact) {
+        result.facts.push_back({fact.key, fact.text});
+    });
+    const auto object =
+        functions().importWithFacts(io, result.classId, pathStem(path).c_str(), pathFolder(path).c_str(), collect);
     result.web = rnCast<RnPhotoWebData>(object.get());
 }
 

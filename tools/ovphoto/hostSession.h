@@ -10,12 +10,19 @@
 
 namespace OvTool {
 
+/// One thing that a file says beyond its web; the keys are listed in ovphoto/numberedExports.h.
+struct Fact {
+    std::wstring key;
+    std::wstring text;
+};
+
 /// What became of a file that was read. Texts are UTF-8, but for file names, which may hold any bytes.
 struct ReadResult {
     std::string file;                   // as the user gave it
     std::string format;                 // name of the reader's format ("IES"); empty when none was found
     Ov::RnUid classId{};                // of the format's webs
     Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
+    std::vector<Fact> facts;            // in the order of the file; none when it was refused
     std::vector<std::string> messages;  // texts that the reader reported, in order
     std::string error;                  // what the tool itself has to say; empty when there is a web
 

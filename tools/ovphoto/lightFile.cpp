@@ -47,8 +47,8 @@ std::optional<std::string> fileBytes(const HostSession& session, const TargetFor
 
 }  // namespace
 
-WebLight lightOf(const HostSession& session, const ReadResult& source, const std::vector<Fact>& facts) {
-    return scaledLight(session, source.web, candelaUnit(source.format, facts), 1);
+WebLight lightOf(const HostSession& session, const ReadResult& source) {
+    return scaledLight(session, source.web, candelaUnit(source.format, source.facts), 1);
 }
 
 std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const TargetFormat& target,
@@ -57,9 +57,9 @@ std::optional<LightFile> makeFile(const HostSession& session, const std::string&
     auto bytes = fileBytes(session, target, light, form, facts, messages);
     if (!bytes) return {};
     LightFile made{std::move(*bytes), {}, {}, {}};
-    const ReadResult again = session.readBytes(made.bytes, file, target.name);
+    ReadResult again = session.readBytes(made.bytes, file, target.name);
     if (again.web) {
-        made.facts = readFacts(session, again, made.bytes);
+        made.facts = std::move(again.facts);
         // NIMB files hold candela, and so a flux, for 1000 lumens, but not of how many.
         const float thousands = again.format == "NIMB" && light.getFlux() > 0 ? light.getFlux() / 1000 : 1;
         made.light = scaledLight(session, again.web, thousands * candelaUnit(again.format, made.facts), thousands);

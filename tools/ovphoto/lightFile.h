@@ -16,7 +16,7 @@ namespace OvTool {
 using WebLight = Ov::RnRef<Ov::RnWebIntensityDist>;
 
 /// The light of a file that was read. TBT files hold candela for a reference flux.
-WebLight lightOf(const HostSession& session, const ReadResult& source, const std::vector<Fact>& facts);
+WebLight lightOf(const HostSession& session, const ReadResult& source);
 
 /// A light as a file that is not yet in its place.
 struct LightFile {

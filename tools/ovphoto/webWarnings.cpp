@@ -35,9 +35,9 @@ const char* zeroFactor(const std::vector<Fact>& facts) {
     return nullptr;
 }
 
-std::optional<std::string> darkness(const ReadResult& result, const std::vector<Fact>& facts) {
+std::optional<std::string> darkness(const ReadResult& result) {
     if (result.web->getMaxCandela() > 0) return {};
-    const char* factor = result.format == "IES" ? zeroFactor(facts) : nullptr;
+    const char* factor = result.format == "IES" ? zeroFactor(result.facts) : nullptr;
     if (factor) return std::string("all values are 0, because the ") + factor + " is 0";
     return "no value is above 0: the light is dark";
 }
@@ -75,15 +75,15 @@ std::optional<std::string> earlyEnd(const RnPhotoWebData& web) {
 
 }  // namespace
 
-std::vector<std::string> webWarnings(const ReadResult& result, const std::vector<Fact>& facts) {
+std::vector<std::string> webWarnings(const ReadResult& result) {
     std::vector<std::string> warnings;
     const auto add = [&warnings](std::optional<std::string> warning) {
         if (warning) warnings.push_back(std::move(*warning));
     };
     add(negativeValues(*result.web));
-    add(darkness(result, facts));
-    if (hasTilt(facts)) add("the tilt data is read but not applied");
-    if (isUnturnedTypeB(*result.web, facts))
+    add(darkness(result));
+    if (hasTilt(result.facts)) add("the tilt data is read but not applied");
+    if (isUnturnedTypeB(*result.web, result.facts))
         add("type B with horizontal angles from 0 stays unturned: its axis lies at the host's +X, not at -Y");
     add(earlyEnd(*result.web));
     return warnings;

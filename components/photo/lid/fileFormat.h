@@ -12,6 +12,9 @@ public:
     virtual bool recognises(Ov::RnBufferedIO& io) = 0;
     /// Adds what a file says beyond its web. False after the messages of its reader.
     virtual bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath, FileFacts& facts) = 0;
+    /// As a builder's `import`, and adds what the file says beyond its web.
+    virtual Ov::RnRef<Ov::RnCastable> importWithFacts(Ov::RnBufferedIO& io, const wchar_t* name,
+                                                      const wchar_t* basePath, FileFacts& facts) = 0;
     /// False, and nothing has been written, after messages.
     virtual bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) = 0;
 

@@ -59,6 +59,14 @@ bool recordToWeb(const typename Format::Record& record, typename Format::Web& we
         return Format::toWeb(record, web, true, name);
 }
 
+/// Reads a text into `record` and makes it the content of `web`. Raises ExReadError where either is refused.
+template <class Format>
+void loadWeb(typename Format::Record& record, Ov::RnStream& in, typename Format::Web& web, const wchar_t* name,
+             const wchar_t* basePath) {
+    if (!readRecord<Format>(record, in, basePath) || !recordToWeb<Format>(record, web, name, basePath))
+        throw Ov::RnStreamEx::ExReadError(Format::source, Format::loadLine, Format::streamName);
+}
+
 /// Base of a format's web class `Self`.
 template <class Self, class Format>
 class PhotoWebOf : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData,
@@ -94,9 +102,7 @@ public:
 
     bool load(Ov::RnStream& in, int, const wchar_t* name, const wchar_t* basePath) override {
         typename Format::Record record;
-        if (!readRecord<Format>(record, in, basePath) ||
-            !recordToWeb<Format>(record, this->data(), name, basePath))
-            throw Ov::RnStreamEx::ExReadError(Format::source, Format::loadLine, Format::streamName);
+        loadWeb<Format>(record, in, this->data(), name, basePath);
         return true;
     }
 };
@@ -136,6 +142,16 @@ public:
         if (!readRecord<Format>(record, stream, basePath)) return false;
         Format::describe(record, facts);
         return true;
+    }
+
+    RnRef<Ov::RnCastable> importWithFacts(Ov::RnBufferedIO& io, const wchar_t* name, const wchar_t* basePath,
+                                          FileFacts& facts) override {
+        Ov::RnStream stream(&io, Ov::RnStream::Form::text);
+        Record record;
+        const auto web = Ov::rnCreate<typename Format::Web>();
+        loadWeb<Format>(record, stream, *web, name, basePath);
+        Format::describe(record, facts);
+        return web;
     }
 
     bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) override {

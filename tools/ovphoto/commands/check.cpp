@@ -79,8 +79,7 @@ void checkFile(const FoundFile& file, const CheckOptions& options, const HostSes
         ++totals.skipped;
         return;
     }
-    const std::vector<std::string> warnings =
-        result.web ? webWarnings(result, readFacts(session, result)) : std::vector<std::string>();
+    const std::vector<std::string> warnings = result.web ? webWarnings(result) : std::vector<std::string>();
     ++(result.web ? totals.well : totals.refused);
     if (!warnings.empty()) ++totals.withWarnings;
     progress.clear();

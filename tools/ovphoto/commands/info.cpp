@@ -78,7 +78,7 @@ const char* unitOf(const ReadResult& result) {
     return result.format == "NIMB" || result.format == "TBT" ? "cd/klm" : "cd";
 }
 
-void printJson(const ReadResult& result, const HostSession& session, bool withValues) {
+void printJson(const ReadResult& result, bool withValues) {
     const RnPhotoWebData& web = *result.web;
     Json object{{"file", result.file},
                 {"format", result.format},
@@ -93,7 +93,7 @@ void printJson(const ReadResult& result, const HostSession& session, bool withVa
                 {"psiTruncated", web.isPsiTruncated()},
                 {"files", filesOf(web)},
                 {"unit", unitOf(result)},
-                {"facts", factsToJson(readFacts(session, result))}};
+                {"facts", factsToJson(result.facts)}};
     if (withValues) object["values"] = valuesOf(web);
     printLine(object);
 }
@@ -165,7 +165,7 @@ void printText(const ReadResult& result, const HostSession& session) {
     std::cout << result.file << '\n';
     table.print(2);
     printBeamAngles(web, *session.distribute(*result.web, web.getLumens()));
-    printFacts(readFacts(session, result));
+    printFacts(result.facts);
 }
 
 int runInfo(const InfoOptions& options, const HostSession& session) {
@@ -178,7 +178,7 @@ int runInfo(const InfoOptions& options, const HostSession& session) {
             status = exitFailed;
             if (options.json) printRefusal(result);
         } else if (options.json) {
-            printJson(result, session, options.values);
+            printJson(result, options.values);
         } else {
             std::cout << separator;
             printText(result, session);

@@ -40,8 +40,7 @@ OvPlot::Subject subjectOf(const DrawnFile& file, const WebLight& light, const st
 
 std::optional<DrawnFile> drawnFile(const HostSession& session, ReadResult& result) {
     if (!result.web) return {};
-    DrawnFile file{std::move(result), {}, {}, {}};
-    file.facts = readFacts(session, file.source);
+    DrawnFile file{std::move(result), {}, {}};
     file.light = session.distribute(*file.source.web, file.source.web->getLumens());
     file.angles = beamAngles(*file.light);
     return file;
@@ -49,7 +48,7 @@ std::optional<DrawnFile> drawnFile(const HostSession& session, ReadResult& resul
 
 std::string titleOf(const DrawnFile& file) {
     for (const wchar_t* key : {L"LUMINAIRE", L"title", L"label 1", L"line 1", L"LUMCAT", L"line"}) {
-        const std::wstring* text = findFact(file.facts, key);
+        const std::wstring* text = findFact(file.source.facts, key);
         if (text && text->find_first_not_of(L' ') != std::wstring::npos) return Ov::toUtf8(*text);
     }
     return Ov::toUtf8(file.source.web->getName());
@@ -77,7 +76,7 @@ OvPlot::Diagram diagramOf(const HostSession& session, const std::vector<DrawnFil
 OvPlot::Diagram trueDiagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights) {
     OvPlot::Diagram diagram;
     diagram.unit = file.source.format == "NIMB" ? perKilolumen : candela;
-    lights.push_back(lightOf(session, file.source, file.facts));
+    lights.push_back(lightOf(session, file.source));
     diagram.subjects.push_back(subjectOf(file, lights.back(), diagram.unit));
     diagram.title = diagram.subjects.front().name;
     return diagram;

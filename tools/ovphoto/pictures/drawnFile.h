@@ -9,7 +9,6 @@ namespace OvTool {
 /// A file that was read and is to be shown.
 struct DrawnFile {
     ReadResult source;  // with a web
-    std::vector<Fact> facts;
     std::vector<BeamAngles> angles;
     WebLight light;  // with the values of the file: candela, or candela per 1000 lm
 };
