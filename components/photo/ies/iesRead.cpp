@@ -51,13 +51,15 @@ bool readTiltFile(IesFileRecord& rec, const wchar_t* basePath) {
         reportMessage(messages::tiltFileNotFound, rec.tiltFile.c_str());
         return false;
     }
-    const auto file = Ov::openInputFile(path.c_str());
-    if (!file) {
-        reportMessage(messages::tiltFileNotOpened, path.c_str());
-        return false;
+    try {
+        if (const auto file = Ov::openInputFile(path.c_str())) {
+            Ov::RnStream stream(file.get(), Ov::RnStream::Form::text);
+            return iesReadTilt(rec.tilt, stream);
+        }
+    } catch (const Ov::RnStreamEx::ExReadError&) {  // it is not the device of the stream that fails
     }
-    Ov::RnStream stream(file.get(), Ov::RnStream::Form::text);
-    return iesReadTilt(rec.tilt, stream);
+    reportMessage(messages::tiltFileNotOpened, path.c_str());
+    return false;
 }
 
 bool readTiltValue(IesFileRecord& rec, Ov::RnStream& in, const std::wstring& value, const wchar_t* basePath) {
