@@ -100,4 +100,51 @@ TEST_F(ToolPlot, NamesOfAnyBytesAreDrawn) {
     EXPECT_THAT(bytes("b.svg"), testing::HasSubstr("<title>&lt;script&gt;alert(1)"));
 }
 
+TEST_F(ToolPlot, AReportIsOnePageOrAnIndexWithPages) {
+    folder.write("lamps/deep/<i>.ies", IesFile().text());
+    folder.write("lamps/readme.txt", "no light");
+    const ToolResult one = runTool("report good.ies -o good.html", folder);
+    EXPECT_EQ(one.status, 0) << one.err;
+    EXPECT_THAT(bytes("good.html"), testing::HasSubstr("Nothing to report"));
+    const ToolResult many = runTool("report lamps good.ies -o all.HTML", folder);
+    EXPECT_TRUE(many.status == 0 && many.says("all.HTML: 2 files, 0 refused")) << many.out << many.err;
+    EXPECT_THAT(bytes("all.HTML"), testing::HasSubstr("href=\"all-pages/0001-i-.html\">lamps/deep/&lt;i&gt;.ies"));
+    EXPECT_THAT(bytes("all-pages/0002-good.html"), testing::HasSubstr("href=\"../all.HTML\""));
+    // A file that is refused has its row, and stops nothing.
+    folder.write("lamps/bad.ies", "IESNA91\nTILT=NONE\nx\n");
+    EXPECT_EQ(runTool("report lamps -o all.html", folder).status, 1);
+    EXPECT_THAT(bytes("all.html"), testing::HasSubstr("class=\"refused\""));
+}
+
+TEST_F(ToolPlot, AReportThatCannotBeMadeLeavesNothing) {
+    folder.write("old.html", "old");
+    folder.write("taken-pages", "a file");
+    std::filesystem::create_directories(folder.path() / "empty");
+    std::filesystem::create_directories(folder.path() / "folder.html");
+    const std::size_t before = fileCount();
+    const struct {
+        int status;
+        const char* arguments;
+        const char* told;
+    } cases[] = {
+        {2, "-o a.html", "PATH"},
+        {2, "good.ies", "--out"},
+        {2, "good.ies -o a.pdf", "a.pdf: does not end in .html"},
+        {1, "bad.ies -o old.html", "bad.ies: "},
+        {1, "gone.ies -o old.html", "cannot be opened"},
+        {1, "good.ies -o none/a.html", "none/a.html: cannot be written"},
+        {1, "empty -o old.html", "empty: no photometric file"},
+        {1, "good.ies good.ies -o none/a.html", "none/a-pages cannot be made"},
+        {1, "good.ies good.ies -o folder.html", "is a folder"},
+        {1, "good.ies good.ies -o taken.html", "taken-pages cannot be made"},
+    };
+    for (const auto& c : cases) {
+        const ToolResult result = runTool(std::string("report ") + c.arguments, folder);
+        EXPECT_EQ(result.status, c.status) << c.arguments << result.err;
+        EXPECT_TRUE(result.says(c.told)) << c.arguments << result.err;
+    }
+    EXPECT_EQ(fileCount(), before);
+    EXPECT_EQ(bytes("old.html"), "old");
+}
+
 }  // namespace

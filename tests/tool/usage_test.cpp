@@ -44,7 +44,8 @@ TEST_F(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
                      "make spotlight a.ies --falloff 0|from 0.11 to 90 ",
                      "make isotropic a.ies --candela 1 --flux 1|--flux",
                      "make isotropic a.ies --flux 0|'0'"});
-    if (windowsTool()) expectStatus(2, {"plot good.ies -o a.svg|no pictures", "plot --sky -o a.svg|no pictures"});
+    if (windowsTool())
+        expectStatus(2, {"plot good.ies -o a.svg|no pictures", "report good.ies -o a.html|no pictures"});
     expectStatus(0, {"--help|Exit status", "intensity --help|--frame", "--version|ovphoto 0.",
                      "info good.ies --as Ies|good"});
     expectStatus(1, {"info good.ies --module ./none.so|none.so"});

@@ -17,6 +17,7 @@ constexpr Command allCommands[] = {
     {"make", "Write an isotropic, diffuse or spotlight distribution as a photometric file", declareMake},
     {"check", "Read files and folders and list their faults", declareCheck},
     {"plot", "Draw a diagram of photometric files, the sky, or the sun's paths", declarePlot},
+    {"report", "Write a page about a photometric file, or an index of many", declareReport},
     {"sun", "Show where the sun stands and what light it and the sky give", declareSun},
     {"sky", "Show the sky's luminance in a direction, or its light on a surface", declareSky},
     {"settings", "Show or write saved settings of natural light", declareSettings},

@@ -5,6 +5,7 @@
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/webTexts.h"
 
 namespace OvTool {
 
@@ -36,6 +37,17 @@ OvPlot::Subject subjectOf(const DrawnFile& file, const WebLight& light, const st
     return subject;
 }
 
+bool holdsPerKilolumen(const DrawnFile& file) { return unitOf(file.source) == std::string_view(perKilolumen); }
+
+/// Adds a file's light in the unit of the diagram.
+void addSubject(OvPlot::Diagram& diagram, const HostSession& session, const DrawnFile& file,
+                std::vector<WebLight>& lights) {
+    const bool converted = diagram.unit == perKilolumen && !holdsPerKilolumen(file);
+    lights.push_back(converted ? session.distribute(*file.source.web, 1000) : file.light);
+    diagram.subjects.push_back(subjectOf(file, lights.back(), diagram.unit));
+    diagram.title = diagram.subjects.front().name;
+}
+
 }  // namespace
 
 std::optional<DrawnFile> drawnFile(const HostSession& session, ReadResult& result) {
@@ -54,22 +66,19 @@ std::string titleOf(const DrawnFile& file) {
     return Ov::toUtf8(file.source.web->getName());
 }
 
-bool holdsPerKilolumen(const DrawnFile& file) {
-    return file.source.format == "NIMB" || file.source.format == "TBT";
+OvPlot::Diagram diagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights) {
+    OvPlot::Diagram diagram;
+    diagram.unit = unitOf(file.source);
+    addSubject(diagram, session, file, lights);
+    return diagram;
 }
 
 OvPlot::Diagram diagramOf(const HostSession& session, const std::vector<DrawnFile>& files,
                           std::vector<WebLight>& lights) {
-    const bool common = std::any_of(files.begin(), files.end(), holdsPerKilolumen);
     OvPlot::Diagram diagram;
-    diagram.unit = common ? perKilolumen : candela;
-    for (const DrawnFile& file : files) {
-        const bool converted = common && !holdsPerKilolumen(file);
-        lights.push_back(converted ? session.distribute(*file.source.web, 1000) : file.light);
-        diagram.subjects.push_back(subjectOf(file, lights.back(), diagram.unit));
-    }
-    diagram.title =
-        files.size() == 1 ? diagram.subjects.front().name : std::to_string(files.size()) + " luminaires";
+    diagram.unit = std::any_of(files.begin(), files.end(), holdsPerKilolumen) ? perKilolumen : candela;
+    for (const DrawnFile& file : files) addSubject(diagram, session, file, lights);
+    if (files.size() > 1) diagram.title = std::to_string(files.size()) + " luminaires";
     return diagram;
 }
 

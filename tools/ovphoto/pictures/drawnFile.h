@@ -19,13 +19,13 @@ std::optional<DrawnFile> drawnFile(const HostSession& session, ReadResult& resul
 /// What the luminaire is called in the file, else the file's name.
 std::string titleOf(const DrawnFile& file);
 
-/// Whether the values of the files' format are candela per 1000 lm, not candela.
-bool holdsPerKilolumen(const DrawnFile& file);
-
-/// The diagram of files' lights: in candela or, where a file holds no candela, all of them per 1000 lm. It refers
-/// to `lights`, which it adds to.
+/// @{
+/// The diagram of one file's light, or of several: in candela or, where a file holds none, all of them per 1000
+/// lm. It refers to `lights`, which it adds to.
+OvPlot::Diagram diagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights);
 OvPlot::Diagram diagramOf(const HostSession& session, const std::vector<DrawnFile>& files,
                           std::vector<WebLight>& lights);
+/// @}
 /// The same of one file in candela, as illuminances need them; NIMB files hold none.
 OvPlot::Diagram trueDiagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights);
 

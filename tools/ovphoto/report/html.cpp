@@ -1,0 +1,59 @@
+#include "tools/ovphoto/report/html.h"
+
+#include "tools/ovphoto/report/assets.h"
+
+namespace OvTool {
+
+const std::string_view pageScript = pageScriptText;
+const std::string_view indexScript = indexScriptText;
+
+namespace {
+
+void replaceAll(std::string& text, const std::string& from, const std::string& to) {
+    for (std::size_t at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
+        text.replace(at, from.size(), to);
+}
+
+}  // namespace
+
+std::string htmlPage(const std::string& title, const std::string& body, std::string_view script) {
+    return "<!doctype html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n"
+           "<meta name=\"viewport\" content=\"width=device-width, initial-scale=1\">\n"
+           "<meta http-equiv=\"Content-Security-Policy\" content=\"default-src 'none'; img-src data:; "
+           "style-src 'unsafe-inline'; script-src 'unsafe-inline'\">\n"
+           "<meta name=\"color-scheme\" content=\"light dark\">\n<link rel=\"icon\" href=\"data:,\">\n<title>" +
+           escaped(title) + "</title>\n<style>\n" + styleText + "</style>\n</head>\n<body>\n" + body +
+           "<script>\n" + std::string(script) + "</script>\n</body>\n</html>\n";
+}
+
+std::string factTable(const std::string& caption, const std::vector<std::pair<std::string, std::string>>& rows) {
+    std::string table = "<table class=\"facts\"><caption>" + escaped(caption) + "</caption><tbody>\n";
+    for (const auto& [name, text] : rows)
+        table += "<tr><th scope=\"row\">" + escaped(name) + "</th><td>" + escaped(text) + "</td></tr>\n";
+    return table + "</tbody></table>\n";
+}
+
+std::string inlineSvg(std::string svg, const std::string& prefix) {
+    svg.erase(0, svg.find("<svg"));
+    svg.insert(4, " role=\"img\" class=\"diagram\"");
+    for (const std::string reference : {" id=\"", "href=\"#", "url(#"})
+        replaceAll(svg, reference, reference + prefix);
+    return svg;
+}
+
+std::string urlPart(std::string_view text) {
+    static constexpr std::string_view plain = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789-_.";
+    static constexpr char digits[] = "0123456789ABCDEF";
+    std::string url;
+    for (const char c : text) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (plain.find(c) != std::string_view::npos) {
+            url += c;
+        } else {
+            url += {'%', digits[byte >> 4], digits[byte & 15]};
+        }
+    }
+    return url;
+}
+
+}  // namespace OvTool

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+#include "tools/plot/picture.h"
+
+// Pieces of pages. What comes from files passes `escaped` on its way in.
+
+namespace OvTool {
+
+using OvPlot::escaped;
+
+/// A whole page that needs nothing from outside, and is told to ask for nothing. `title` is escaped here, `body`
+/// is markup.
+std::string htmlPage(const std::string& title, const std::string& body, std::string_view script);
+
+/// A table of two columns with a caption; texts are escaped here.
+std::string factTable(const std::string& caption, const std::vector<std::pair<std::string, std::string>>& rows);
+
+/// A picture that Cairo wrote as SVG, as part of a page: `prefix` keeps its ids from those of others.
+std::string inlineSvg(std::string svg, const std::string& prefix);
+
+/// A text as part of a relative link.
+std::string urlPart(std::string_view text);
+
+/// Of pages about files and of indices.
+extern const std::string_view pageScript;
+extern const std::string_view indexScript;
+
+}  // namespace OvTool

@@ -1,0 +1,166 @@
+#include "tools/ovphoto/report/page.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "host/platform/path.h"
+#include "tools/ovphoto/json.h"
+#include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/report/html.h"
+#include "tools/ovphoto/webTexts.h"
+#include "tools/ovphoto/webWarnings.h"
+#include "tools/plot/solid.h"
+
+namespace OvTool {
+
+using OvPlot::Canvas;
+
+namespace {
+
+constexpr int columnsEach = 12;  // of a candela table: as many as fit on A4
+
+std::string drawn(const OvPlot::Diagram& diagram, void (*draw)(Canvas&, const OvPlot::Diagram&),
+                  const char* what) {
+    const std::string title = std::string(what) + ": " + diagram.title;
+    const std::string svg = OvPlot::drawPicture(OvPlot::PictureFormat::svg, {}, OvPlot::lightPalette(), title,
+                                                [&](Canvas& canvas) { draw(canvas, diagram); });
+    return inlineSvg(svg, std::string(what, 4) + "-");
+}
+
+std::string figure(const OvPlot::Diagram& diagram, void (*draw)(Canvas&, const OvPlot::Diagram&),
+                   const char* what) {
+    return "<figure>" + drawn(diagram, draw, what) + "<figcaption>" + what + "</figcaption></figure>\n";
+}
+
+std::string keyFigures(const OvPlot::Subject& subject) {
+    std::string list = "<dl class=\"key\">\n";
+    for (const std::string& note : subject.notes) {
+        const std::size_t blank = note.find(' ');
+        list += "<div><dt>" + escaped(note.substr(0, blank)) + "</dt><dd>" + escaped(note.substr(blank + 1)) +
+                "</dd></div>\n";
+    }
+    return list + "</dl>\n";
+}
+
+/// What the script turns: radii in thousandths, and where axes leave the solid.
+std::string meshJson(const OvPlot::Subject& subject) {
+    const OvPlot::SolidMesh mesh = OvPlot::solidMesh(subject, 32, 36);
+    std::vector<int> radii;
+    for (const double radius : mesh.radii) radii.push_back(static_cast<int>(std::lround(1000 * radius)));
+    Json axes = Json::array();
+    const auto addAxis = [&](const char* name, double gamma, double c) {
+        const double from = mesh.peak > 0 ? subject.intensity(gamma, c) / mesh.peak : 0;
+        axes.push_back({name, static_cast<float>(gamma), static_cast<float>(c), static_cast<float>(from)});
+    };
+    const bool aimed = subject.frame.aimed;
+    addAxis(aimed ? "right" : "C0", 90, 0);
+    addAxis(aimed ? "up" : "C90", 90, 90);
+    addAxis(aimed ? "left" : "C180", 90, 180);
+    addAxis(aimed ? "down" : "C270", 90, 270);
+    addAxis(aimed ? "axis" : "\u03b3 0\u00b0", 0, 0);
+    return Json{{"gammas", mesh.gammas}, {"planes", mesh.planes}, {"radii", radii}, {"axes", axes}}.dump();
+}
+
+std::string solidFigure(const OvPlot::Diagram& diagram) {
+    return "<figure id=\"solid\">" + drawn(diagram, OvPlot::drawSolid, "Photometric solid") +
+           "<figcaption>Photometric solid</figcaption></figure>\n<script type=\"application/json\" id=\"mesh\">" +
+           meshJson(diagram.subjects.front()) + "</script>\n";
+}
+
+std::string anglesText(const std::optional<OvPlot::AngleSpan>& angle) {
+    return angle ? fixedNumber(angle->width(), 1) : "\u2013";
+}
+
+std::string beamTable(const DrawnFile& file) {
+    std::string table =
+        "<table><caption>Beam angles in degrees</caption><thead><tr><th scope=\"col\">Plane</th>"
+        "<th scope=\"col\">Beam, 50 %</th><th scope=\"col\">Field, 10 %</th></tr></thead><tbody>\n";
+    for (const BeamAngles& angles : file.angles)
+        table += std::string("<tr><th scope=\"row\">") + angles.plane + "</th><td>" + anglesText(angles.beam) +
+                 "</td><td>" + anglesText(angles.field) + "</td></tr>\n";
+    return table + "</tbody></table>\n";
+}
+
+std::string factsSection(const DrawnFile& file) {
+    std::vector<std::pair<std::string, std::string>> facts;
+    for (const Fact& fact : file.source.facts) facts.emplace_back(Ov::toUtf8(fact.key), Ov::toUtf8(fact.text));
+    return "<section><h2>Facts</h2><div class=\"columns\">\n" +
+           factTable("Light distribution", webTexts(file.source)) + beamTable(file) +
+           (facts.empty() ? "" : factTable("In the file", facts)) + "</div></section>\n";
+}
+
+std::string checkSection(const std::vector<std::string>& remarks) {
+    std::string section = "<section><h2>Check</h2>\n";
+    if (remarks.empty()) return section + "<p>Nothing to report.</p></section>\n";
+    section += "<ul>\n";
+    for (const std::string& remark : remarks) section += "<li>" + escaped(remark) + "</li>\n";
+    return section + "</ul></section>\n";
+}
+
+/// The values of some of the planes, as they stand in the file.
+std::string candelaTable(const Ov::RnPhotoWebData& web, int first, int last, const std::string& unit) {
+    std::string table = "<table class=\"candela\"><caption>" + unit + ", psi " +
+                        shortNumber(toDegrees(web.getPsi(first))) +
+                        (last > first ? " to " + shortNumber(toDegrees(web.getPsi(last))) : "") +
+                        " deg</caption><thead><tr><th scope=\"col\">theta \\ psi</th>";
+    for (int j = first; j <= last; ++j)
+        table += "<th scope=\"col\">" + shortNumber(toDegrees(web.getPsi(j))) + "</th>";
+    table += "</tr></thead><tbody>\n";
+    for (int i = 0; i < web.getThetaCount(); ++i) {
+        table += "<tr><th scope=\"row\">" + shortNumber(toDegrees(web.getTheta(i))) + "</th>";
+        for (int j = first; j <= last; ++j)
+            table += "<td>" + shortNumber(double{web.getCandela(j, i)} * web.getMaxCandela()) + "</td>";
+        table += "</tr>\n";
+    }
+    return table + "</tbody></table>\n";
+}
+
+std::string candelaSection(const DrawnFile& file) {
+    const Ov::RnPhotoWebData& web = *file.source.web;
+    std::string section =
+        "<section><h2 id=\"candela\">Luminous intensities</h2>\n"
+        "<p class=\"muted\">At the angles of the file, degrees: theta from the axis, psi around it.</p>\n"
+        "<div class=\"scroll\" role=\"region\" aria-labelledby=\"candela\" tabindex=\"0\">\n";
+    for (int first = 0; first < web.getPsiCount(); first += columnsEach)
+        section +=
+            candelaTable(web, first, std::min(first + columnsEach, web.getPsiCount()) - 1, unitOf(file.source));
+    return section + "</div></section>\n";
+}
+
+}  // namespace
+
+Datasheet datasheetOf(const HostSession& session, DrawnFile file) {
+    Datasheet sheet{std::move(file), {}, {}, {}, {}};
+    sheet.remarks = sheet.file.source.reasons();
+    const auto warnings = webWarnings(sheet.file.source);
+    sheet.remarks.insert(sheet.remarks.end(), warnings.begin(), warnings.end());
+    sheet.intensities = diagramOf(session, sheet.file, sheet.lights);
+    sheet.illuminances = trueDiagramOf(session, sheet.file, sheet.lights);
+    return sheet;
+}
+
+std::string datasheetPage(const Datasheet& sheet, const std::string& indexUrl) {
+    const OvPlot::Diagram& diagram = sheet.intensities;
+    std::string body;
+    if (!indexUrl.empty()) body += "<p class=\"back\"><a href=\"" + indexUrl + "\">All files</a></p>\n";
+    body += "<header><h1>" + escaped(diagram.title) + "</h1>\n<p class=\"muted\">" +
+            escaped(sheet.file.source.file) + "</p></header>\n<main>\n" + keyFigures(diagram.subjects.front()) +
+            "<section><h2>Diagrams</h2><div class=\"diagrams\">\n" +
+            figure(diagram, OvPlot::drawPolar, "Polar diagram") +
+            figure(diagram, OvPlot::drawCartesian, "Linear diagram") +
+            figure(sheet.illuminances, OvPlot::drawCone, "Cone diagram") +
+            figure(sheet.illuminances, OvPlot::drawIsolux, "Isolux lines") + solidFigure(diagram) +
+            "</div></section>\n" + factsSection(sheet.file) + checkSection(sheet.remarks) +
+            candelaSection(sheet.file) + "</main>\n";
+    return htmlPage(diagram.title, body, pageScript);
+}
+
+std::string thumbnail(const Datasheet& sheet, const std::string& prefix) {
+    const OvPlot::Subject& subject = sheet.intensities.subjects.front();
+    return inlineSvg(
+        OvPlot::drawPicture(OvPlot::PictureFormat::svg, {100, 100}, OvPlot::lightPalette(), "Polar diagram",
+                            [&](Canvas& canvas) { OvPlot::drawThumbnail(canvas, subject); }),
+        prefix);
+}
+
+}  // namespace OvTool

@@ -1,0 +1,251 @@
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <deque>
+#include <filesystem>
+#include <future>
+#include <iostream>
+#include <thread>
+
+#include "host/platform/path.h"
+#include "tools/ovphoto/commands/pictureOptions.h"
+#include "tools/ovphoto/expandPaths.h"
+#include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/progress.h"
+#include "tools/ovphoto/report/html.h"
+#include "tools/ovphoto/report/page.h"
+#include "tools/ovphoto/webTexts.h"
+
+namespace OvTool {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+fs::path nativeOf(const std::string& path) { return Ov::nativePath(Ov::fromUtf8(path)); }
+
+int fail(const std::string& file, const std::string& error) {
+    std::cerr << file << ": " << error << '\n';
+    return exitFailed;
+}
+
+int reportOne(const ReportOptions& options, const HostSession& session) {
+    ReadResult result = session.read(options.paths.front(), options.as);
+    showReasons(result);
+    auto file = drawnFile(session, result);
+    if (!file) return exitFailed;
+    const std::string page = datasheetPage(datasheetOf(session, std::move(*file)), "");
+    const std::string error = writeFile(options.out, page);
+    return error.empty() ? exitWell : fail(options.out, error);
+}
+
+/// The pages of an index, in a folder beside it named for it. Unless they are kept, those that were written go
+/// again.
+class PageFolder {
+public:
+    explicit PageFolder(const std::string& index)
+        : _name(pathText(nativeOf(index).stem()) + "-pages"),
+          _path(nativeOf(index).parent_path() / nativeOf(_name)) {}
+    PageFolder(const PageFolder&) = delete;
+    PageFolder& operator=(const PageFolder&) = delete;
+    ~PageFolder() {
+        std::error_code ignored;
+        if (_kept) return;
+        for (const fs::path& page : _written) fs::remove(page, ignored);
+        if (_made) fs::remove(_path, ignored);  // when it is empty
+    }
+
+    /// Empty, or why there is no such folder.
+    std::string make() {
+        std::error_code error;
+        _made = fs::create_directory(_path, error);
+        if (!error && fs::is_directory(_path)) return {};
+        return "the folder " + pathText(_path) +
+               " cannot be made: " + (error ? error.message() : "a file has its name");
+    }
+    std::string write(const std::string& page, const std::string& html) {
+        const fs::path path = _path / nativeOf(page);
+        const std::string error = writeFile(pathText(path), html);
+        if (error.empty()) _written.push_back(path);
+        return error;
+    }
+    void keep() { _kept = true; }
+    std::string urlOf(const std::string& page) const { return urlPart(_name) + "/" + urlPart(page); }
+
+private:
+    std::string _name;
+    fs::path _path;
+    std::vector<fs::path> _written;
+    bool _made = false;
+    bool _kept = false;
+};
+
+struct Entry {
+    std::string row;
+    std::string pageName;
+    std::string page;  // empty for a file that was refused
+};
+
+std::string cell(const std::string& text) { return "<td>" + escaped(text) + "</td>"; }
+
+std::string numberCell(const std::optional<double>& value, const std::string& text) {
+    return "<td class=\"number\" data-value=\"" + (value ? shortNumber(*value) : "-1") + "\">" + escaped(text) +
+           "</td>";
+}
+
+std::string angleCell(const std::optional<OvPlot::AngleSpan>& angle) {
+    const auto width = angle ? std::optional(angle->width()) : std::nullopt;
+    return numberCell(width, width ? fixedNumber(*width, 1) : "\u2013");
+}
+
+std::string remarksCell(const std::vector<std::string>& remarks) {
+    std::string text;
+    for (const std::string& remark : remarks) text += (text.empty() ? "" : "; ") + remark;
+    return cell(text);
+}
+
+/// A name for a page that any file system and link takes.
+std::string pageNameOf(const std::string& file, std::size_t number) {
+    std::string name = std::to_string(number);
+    name.insert(0, 4 - std::min<std::size_t>(name.size(), 4), '0');
+    name += '-';
+    for (const char c : Ov::toUtf8(Ov::pathStem(Ov::fromUtf8(file)))) {
+        const bool plain = (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9');
+        if (plain || name.back() != '-') name += plain ? c : '-';
+        if (name.size() > 48) break;
+    }
+    return name + ".html";
+}
+
+Entry refusedEntry(const ReadResult& result) {
+    return {"<tr class=\"refused\"><td></td><th scope=\"row\">" + escaped(result.file) + "</th><td></td>" +
+                cell(result.format) + numberCell({}, "") + numberCell({}, "") + numberCell({}, "") +
+                numberCell({}, "") + "<td>refused</td>" + remarksCell(result.reasons()) + "</tr>\n",
+            "", ""};
+}
+
+Entry entryOf(const Datasheet& sheet, std::size_t number, const PageFolder& folder, const std::string& indexUrl) {
+    const DrawnFile& file = sheet.file;
+    const Ov::RnPhotoWebData& web = *file.source.web;
+    const std::string page = pageNameOf(file.source.file, number);
+    std::string row =
+        "<tr><td>" + thumbnail(sheet, "t" + std::to_string(number) + "-") + "</td><th scope=\"row\"><a href=\"" +
+        folder.urlOf(page) + "\">" + escaped(file.source.file) + "</a></th>" + cell(titleOf(file)) +
+        cell(file.source.format) + numberCell(web.getLumens(), shortNumber(web.getLumens())) +
+        numberCell(web.getMaxCandela(), shortNumber(web.getMaxCandela()) + " " + unitOf(file.source)) +
+        angleCell(file.angles[0].beam) + angleCell(file.angles[1].beam) + cell(symmetryName(web.getSymmetry())) +
+        remarksCell(sheet.remarks) + "</tr>\n";
+    return {std::move(row), page, datasheetPage(sheet, indexUrl)};
+}
+
+std::string indexPage(const std::string& rows, std::size_t files, std::size_t refused) {
+    static constexpr const char* headings[] = {"File",   "Luminaire",       "Format",           "Flux, lm",
+                                               "Peak",   "Beam C0, \u00b0", "Beam C90, \u00b0", "Symmetry",
+                                               "Remarks"};
+    std::string body = "<header><h1>Photometric files</h1>\n<p class=\"muted\">" + std::to_string(files) +
+                       (files == 1 ? " file, " : " files, ") + std::to_string(refused) +
+                       " refused</p></header>\n<main>\n<div class=\"tools\" id=\"tools\" hidden>"
+                       "<label for=\"filter\">Filter</label> <input type=\"search\" id=\"filter\">"
+                       "<output id=\"shown\" for=\"filter\" aria-live=\"polite\"></output></div>\n"
+                       "<table class=\"index\" id=\"files\"><caption>Files, by name until a heading sorts them"
+                       "</caption><thead><tr><th scope=\"col\">Diagram</th>";
+    for (const char* heading : headings)
+        body += std::string("<th scope=\"col\"><button type=\"button\">") + heading + "</button></th>";
+    return htmlPage("Photometric files", body + "</tr></thead><tbody>\n" + rows + "</tbody></table>\n</main>\n",
+                    indexScript);
+}
+
+/// Makes pages at the side while the next files are read, and takes them in order.
+class Maker {
+public:
+    Maker(PageFolder& folder, std::string indexUrl) : _folder(folder), _indexUrl(std::move(indexUrl)) {}
+
+    void add(ReadResult result, const HostSession& session) {
+        const std::size_t number = ++_files;
+        if (auto file = drawnFile(session, result)) {
+            auto sheet = std::make_shared<Datasheet>(datasheetOf(session, std::move(*file)));
+            _underWay.push_back(std::async(std::launch::async, [this, sheet, number] {
+                return entryOf(*sheet, number, _folder, _indexUrl);
+            }));
+        } else {
+            ++_refused;
+            std::promise<Entry> entry;
+            entry.set_value(refusedEntry(result));
+            _underWay.push_back(entry.get_future());
+        }
+        if (_underWay.size() > std::clamp(std::thread::hardware_concurrency(), 1U, 16U)) takeOne();
+    }
+    void finish() {
+        while (!_underWay.empty()) takeOne();
+    }
+
+    std::size_t files() const { return _files; }
+    std::size_t refused() const { return _refused; }
+    const std::string& rows() const { return _rows; }
+    /// Why a page could not be written; empty when all were.
+    const std::string& error() const { return _error; }
+
+private:
+    void takeOne() {
+        const Entry entry = _underWay.front().get();
+        _underWay.pop_front();
+        _rows += entry.row;
+        if (_error.empty() && !entry.page.empty()) _error = _folder.write(entry.pageName, entry.page);
+    }
+
+    PageFolder& _folder;
+    std::string _indexUrl;
+    std::size_t _files = 0;
+    std::size_t _refused = 0;
+    std::string _rows;
+    std::string _error;
+    std::deque<std::future<Entry>> _underWay;
+};
+
+/// Whether a file that was found in a folder is none of ours.
+bool isForeign(const FoundFile& file, const ReadResult& result) {
+    return file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
+}
+
+int reportMany(const ReportOptions& options, const HostSession& session) {
+    const std::vector<FoundFile> files = expandPaths(options.paths);
+    PageFolder folder(options.out);
+    const std::string refusal = folder.make();
+    if (!refusal.empty()) return fail(options.out, refusal);
+    Maker maker(folder, "../" + urlPart(pathText(nativeOf(options.out).filename())));
+    {
+        Progress progress(files.size());
+        for (const FoundFile& file : files) {
+            progress.next();
+            ReadResult result;
+            result.file = file.path;
+            result.error = file.error;
+            if (file.error.empty()) result = session.read(file.path, options.as);
+            if (!isForeign(file, result)) maker.add(std::move(result), session);
+            if (!maker.error().empty()) break;
+        }
+        maker.finish();
+    }
+    if (maker.files() == 0) return fail(options.paths.front(), "no photometric file is in there");
+    if (!maker.error().empty()) return fail(options.out, "a page of it " + maker.error());
+    const std::string error = writeFile(options.out, indexPage(maker.rows(), maker.files(), maker.refused()));
+    if (!error.empty()) return fail(options.out, error);
+    folder.keep();
+    std::cout << options.out << ": " << maker.files() << (maker.files() == 1 ? " file, " : " files, ")
+              << maker.refused() << " refused\n";
+    return maker.refused() == 0 ? exitWell : exitFailed;
+}
+
+}  // namespace
+
+int runReport(const ReportOptions& options, const HostSession& session) {
+    if (CLI::detail::to_lower(nativeOf(options.out).extension().string()) != ".html") {
+        std::cerr << options.out << ": does not end in .html\n";
+        return exitUsage;
+    }
+    std::error_code error;
+    const bool one = options.paths.size() == 1 && !fs::is_directory(nativeOf(options.paths.front()), error);
+    return (one ? reportOne : reportMany)(options, session);
+}
+
+}  // namespace OvTool
