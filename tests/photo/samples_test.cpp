@@ -1,25 +1,14 @@
-#include <cmath>
 #include <filesystem>
 
 #include "tests/photo/photoFixture.h"
 
-// Makers' files, read where OVPHOTO_SAMPLES says they lie, and the examples.
+// Makers' files, read where OVPHOTO_SAMPLES says they lie, and the examples. What light they give and what is written of
+// them is for the replays in fuzz/.
 
 namespace OvPhotometrics {
 namespace {
 
 class Samples : public Photo {};
-
-void expectSound(Ov::RnPhotoWebData& web) {
-    EXPECT_GE(web.getMaxCandela(), 0);
-    EXPECT_TRUE(std::isfinite(web.getLumens()));
-    const auto light = makeWebDistribution(web);
-    for (int theta = 0; theta <= 180; theta += 3)
-        for (int psi = -180; psi <= 360; psi += 7) {
-            const float candela = light->intensityAtUnit(direction(theta, psi));
-            ASSERT_TRUE(candela >= 0 && std::isfinite(candela)) << theta << "," << psi;
-        }
-}
 
 TEST_F(Samples, AreReadOrRefusedWithAMessage) {
     std::vector<std::filesystem::directory_entry> entries;
@@ -41,7 +30,6 @@ TEST_F(Samples, AreReadOrRefusedWithAMessage) {
         EXPECT_EQ(log.take(), "");
         ++read;
         const auto web = Ov::rnCast<Ov::RnPhotoWebData>(object.get());
-        expectSound(*web);
         const std::string text = saved(*web);
         if (const auto again = import(text)) {
             EXPECT_EQ(again->getThetaCount(), web->getThetaCount());
