@@ -13,14 +13,14 @@
 
 namespace bench {
 
-/// A line of the table at the end: the time of one benchmark over that of another. One that is not run has no
-/// line.
+/// A line of the table at the end: one benchmark over another, by their rates where they count bytes, else by their
+/// times. There is none where they are not run.
 struct Ratio {
     std::string what;
-    std::string above;
-    std::string below;
+    std::string ours;
+    std::string floor;
     double atMost = 0;   // the wanted bound; 0: none
-    double atLeast = 0;  // of rates, which are the inverse of times
+    double atLeast = 0;  // the same of rates
 };
 
 /// Adds lines to the table; done while the program starts.

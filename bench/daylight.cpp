@@ -54,14 +54,14 @@ BENCHMARK(expFloor);
 
 const bool listed = bench::addRatios({
     {.what = "sky illuminance, time over 4096 acos and exp",
-     .above = "skyIlluminance/0",
-     .below = "skyFloor",
+     .ours = "skyIlluminance/0",
+     .floor = "skyFloor",
      .atMost = 1.4},
     {.what = "sky illuminance, time over 4096 exp",
-     .above = "skyIlluminance/0",
-     .below = "expFloor",
+     .ours = "skyIlluminance/0",
+     .floor = "expFloor",
      .atMost = 3.9},
-    {.what = "daylight pass, time over 4096 exp", .above = "daylightPass", .below = "expFloor", .atMost = 0.05},
+    {.what = "daylight pass, time over 4096 exp", .ours = "daylightPass", .floor = "expFloor", .atMost = 0.05},
 });
 
 }  // namespace

@@ -138,21 +138,21 @@ BENCHMARK(vectorFloor);
 
 const bool listed = bench::addRatios({
     {.what = "getIntensity 73 x 37, time over bare lookup",
-     .above = "getIntensity/0",
-     .below = "intensityFloor",
+     .ours = "getIntensity/0",
+     .floor = "intensityFloor",
      .atMost = 3.5},
     {.what = "many angles 73 x 37, time over bare lookup",
-     .above = "manyAngles/0",
-     .below = "intensityFloor",
+     .ours = "manyAngles/0",
+     .floor = "intensityFloor",
      .atMost = 1.5},
     {.what = "many unit vectors 73 x 37, time over acos and atan2",
-     .above = "manyVectors/0",
-     .below = "vectorFloor"},
+     .ours = "manyVectors/0",
+     .floor = "vectorFloor"},
     {.what = "intensityAtUnit 73 x 37, time over acos and atan2",
-     .above = "intensityAtUnit",
-     .below = "vectorFloor"},
-    {.what = "getIntensity 721 x 721, time over 19 x 9", .above = "getIntensity/4", .below = "getIntensity/1"},
-    {.what = "many angles 721 x 721, time over 19 x 9", .above = "manyAngles/4", .below = "manyAngles/1"},
+     .ours = "intensityAtUnit",
+     .floor = "vectorFloor"},
+    {.what = "getIntensity 721 x 721, time over 19 x 9", .ours = "getIntensity/4", .floor = "getIntensity/1"},
+    {.what = "many angles 721 x 721, time over 19 x 9", .ours = "manyAngles/4", .floor = "manyAngles/1"},
 });
 
 }  // namespace

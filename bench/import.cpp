@@ -67,22 +67,22 @@ BENCHMARK(importFloor)->Arg(0)->Arg(1)->Arg(2)->Arg(4);
 BENCHMARK(importFieldsFloor)->Arg(3);
 
 const bool listed = bench::addRatios({
-    {.what = "import IES 73 x 37, rate over from_chars", .above = "importFloor/0", .below = "import/0"},
+    {.what = "import IES 73 x 37, rate over from_chars", .ours = "import/0", .floor = "importFloor/0"},
     {.what = "import IES 361 x 721, rate over from_chars",
-     .above = "importFloor/1",
-     .below = "import/1",
+     .ours = "import/1",
+     .floor = "importFloor/1",
      .atLeast = 0.5},
     {.what = "import CIBSE 181 x 360, rate over from_chars",
-     .above = "importFloor/2",
-     .below = "import/2",
+     .ours = "import/2",
+     .floor = "importFloor/2",
      .atLeast = 0.4},
     {.what = "import NIMB 181 x 360, rate over from_chars of fields",
-     .above = "importFieldsFloor/3",
-     .below = "import/3",
+     .ours = "import/3",
+     .floor = "importFieldsFloor/3",
      .atLeast = 0.4},
     {.what = "import TBT 181 x 360, rate over from_chars",
-     .above = "importFloor/4",
-     .below = "import/4",
+     .ours = "import/4",
+     .floor = "importFloor/4",
      .atLeast = 0.4},
 });
 

@@ -51,8 +51,8 @@ BENCHMARK(install);
 BENCHMARK(installFloor);
 
 const bool listed = bench::addRatios({{.what = "install and flux 361 x 721, time over copy and division",
-                                       .above = "install",
-                                       .below = "installFloor",
+                                       .ours = "install",
+                                       .floor = "installFloor",
                                        .atMost = 5}});
 
 }  // namespace

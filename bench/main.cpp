@@ -14,16 +14,15 @@ public:
     void ReportRuns(const std::vector<Run>& runs) override {
         for (const Run& run : runs)
             if (run.aggregate_name.empty() || run.aggregate_name == "median")
-                _times[run.run_name.str()] =
-                    run.run_name.time_type == "real_time" ? run.GetAdjustedRealTime() : run.GetAdjustedCPUTime();
+                _results[run.run_name.str()] = resultOf(run);
         ConsoleReporter::ReportRuns(runs);
     }
 
     void printRatios() {
         std::printf("\n%-60s%10s   wanted\n", "ratio", "measured");
         for (const bench::Ratio& ratio : bench::ratios()) {
-            if (!_times.contains(ratio.above) || !_times.contains(ratio.below)) continue;
-            const double measured = _times[ratio.above] / _times[ratio.below];
+            if (!_results.contains(ratio.ours) || !_results.contains(ratio.floor)) continue;
+            const double measured = _results[ratio.ours] / _results[ratio.floor];
             std::printf("%-60s%10.2f", ratio.what.c_str(), measured);
             if (ratio.atMost > 0)
                 std::printf("   %g at most%s", ratio.atMost, measured > ratio.atMost ? ", MISSED" : "");
@@ -34,7 +33,14 @@ public:
     }
 
 private:
-    std::map<std::string, double> _times;
+    /// The rate, or the time where no bytes are counted.
+    static double resultOf(const Run& run) {
+        const auto rate = run.counters.find("bytes_per_second");
+        if (rate != run.counters.end()) return rate->second;
+        return run.run_name.time_type == "manual_time" ? run.GetAdjustedRealTime() : run.GetAdjustedCPUTime();
+    }
+
+    std::map<std::string, double> _results;
 };
 
 }  // namespace
