@@ -4,6 +4,7 @@
 
 #include "components/photo/lid/moduleEntry.h"
 #include "host/componentManager/componentManager.h"
+#include "host/componentManager/devices.h"
 #include "host/componentManager/persistant.h"
 #include "host/componentManager/processController.h"
 #include "host/componentManager/streamEx.h"
@@ -103,6 +104,24 @@ TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
     EXPECT_TRUE(module->byOrdinal<bool(int, int*, int*)>(434)(172, &month, &day));
     EXPECT_TRUE(month == 6 && day == 21);
     EXPECT_STREQ(OvPhotometrics::numberedFunctions(*module).getMonthShortName(5), L"May");
+}
+
+TEST_F(ModuleTest, AnImportTellsWhatElseTheFileSays) {
+    std::wstring told;
+    auto visitor = Ov::rnVisitor<const OvPhotometrics::FileFact&>(
+        [&](const OvPhotometrics::FileFact& fact) { told += std::wstring(fact.key) + L"=" + fact.text + L";"; });
+    const auto import = [&](const char* text, const Ov::RnUid& format) {
+        return OvPhotometrics::numberedFunctions(*module).importWithFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text),
+                                                                          format, L"lamp", nullptr, visitor);
+    };
+    const char* const good = "IESNA91\n[LUMCAT] 7\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1";
+    const auto object = import(good, OvPhotometrics::classIds::iesWeb);
+    EXPECT_STREQ(Ov::rnCast<Ov::RnPhotoWebData>(object.get())->getName(), L"lamp");
+    EXPECT_NE(told.find(L"LUMCAT=7;"), std::wstring::npos);
+    told.clear();
+    EXPECT_FALSE(import(good, OvPhotometrics::classIds::diffuse));
+    EXPECT_THROW(import("IESNA91\nTILT=NONE\n0", OvPhotometrics::classIds::iesWeb), Ov::RnStreamEx::ExReadError);
+    EXPECT_EQ(told, L"");
 }
 
 TEST_F(ModuleTest, IntensitiesOfManyDirectionsTakeSpans) {
