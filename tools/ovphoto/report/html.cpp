@@ -14,6 +14,27 @@ void replaceAll(std::string& text, const std::string& from, const std::string& t
         text.replace(at, from.size(), to);
 }
 
+/// The attribute's numbers with two digits behind the point, which is finer than any screen.
+void shorten(std::string& svg, const std::string& attribute) {
+    std::string result;
+    bool inside = false;
+    std::size_t decimals = 0;  // read of a number, its point included
+    for (std::size_t i = 0; i < svg.size(); ++i) {
+        if (!inside && svg.compare(i, attribute.size(), attribute) == 0) {
+            result += attribute;
+            i += attribute.size() - 1;
+            inside = true;
+            continue;
+        }
+        const char c = svg[i];
+        const bool digit = c >= '0' && c <= '9';
+        decimals = c == '.' ? 1 : digit && decimals > 0 ? decimals + 1 : 0;
+        if (c == '"') inside = false;
+        if (!inside || decimals <= 3) result += c;
+    }
+    svg = std::move(result);
+}
+
 }  // namespace
 
 std::string htmlPage(const std::string& title, const std::string& body, std::string_view script) {
@@ -38,6 +59,11 @@ std::string inlineSvg(std::string svg, const std::string& prefix) {
     svg.insert(4, " role=\"img\" class=\"diagram\"");
     for (const std::string reference : {" id=\"", "href=\"#", "url(#"})
         replaceAll(svg, reference, reference + prefix);
+    // What Cairo says of every path and browsers, or the style, know.
+    for (const std::string known : {"fill-rule:nonzero;", "fill-opacity:1;", "stroke-opacity:1;",
+                                    "stroke-linecap:butt;", "stroke-linejoin:round;", "stroke-miterlimit:10;"})
+        replaceAll(svg, known, "");
+    for (const std::string attribute : {" d=\"", " style=\""}) shorten(svg, attribute);
     return svg;
 }
 
