@@ -51,9 +51,13 @@ std::string iesText(int verticalCount, int horizontalCount, bool closed) {
 }
 
 Ov::RnRef<Ov::RnPhotoWebData> import(const Ov::RnUid& classId, const std::string& text) {
+    return import(classId, *Ov::rnCreate<Ov::RnMemoryBuffer>(text));
+}
+
+Ov::RnRef<Ov::RnPhotoWebData> import(const Ov::RnUid& classId, Ov::RnBufferedIO& io) {
     const auto builder = Ov::rnCast<Ov::RnImportBuilder>(OvPhotometrics::builderTable().find(classId));
-    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(text);
-    const auto object = builder->import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), L"bench", nullptr);
+    io.seek(0, 0);
+    const auto object = builder->import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"bench", nullptr);
     return Ov::rnCast<Ov::RnPhotoWebData>(object.get());
 }
 

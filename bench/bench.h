@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "components/photo/lid/photoWeb.h"
+#include "host/componentManager/bufferedIO.h"
 #include "ovphoto/classIds.h"
 
 // What the benchmarks share. Ours stands beside a floor in the same run; what counts is the ratio of both. Inputs
@@ -31,8 +32,11 @@ const std::vector<Ratio>& ratios();
 /// one or two decimals; lines run to 130 characters. Without lumens the flux is to be integrated.
 std::string iesText(int verticalCount, int horizontalCount, bool closed);
 
-/// A text imported through the builder of a class; null when it is refused.
+/// @{
+/// A text, or what a device holds from its start, imported through the builder of a class.
 Ov::RnRef<Ov::RnPhotoWebData> import(const Ov::RnUid& classId, const std::string& text);
+Ov::RnRef<Ov::RnPhotoWebData> import(const Ov::RnUid& classId, Ov::RnBufferedIO& io);
+/// @}
 /// Imports `iesText`, open.
 Ov::RnRef<Ov::RnPhotoWebData> webOf(int verticalCount, int horizontalCount);
 /// A web as a file of a format.

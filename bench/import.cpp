@@ -1,6 +1,7 @@
 #include <charconv>
 
 #include "bench/bench.h"
+#include "host/componentManager/devices.h"
 
 // Import of files, everything included, beside a bare loop of std::from_chars over the same bytes.
 
@@ -28,7 +29,8 @@ const Input& input(std::int64_t which) {
 
 void import(benchmark::State& state) {
     const Input& file = input(state.range(0));
-    for (auto _ : state) benchmark::DoNotOptimize(bench::import(file.classId, file.text)->getLumens());
+    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(file.text);
+    for (auto _ : state) benchmark::DoNotOptimize(bench::import(file.classId, *io)->getLumens());
     bench::countBytes(state, file.text.size());
 }
 
