@@ -53,18 +53,16 @@ std::vector<PlaneCurve> planeCurves(const Diagram& diagram) {
 
 namespace {
 
-std::string joined(const std::vector<std::string>& texts) {
-    std::string all;
-    for (const std::string& text : texts) all += (all.empty() ? "" : ", ") + text;
-    return all;
-}
-
-/// A light among others: its name, cut where there is no room for all of it, and its notes.
+/// A light among others: its name and as many of its notes as there is room for, two at least; else the name is cut.
 std::string legendText(const Canvas& canvas, const Subject& subject) {
-    const std::string notes = subject.notes.empty() ? "" : ": " + joined(subject.notes);
     const double room = legendRoom(canvas);
-    const double left = room - canvas.textWidth(notes, canvas.font());
-    return canvas.fitted(subject.name, canvas.font(), std::max(room / 3, left)) + notes;
+    for (std::size_t count = subject.notes.size();; --count) {
+        std::string notes;
+        for (std::size_t i = 0; i < count; ++i) notes += (i == 0 ? ": " : ", ") + subject.notes[i];
+        const double left = room - canvas.textWidth(notes, canvas.font());
+        if (count <= 2 || canvas.textWidth(subject.name, canvas.font()) <= left)
+            return canvas.fitted(subject.name, canvas.font(), std::max(room / 3, left)) + notes;
+    }
 }
 
 std::vector<LegendItem> legendOf(const Canvas& canvas, const Diagram& diagram, bool planes) {
