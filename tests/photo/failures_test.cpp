@@ -194,7 +194,11 @@ TEST_F(Failures, OfObjects) {
         SCOPED_TRACE(name);
         const auto object = make(1), other = make(2);
         auto* const builder = builderTable().find(Ov::rnCast<Ov::RnPersistant>(object.get())->getClassId());
-        atEveryPlace("create", *object, [&] { return builder->create() ? true : throw std::bad_alloc(); });
+        atEveryPlace("create", *object, [&] {
+            RnRef<Ov::RnCastable> made;
+            EXPECT_NO_THROW(made = builder->create());
+            return made ? true : throw std::bad_alloc();
+        });
         atEveryPlace("clone", *object, [&] {
             return clones<Ov::RnPhotoWebData>(*object) || clones<Ov::RnIntensityDist>(*object) ||
                    clones<Ov::RnNaturalLight>(*object);
@@ -228,6 +232,39 @@ TEST_F(Failures, OfObjects) {
             EXPECT_NE(saved(*target), saved(*object));
         }
     }
+}
+
+TEST_F(Failures, OfPartsOfFilesAreTold) {
+    const auto web = import(IesText{}.text());
+    const struct {
+        const char* name;
+        bool (*work)(IesFileRecord& record, Ov::RnStream& stream);
+    } parts[] = {{"tilt", [](IesFileRecord& record, Ov::RnStream& in) { return iesReadTilt(record.tilt, in); }},
+                 {"grid",
+                  [](IesFileRecord& record, Ov::RnStream& in) {
+                      record.grid.verticalCount = record.grid.horizontalCount = 9;
+                      NumberText numbers(in, NumberText::AtEnd::notConverted);
+                      return candelaGridRead(record.grid, numbers);
+                  }},
+                 {"new grid", [](auto& record, auto&) { return candelaGridAlloc(record.grid, 9, 9); }},
+                 {"new record", [](auto& record, auto&) { return iesRecordInitForWriting(record); }},
+                 {"NIMB text", [](auto&, auto& out) { return nimbWrite(NimbRecord(), out); }}};
+    std::string numbers = "3 2 0 90 1 1 ";
+    for (int number = 0; number < 100; ++number) numbers += std::to_string(number) + " ";
+    for (const auto& [name, work] : parts)
+        atEveryPlace(
+            name, *web,
+            [&] {
+                const auto io = spared([&] { return Ov::rnCreate<FailingDevice>(numbers); });
+                auto record = spared([] { return IesFileRecord(); });
+                Ov::RnStream stream(io.get(), Form::text);
+                return work(record, stream);
+            },
+            true);
+    CandelaGrid grid;
+    constexpr int most = std::numeric_limits<int>::max();
+    EXPECT_FALSE(candelaGridAlloc(grid, most, most));
+    EXPECT_EQ(log.take(), "12936");
 }
 
 template <class Format>

@@ -1,10 +1,7 @@
-#include <new>
-
-#include "components/messageFile/messageIds.h"
 #include "components/photo/ies/ies.h"
 #include "components/photo/lid/ownGrid.h"
-#include "components/photo/lid/reportMessage.h"
 #include "components/photo/lid/webDistribution.h"
+#include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {
 
@@ -39,14 +36,11 @@ void writeTilt(const IesFileRecord& rec, Ov::RnStream& out) {
 }  // namespace
 
 bool iesRecordInitForWriting(IesFileRecord& rec) {
-    try {
+    return withinMemory([&] {
         rec = IesFileRecord();
         rec.lines = {L"IESNA91", L"[TEST]     Test unknown", L"[MANUFAC]  Manufacturing company unknown"};
         return true;
-    } catch (const std::bad_alloc&) {
-        reportMessage(messages::outOfMemory);
-        return false;
-    }
+    });
 }
 
 bool iesRecordFromDistribution(Ov::RnIntensityDist& dist, IesFileRecord& rec) {

@@ -51,9 +51,9 @@ bool candelaGridAlloc(CandelaGrid& grid, int verticalCount, int horizontalCount)
         CandelaGrid even;
         even.verticalCount = std::max(verticalCount, 2);
         even.horizontalCount = std::max(horizontalCount, 1);
+        even.candelas.resize(product(even.verticalCount, even.horizontalCount));
         even.verticalAngles = evenAngles(even.verticalCount, 180);
         even.horizontalAngles = evenAngles(even.horizontalCount, 360);
-        even.candelas.resize(product(even.verticalCount, even.horizontalCount));
         grid = std::move(even);
         return true;
     } catch (const std::bad_alloc&) {
