@@ -248,7 +248,16 @@ TEST_F(Failures, OfPartsOfFilesAreTold) {
                   }},
                  {"new grid", [](auto& record, auto&) { return candelaGridAlloc(record.grid, 9, 9); }},
                  {"new record", [](auto& record, auto&) { return iesRecordInitForWriting(record); }},
-                 {"NIMB text", [](auto&, auto& out) { return nimbWrite(NimbRecord(), out); }}};
+                 {"NIMB text", [](auto&, auto& out) { return nimbWrite(NimbRecord(), out); }},
+                 {"NIMB record",
+                  [](auto&, auto&) {
+                      NimbRecord record;
+                      return nimbRecordFromDistribution(*spared([] { return Ov::rnCreate<Isotropic>(); }), record);
+                  }},
+                 {"TBT record", [](auto&, auto&) {
+                      TbtFileRecord record;
+                      return tbtRecordFromDistribution(*spared([] { return Ov::rnCreate<Isotropic>(); }), record);
+                  }}};
     std::string numbers = "3 2 0 90 1 1 ";
     for (int number = 0; number < 100; ++number) numbers += std::to_string(number) + " ";
     for (const auto& [name, work] : parts)
