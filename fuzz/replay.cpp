@@ -59,12 +59,7 @@ void replay(const fs::path& path) {
 
 }  // namespace
 
-void* operator new(std::size_t size) { return allocate(size); }
-void* operator new[](std::size_t size) { return allocate(size); }
-void operator delete(void* block) noexcept { release(block); }
-void operator delete[](void* block) noexcept { release(block); }
-void operator delete(void* block, std::size_t) noexcept { release(block); }
-void operator delete[](void* block, std::size_t) noexcept { release(block); }
+#include "tests/support/replacedHeap.h"
 
 bool OvPhotometrics::fuzz::isDue(std::string_view, std::size_t) { return true; }
 

@@ -17,6 +17,26 @@ protected:
         return static_cast<std::size_t>(std::distance(std::filesystem::directory_iterator(folder.path()), {}));
     }
 
+    struct Refusal {
+        int status;
+        const char* arguments;
+        const char* told;
+    };
+
+    /// Each run is refused and told of; nothing is made, and the file `old` stays.
+    void expectLeavesNothing(const std::string& command, const std::string& old,
+                             std::initializer_list<Refusal> runs) {
+        folder.write(old, "old");
+        const std::size_t before = fileCount();
+        for (const Refusal& run : runs) {
+            const ToolResult result = runTool(command + " " + run.arguments, folder);
+            EXPECT_EQ(result.status, run.status) << run.arguments << result.err;
+            EXPECT_TRUE(result.says(run.told)) << run.arguments << result.err;
+        }
+        EXPECT_EQ(fileCount(), before);
+        EXPECT_EQ(bytes(old), "old");
+    }
+
     TempFolder folder;
 };
 
@@ -47,46 +67,35 @@ TEST_F(ToolPlot, IlluminancesAreThoseOfTheCandelaWhateverTheUnitOfTheFile) {
 }
 
 TEST_F(ToolPlot, WrongInputIsToldAndLeavesNothing) {
-    folder.write("old.svg", "old");
     std::filesystem::create_directory(folder.path() / "folder.svg");
-    const std::size_t before = fileCount();
-    const struct {
-        int status;
-        const char* arguments;
-        const char* told;
-    } cases[] = {
-        {2, "-o a.svg", "FILE, --sky or --sun-path"},
-        {2, "good.ies", "--out"},
-        {2, "good.ies -o a.gif", "a.gif: does not end in .svg, .png or .pdf"},
-        {2, "good.ies -o a.svg --planes ''", "--planes"},
-        {2, "good.ies -o a.svg --planes 0,", "'0,'"},
-        {2, "good.ies -o a.svg --planes 360", "'360'"},
-        {2, "good.ies -o a.svg --planes 1,2,3,4,5,6,7,8,9", "--planes"},
-        {2, "good.ies -o a.svg --size 0x600", "'0x600'"},
-        {2, "good.ies -o a.svg --size 600x8001", "'600x8001'"},
-        {2, "good.ies -o a.svg --size 600", "'600'"},
-        {2, "good.ies -o a.svg --size 99999999999x600", "--size"},
-        {2, "good.ies -o a.svg --kind pie", "'pie'"},
-        {2, "good.ies -o a.svg --height 0", "'0'"},
-        {2, "good.ies -o a.svg --latitude 3", "--sky"},
-        {2, "good.ies --sky -o a.svg", "--sky"},
-        {2, "--sky --sun-path -o a.svg", "--s"},
-        {2, "--sky --kind polar -o a.svg", "--kind"},
-        {2, "good.ies good.ies --kind cone -o a.svg", "shows one"},
-        {2, "good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies -o a.svg", "8"},
-        {1, "good.ies bad.ies good.ies -o old.svg", "bad.ies: "},
-        {1, "gone.ies -o old.svg", "gone.ies: cannot be opened"},
-        {1, "good.ies -o none/a.svg", "none/a.svg: cannot be written"},
-        {1, "good.ies -o folder.svg", "is a folder"},
-        {1, "--sky --from bad.ies -o a.svg", "bad.ies"},
-    };
-    for (const auto& c : cases) {
-        const ToolResult result = run(c.arguments);
-        EXPECT_EQ(result.status, c.status) << c.arguments << result.err;
-        EXPECT_TRUE(result.says(c.told)) << c.arguments << result.err;
-    }
-    EXPECT_EQ(fileCount(), before);
-    EXPECT_EQ(bytes("old.svg"), "old");
+    expectLeavesNothing(
+        "plot", "old.svg",
+        {
+            {2, "-o a.svg", "FILE, --sky or --sun-path"},
+            {2, "good.ies", "--out"},
+            {2, "good.ies -o a.gif", "a.gif: does not end in .svg, .png or .pdf"},
+            {2, "good.ies -o a.svg --planes ''", "--planes"},
+            {2, "good.ies -o a.svg --planes 0,", "'0,'"},
+            {2, "good.ies -o a.svg --planes 360", "'360'"},
+            {2, "good.ies -o a.svg --planes 1,2,3,4,5,6,7,8,9", "--planes"},
+            {2, "good.ies -o a.svg --size 0x600", "'0x600'"},
+            {2, "good.ies -o a.svg --size 600x8001", "'600x8001'"},
+            {2, "good.ies -o a.svg --size 600", "'600'"},
+            {2, "good.ies -o a.svg --size 99999999999x600", "--size"},
+            {2, "good.ies -o a.svg --kind pie", "'pie'"},
+            {2, "good.ies -o a.svg --height 0", "'0'"},
+            {2, "good.ies -o a.svg --latitude 3", "--sky"},
+            {2, "good.ies --sky -o a.svg", "--sky"},
+            {2, "--sky --sun-path -o a.svg", "--s"},
+            {2, "--sky --kind polar -o a.svg", "--kind"},
+            {2, "good.ies good.ies --kind cone -o a.svg", "shows one"},
+            {2, "good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies good.ies -o a.svg", "8"},
+            {1, "good.ies bad.ies good.ies -o old.svg", "bad.ies: "},
+            {1, "gone.ies -o old.svg", "gone.ies: cannot be opened"},
+            {1, "good.ies -o none/a.svg", "none/a.svg: cannot be written"},
+            {1, "good.ies -o folder.svg", "is a folder"},
+            {1, "--sky --from bad.ies -o a.svg", "bad.ies"},
+        });
 }
 
 TEST_F(ToolPlot, NamesOfAnyBytesAreDrawn) {
@@ -117,34 +126,22 @@ TEST_F(ToolPlot, AReportIsOnePageOrAnIndexWithPages) {
 }
 
 TEST_F(ToolPlot, AReportThatCannotBeMadeLeavesNothing) {
-    folder.write("old.html", "old");
     folder.write("taken-pages", "a file");
     std::filesystem::create_directories(folder.path() / "empty");
     std::filesystem::create_directories(folder.path() / "folder.html");
-    const std::size_t before = fileCount();
-    const struct {
-        int status;
-        const char* arguments;
-        const char* told;
-    } cases[] = {
-        {2, "-o a.html", "PATH"},
-        {2, "good.ies", "--out"},
-        {2, "good.ies -o a.pdf", "a.pdf: does not end in .html"},
-        {1, "bad.ies -o old.html", "bad.ies: "},
-        {1, "gone.ies -o old.html", "cannot be opened"},
-        {1, "good.ies -o none/a.html", "none/a.html: cannot be written"},
-        {1, "empty -o old.html", "empty: no photometric file"},
-        {1, "good.ies good.ies -o none/a.html", "none/a-pages cannot be made"},
-        {1, "good.ies good.ies -o folder.html", "is a folder"},
-        {1, "good.ies good.ies -o taken.html", "taken-pages cannot be made"},
-    };
-    for (const auto& c : cases) {
-        const ToolResult result = runTool(std::string("report ") + c.arguments, folder);
-        EXPECT_EQ(result.status, c.status) << c.arguments << result.err;
-        EXPECT_TRUE(result.says(c.told)) << c.arguments << result.err;
-    }
-    EXPECT_EQ(fileCount(), before);
-    EXPECT_EQ(bytes("old.html"), "old");
+    expectLeavesNothing("report", "old.html",
+                        {
+                            {2, "-o a.html", "PATH"},
+                            {2, "good.ies", "--out"},
+                            {2, "good.ies -o a.pdf", "a.pdf: does not end in .html"},
+                            {1, "bad.ies -o old.html", "bad.ies: "},
+                            {1, "gone.ies -o old.html", "cannot be opened"},
+                            {1, "good.ies -o none/a.html", "none/a.html: cannot be written"},
+                            {1, "empty -o old.html", "empty: no photometric file"},
+                            {1, "good.ies good.ies -o none/a.html", "none/a-pages cannot be made"},
+                            {1, "good.ies good.ies -o folder.html", "is a folder"},
+                            {1, "good.ies good.ies -o taken.html", "taken-pages cannot be made"},
+                        });
 }
 
 }  // namespace
