@@ -9,6 +9,7 @@
 #include <string>
 #include <vector>
 
+#include "support/paths.h"
 #include "tool/toolRun.h"
 
 // What the documents promise: the README's examples print what stands there, and links lead somewhere.
@@ -16,8 +17,6 @@
 namespace {
 
 namespace fs = std::filesystem;
-
-const fs::path sourceFolder = OVPHOTO_SOURCE_DIR;
 
 std::string readText(const fs::path& path) {
     std::ostringstream text;
@@ -53,8 +52,8 @@ std::vector<Example> examplesOf(const fs::path& document) {
 /// What a shell in the source folder, where `ovphoto` is the built tool, prints; and the status when that is not
 /// 0.
 std::string runInSources(const std::string& command) {
-    const std::string line = "export LC_ALL=C PATH='" + toolFolder() +
-                             "':\"$PATH\" && cd '" OVPHOTO_SOURCE_DIR "' && { " + command + "\n} 2>&1";
+    const std::string line = "export LC_ALL=C PATH='" + toolFolder() + "':\"$PATH\" && cd '" + sourceFolder() +
+                             "' && { " + command + "\n} 2>&1";
     FILE* pipe = popen(line.c_str(), "r");
     if (!pipe) return "no shell";
     std::string output;
@@ -66,15 +65,15 @@ std::string runInSources(const std::string& command) {
 
 std::vector<fs::path> documents() {
     std::vector<fs::path> found;
-    for (const auto& entry : fs::directory_iterator(sourceFolder))
+    for (const auto& entry : fs::directory_iterator(sourceFolder()))
         if (entry.path().extension() == ".md") found.push_back(entry.path());
-    for (const auto& entry : fs::recursive_directory_iterator(sourceFolder / "docs"))
+    for (const auto& entry : fs::recursive_directory_iterator(sourceFolder() + "/docs"))
         if (entry.path().extension() == ".md") found.push_back(entry.path());
     return found;
 }
 
 TEST(Readme, ExamplesPrintWhatStandsThere) {
-    const std::vector<Example> examples = examplesOf(sourceFolder / "README.md");
+    const std::vector<Example> examples = examplesOf(sourceFolder() + "/README.md");
     ASSERT_GE(examples.size(), 3U);
     for (const Example& example : examples) {
         SCOPED_TRACE(example.command);
@@ -94,7 +93,7 @@ std::set<std::string> allOf(const std::string& text, const char* pattern) {
 
 TEST(ManPage, NamesEveryCommandAndOptionAndNoOther) {
     const std::string page =
-        std::regex_replace(readText(sourceFolder / "docs/man/ovphoto.1"), std::regex(R"(\\-)"), "-");
+        std::regex_replace(readText(sourceFolder() + "/docs/man/ovphoto.1"), std::regex(R"(\\-)"), "-");
     const char* const option = R"((--[a-z][a-z-]*))";
     const std::string help = runInSources("ovphoto --help");
     std::set<std::string> options = allOf(help, option);

@@ -5,6 +5,7 @@
 #include "host/componentManager/importer.h"
 #include "host/platform/module.h"
 #include "ovphoto/classIds.h"
+#include "support/paths.h"
 #include "support/tempFolder.h"
 #include "testObjects.h"
 
@@ -184,7 +185,7 @@ std::string failureOf(F function) {
 }
 
 TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
-    const std::wstring text = folder.write("text\u00E9.so", "text"), host = fromUtf8(OVPHOTO_HOST);
+    const std::wstring text = folder.write("text\u00E9.so", "text"), host = fromUtf8(hostPath());
     for (const auto& path : {folder.wide("l\xC3\xA4mp.so"), folder.wide(), L"libm.so.6"s}) {
         const std::string reason = path == folder.wide() ? ": it is a folder" : ": no such file";
         bool recognised = true;
@@ -204,14 +205,14 @@ TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
 }
 
 TEST_F(ComponentManager, LoadsAModuleOnceAndUnloadsIt) {
-    const std::wstring path = fromUtf8(OVPHOTO_MODULE),
+    const std::wstring path = fromUtf8(modulePath()),
                        link = pathFolder(path) + L"/de/.." + path.substr(path.find_last_of(L"/\\"));
     const Module& module = manager->loadModule(path.c_str());
     EXPECT_EQ(&manager->loadModule(link.c_str()), &module);
-    EXPECT_EQ(Module(fromUtf8(OVPHOTO_HOST)).byOrdinal(422), nullptr);
+    EXPECT_EQ(Module(fromUtf8(hostPath())).byOrdinal(422), nullptr);
     manager->unloadModule(L"/elsewhere.so");
     EXPECT_TRUE(manager->createObject(OvPhotometrics::classIds::iesWeb));
     manager->unloadModule(link.c_str());
     EXPECT_FALSE(manager->findBuilder(OvPhotometrics::classIds::iesWeb));
-    EXPECT_FALSE(isLoaded(OVPHOTO_MODULE));
+    EXPECT_FALSE(isLoaded(modulePath()));
 }

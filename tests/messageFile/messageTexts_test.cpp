@@ -11,6 +11,7 @@
 #include "components/messageFile/messageIds.h"
 #include "host/platform/path.h"
 #include "host/sdk/util.h"
+#include "support/paths.h"
 
 // The texts of every language against the numbers and arguments of messageIds.h.
 
@@ -21,7 +22,7 @@ class MessageTexts : public testing::TestWithParam<const wchar_t*> {
 protected:
     MessageTexts() {
         WendSDK::Util::setLanguage(GetParam());
-        catalogue.setFileName(Ov::fromUtf8(OVPHOTO_BIN_DIR "/libOVphotoRes.dll").c_str());
+        catalogue.setFileName(Ov::fromUtf8(binFolder() + "/libOVphotoRes.dll").c_str());
         catalogue.getText(0);  // opens it
         WendSDK::Util::setLanguage(L"");
     }
@@ -110,7 +111,7 @@ TEST_P(MessageTexts, NamesTellMonthsAndZonesApart) {
 TEST(MessageNumbers, StandByNameInTheSources) {
     const std::regex number("\\b(12[89]|130)[0-9]{2}\\b"), comment("//.*"), source("(?!messageIds).*\\.(h|cpp)");
     int lines = 0;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(OVPHOTO_SOURCE_DIR "/components")) {
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(sourceFolder() + "/components")) {
         if (!std::regex_match(entry.path().filename().string(), source)) continue;
         std::ifstream in(entry.path());
         for (std::string line; std::getline(in, line); ++lines)

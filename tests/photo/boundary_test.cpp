@@ -11,6 +11,7 @@
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
+#include "support/paths.h"
 #include "tests/support/tempFolder.h"
 
 // What passes between a host and the built module: exceptions both ways, and the module itself, again and again.
@@ -87,7 +88,7 @@ class FailingInput : public RnMemoryBuffer {
 };
 
 TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
-    const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
+    const LoadedModule module(fromUtf8(modulePath()));
     const auto importer = iesImporter();
     const std::wstring bad = folder.write("bad.ies", "IESNA91\nTILT=NONE\n0");
     raises<RnStreamEx::ExReadError, RnStreamEx, std::runtime_error>(
@@ -110,11 +111,11 @@ TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
 
 TEST_F(Boundary, WithoutACatalogueMessagesAreNumbersAndNamesAreTheHostsToCatch) {
     namespace fs = std::filesystem;
-    const fs::path companion = fs::path(OVPHOTO_MODULE).replace_filename("libOVphotoRes.dll");
+    const fs::path companion = fs::path(modulePath()).replace_filename("libOVphotoRes.dll");
     const fs::path own = nativePath(folder.wide("aloneRes.dll"));
-    const std::wstring alone = folder.wide("alone" + fs::path(OVPHOTO_MODULE).extension().string());
+    const std::wstring alone = folder.wide("alone" + fs::path(modulePath()).extension().string());
     const std::wstring cut = folder.write("cut.ies", "IESNA91");
-    fs::copy_file(OVPHOTO_MODULE, nativePath(alone));
+    fs::copy_file(modulePath(), nativePath(alone));
     const struct {
         const char* name;
         std::function<void()> make;
@@ -149,7 +150,7 @@ TEST_F(Boundary, WithoutACatalogueMessagesAreNumbersAndNamesAreTheHostsToCatch) 
 }
 
 TEST_F(Boundary, WhatAHostThrowsComesBackToIt) {
-    const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
+    const LoadedModule module(fromUtf8(modulePath()));
     const auto importer = iesImporter();
     try {
         importer->import(rnCreate<FailingInput>().get(), L"", nullptr);
@@ -164,15 +165,15 @@ TEST_F(Boundary, WhatAHostThrowsComesBackToIt) {
 }
 
 TEST_F(Boundary, AModuleIsUsedUnloadedAndLoadedAgain) {
-    ASSERT_FALSE(isLoaded(OVPHOTO_MODULE));
+    ASSERT_FALSE(isLoaded(modulePath()));
     const std::wstring good = folder.write("good.ies", goodFile), cut = folder.write("cut.ies", "IESNA91");
     std::wstring first;
     std::string saved;
     for (int round = 0; round < 3; ++round) {
         SCOPED_TRACE(round);
         {
-            const LoadedModule module(fromUtf8(OVPHOTO_MODULE));
-            EXPECT_TRUE(isLoaded(OVPHOTO_MODULE));
+            const LoadedModule module(fromUtf8(modulePath()));
+            EXPECT_TRUE(isLoaded(modulePath()));
             const auto memory = rnCreate<RnMemoryBuffer>(saved);
             RnStream stream(memory.get(), RnStream::Form::binary);
             if (round == 0) {
@@ -187,7 +188,7 @@ TEST_F(Boundary, AModuleIsUsedUnloadedAndLoadedAgain) {
             EXPECT_THROW(iesImporter()->import(cut.c_str(), nullptr), RnStreamEx::ExReadError);
             EXPECT_STREQ(module.functions().getMonthName(6), L"June");
         }
-        EXPECT_FALSE(isLoaded(OVPHOTO_MODULE));
+        EXPECT_FALSE(isLoaded(modulePath()));
         EXPECT_FALSE(manager()->findBuilder(ids::iesWeb));
         if (round == 0) first = reported;
         EXPECT_EQ(std::exchange(reported, L""), first);

@@ -14,6 +14,7 @@
 #include "ovphoto/intensities.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
+#include "support/paths.h"
 #include "tests/support/tempFolder.h"
 
 // The built module, reached as a host reaches it.
@@ -28,13 +29,13 @@ protected:
     }
     ~ModuleTest() override { manager->unloadModule(path.c_str()); }
 
-    std::wstring path = Ov::fromUtf8(OVPHOTO_MODULE);
+    std::wstring path = Ov::fromUtf8(modulePath());
     Ov::RnRef<Ov::RnComponentManager> manager;
     const Ov::Module* module;
 };
 
 TEST_F(ModuleTest, ShowsItsEntryPointAndNothingElse) {
-    std::set<std::string> names = exportedNames(OVPHOTO_MODULE);
+    std::set<std::string> names = exportedNames(modulePath());
     names.erase("RnNumberedExports");  // stands for ordinals where the system has none
     EXPECT_EQ(names, std::set<std::string>{"RnGetComponentDescription"});
     EXPECT_EQ(module->byOrdinal(1), module->byName("RnGetComponentDescription"));

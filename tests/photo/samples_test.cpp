@@ -1,5 +1,6 @@
 #include <filesystem>
 
+#include "support/paths.h"
 #include "tests/photo/photoFixture.h"
 
 // Makers' files, read where OVPHOTO_SAMPLES says they lie, and the examples. What light they give and what is written of
@@ -12,9 +13,10 @@ class Samples : public Photo {};
 
 TEST_F(Samples, AreReadOrRefusedWithAMessage) {
     std::vector<std::filesystem::directory_entry> entries;
-    const char* samples = std::getenv("OVPHOTO_SAMPLES");
-    for (const char* folder : {OVPHOTO_SOURCE_DIR "/examples", samples})
-        if (folder) entries.insert(entries.end(), std::filesystem::directory_iterator(folder), {});
+    std::vector<std::string> folders{sourceFolder() + "/examples"};
+    if (const char* samples = std::getenv("OVPHOTO_SAMPLES")) folders.emplace_back(samples);
+    for (const std::string& folder : folders)
+        entries.insert(entries.end(), std::filesystem::directory_iterator(folder), {});
     int files = 0, read = 0;
     for (const auto& entry : entries) {
         if (entry.path().extension() != ".ies") continue;

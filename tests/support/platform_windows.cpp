@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "host/platform/path.h"
+#include "support/paths.h"
 
 namespace fs = std::filesystem;
 
@@ -66,7 +67,7 @@ void compileCatalogue(const fs::path& file, const std::string& messages) {
     // A file in use is put aside.
     std::error_code ignored;
     fs::rename(file, fs::path(file) += ".old" + std::to_string(GetTickCount64()), ignored);
-    fs::copy_file(OVPHOTO_BIN_DIR "/libOVphotoRes.dll", file);
+    fs::copy_file(binFolder() + "/libOVphotoRes.dll", file);
     const HANDLE update = BeginUpdateResourceW(file.c_str(), TRUE);
     require(update, "BeginUpdateResource");
     for (const auto& [id, block] : blocksOf(messages)) {

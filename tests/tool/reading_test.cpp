@@ -4,6 +4,7 @@
 #include <numbers>
 #include <regex>
 
+#include "support/paths.h"
 #include "tool/toolRun.h"
 
 using Json = nlohmann::ordered_json;
@@ -59,7 +60,7 @@ TEST(ToolInfo, ARefusedFileStopsNothingAndHasItsLine) {
     TempFolder folder;
     folder.write("bad.ies", IesFile{.horizontals = {0, 45}}.text());
     const ToolResult result =
-        runTool("info --json bad.ies none.ies " OVPHOTO_SOURCE_DIR "/examples/downlight.ies", folder);
+        runTool("info --json bad.ies none.ies " + sourceFolder() + "/examples/downlight.ies", folder);
     EXPECT_EQ(result.status, 1);
     const auto objects = result.json();
     EXPECT_NE(objects.at(0)["error"].get<std::string>().find("45"), std::string::npos);

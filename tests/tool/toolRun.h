@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "support/paths.h"
 #include "support/tempFolder.h"
 
 // The built tool as a process, and small IES files for it.
@@ -18,7 +19,7 @@
 /// The folder of a tool for Windows that is tested instead, or null. What is a matter of POSIX is left out then.
 inline const char* windowsTool() { return std::getenv("OVPHOTO_WINDOWS_TOOL"); }
 
-inline std::string toolFolder() { return windowsTool() ? windowsTool() : OVPHOTO_BIN_DIR; }
+inline std::string toolFolder() { return windowsTool() ? windowsTool() : binFolder(); }
 
 inline std::string readBytes(const std::filesystem::path& path) {
     std::ifstream file(path, std::ios::binary);

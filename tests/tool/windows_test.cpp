@@ -2,6 +2,7 @@
 
 #include <map>
 
+#include "support/paths.h"
 #include "tool/toolRun.h"
 
 // The tool for Windows against that of this system: what they say and write is the same, byte for byte.
@@ -26,7 +27,7 @@ protected:
     void SetUp() override { ASSERT_TRUE(windowsTool()) << "OVPHOTO_WINDOWS_TOOL names no folder"; }
     /// Every text and file at a time, so that a difference is shown where it is.
     static void expectSame(const std::string& command, std::size_t files = 0) {
-        const auto ours = outcome(command, OVPHOTO_BIN_DIR);
+        const auto ours = outcome(command, binFolder());
         const auto theirs = outcome(command, windowsTool());
         EXPECT_EQ(ours.size(), theirs.size()) << command;
         EXPECT_GE(ours.size(), files + 3) << command;
@@ -39,7 +40,7 @@ protected:
 };
 
 TEST_F(WindowsTool, ReadsAndConvertsEveryFileToTheSameBytes) {
-    std::vector<std::string> folders{OVPHOTO_SOURCE_DIR "/examples"};
+    std::vector<std::string> folders{sourceFolder() + "/examples"};
     if (const char* samples = std::getenv("OVPHOTO_SAMPLES")) folders.emplace_back(samples);
     for (const std::string& folder : folders) {
         expectSame("ovphoto check --json '" + folder + "'");
@@ -54,7 +55,7 @@ TEST_F(WindowsTool, ReadsAndConvertsEveryFileToTheSameBytes) {
 }
 
 TEST_F(WindowsTool, WorksOutTheSameLight) {
-    expectSame("for i in '" OVPHOTO_SOURCE_DIR
+    expectSame("for i in '" + sourceFolder() +
                "/examples/'*.ies; do ovphoto intensity --json \"$i\" 0,0 12.3,45.6 30,270 89.9,359.9; done");
     for (const std::string shape : {"isotropic", "diffuse", "spotlight --hotspot 31 --falloff 47"})
         for (const std::string out : {"out.ies", "out.cib", "out.nmb", "out.tbt"})
