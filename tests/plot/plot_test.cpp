@@ -43,8 +43,10 @@ protected:
 TEST_F(ToolPlot, EveryKindIsWrittenInEveryFormat) {
     for (const std::string what :
          {"good.ies", "good.ies --kind cartesian --planes 0,45,90.5", "good.ies --kind cone",
-          "good.ies --kind isolux --height 2.5", "good.ies --kind solid --dark", "--sky",
-          "--sun-path --latitude 80 --date 6-21", "good.ies good.ies --size 700x300"}) {
+          "good.ies --kind isolux --height 2.5", "good.ies --kind solid --dark",
+          "--sky --latitude 41 --longitude 74 --time-zone 5",
+          "--sun-path --latitude 80 --longitude 0 --time-zone 0 --date 6-21",
+          "good.ies good.ies --size 700x300"}) {
         for (const auto& [file, start] : {std::pair{"a.svg", "<?xml"}, {"a.PNG", "\x89PNG"}, {"a.pdf", "%PDF"}}) {
             const ToolResult result = run(what + " -o " + file);
             EXPECT_EQ(result.status, 0) << what << result.err;

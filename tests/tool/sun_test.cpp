@@ -26,7 +26,11 @@ TEST_F(ToolSun, TheDefaultObjectHasItsSolarTime) {
         0.17 * std::sin(4 * 180 * degree * 92 / 373) - 0.129 * std::sin(2 * 180 * degree * 164 / 355);
     EXPECT_NEAR(sun["solarTime"].get<double>(), 9 + equation + 4 / 60.0, 2e-6);
     EXPECT_EQ(sun["maxDirectNormalIlluminance"], 131835);
-    EXPECT_EQ(sun.size(), 17U);
+    EXPECT_EQ(sun.size(), 22U);
+    for (const char* angle : {"Altitude", "Azimuth", "Zenith"}) {
+        const std::string key = std::string("solar") + angle;
+        EXPECT_NEAR(sun[key].get<double>(), sun[key + "Degrees"].get<double>() * degree, 2e-7) << key;
+    }
     const ToolResult text = run("sun");
     EXPECT_TRUE(text.says("0 is south, positive towards west")) << text.out;
     EXPECT_TRUE(text.says("lux") && text.says("cd/m2") && text.says("9:03")) << text.out;
@@ -60,7 +64,9 @@ TEST_F(ToolSun, EveryOptionReachesTheObject) {
 }
 
 TEST_F(ToolSun, SavedFormsAreToldApartAndGiveTheSameSettings) {
-    ASSERT_EQ(run("settings write a.txt --latitude 12.34 --time 7.7 --sky-cover 0.1").status, 0);
+    ASSERT_EQ(
+        run("settings write a.txt --latitude 12.34 --longitude 3 --time-zone 0 --time 7.7 --sky-cover 0.1").status,
+        0);
     ASSERT_EQ(run("settings write b.bin --binary --from a.txt").status, 0);
     ASSERT_EQ(run("settings write c.txt --from b.bin").status, 0);
     EXPECT_EQ(bytes("a.txt"), bytes("c.txt"));
@@ -111,12 +117,24 @@ TEST_F(ToolSun, WrongArgumentsGiveStatus2) {
         "--day 1.5",
         "--day 70000",
         "--day 1 --date 1-1",
+        "--date 2026-2-29",
+        "--date 2028-02-29",
+        "--date 26-06-21",
+        "--time 25",
+        "--time -1",
+        "--solar-time 24.5",
         "--time 24:01",
         "--time 10:5",
         "--time 1e39",
         "--time 10:60",
         "--time 8 --solar-time 9",
-        "--time-zone EST",
+        "--latitude 3",
+        "--latitude 3 --longitude 4",
+        "--time-zone 3",
+        "--latitude 3 --longitude 4 --time-zone EST",
+        "--latitude 3 --longitude 4 --time-zone +1",
+        "--latitude 3 --longitude 4 --time-zone UTC1",
+        "--latitude 3 --longitude 4 --time-zone UTC+15",
         "--sky-cover inf",
         "--daylight-saving 1",
         "--sun-position 10",
@@ -125,9 +143,9 @@ TEST_F(ToolSun, WrongArgumentsGiveStatus2) {
         "--illuminance -1",
     };
     for (const char* option : options) EXPECT_EQ(run(std::string("sun ") + option).status, 2) << option;
-    for (const char* arguments :
-         {"sky", "sky --zenith 3", "sky --azimuth 3", "sky --zenith 3 --azimuth 4 --normal 0,0,1", "settings",
-          "sky --normal 0,0,0", "settings frob x", "settings write", "sun --day-table --year-table"}) {
+    for (const char* arguments : {"sky", "sky --zenith 3", "sky --zenith -3 --azimuth 4", "sky --azimuth 3",
+                                  "sky --zenith 3 --azimuth 4 --normal 0,0,1", "settings", "sky --normal 0,0,0",
+                                  "settings frob x", "settings write", "sun --day-table --year-table"}) {
         EXPECT_EQ(run(arguments).status, 2) << arguments;
     }
 }
@@ -148,17 +166,19 @@ TEST_F(ToolSun, SkyAnswersForDirectionsAndSurfaces) {
     EXPECT_NEAR(level.get<double>() / sun["skyHorizontalIlluminance"].get<double>(), 1, 0.01);
     EXPECT_EQ(json("sky --normal 0,0,4")["illuminance"], level);
     EXPECT_TRUE(run("sky --zenith 30 --azimuth 0").says("0 is south, positive towards west"));
-    EXPECT_TRUE(run("sky --normal 0,0,1 --latitude 95").says("computed with 90 deg"));
+    EXPECT_TRUE(run("sky --normal 0,0,1 --latitude 95 --longitude 0 --time-zone 0").says("computed with 90 deg"));
 }
 
 TEST_F(ToolSun, TablesHaveARowForEachHourAndMonth) {
     const auto day = run("sun --day-table --json").json();
     ASSERT_EQ(day.size(), 24U);
     EXPECT_EQ(day[10], json("sun"));
-    const auto year = run("sun --year-table --latitude 70N --json").json();
+    const std::string north = " --latitude 70N --longitude 20E --time-zone UTC+1";
+    const auto year = run("sun --year-table --json" + north).json();
     ASSERT_EQ(year.size(), 12U);
-    EXPECT_EQ(year[5]["sunrise"], json("sun --latitude 70N")["sunrise"]);
-    const ToolResult text = run("sun --year-table --latitude 70N");
+    EXPECT_EQ(year[5]["sunrise"], json("sun" + north)["sunrise"]);
+    EXPECT_EQ(year[5]["site"], json("sun" + north)["site"]);
+    const ToolResult text = run("sun --year-table" + north);
     EXPECT_TRUE(text.says("the sun stays up") && text.says("the sun stays down")) << text.out;
     EXPECT_TRUE(run("sun --day-table").says("0 is south, positive towards west"));
 }
@@ -172,7 +192,46 @@ TEST_F(ToolSun, ZonesAndMonthsAreListed) {
     ASSERT_EQ(months.size(), 12U);
     EXPECT_EQ(months[11]["firstDay"].get<int>() + months[11]["days"].get<int>(), 366);
     EXPECT_TRUE(run("zones").says("UTC+9:30")) << "west is negative there";
-    EXPECT_TRUE(runShell("LC_ALL=de_DE.UTF-8 ovphoto months", folder).says("Dezember"));
+}
+
+/// Signs are those of the form: bare hours count towards west, those behind UTC towards east.
+TEST_F(ToolSun, SitesAreWrittenAsPeopleWriteThem) {
+    const std::pair<const char*, double> zones[] = {{"-1", -1},           {"5", 5},
+                                                    {"UTC", 0},           {"UTC+1", -1},
+                                                    {"utc-5", 5},         {"GMT+5:30", -5.5},
+                                                    {"UTC-3.5", 3.5},     {"UTC+9:30", -9.5},
+                                                    {"UTC+14", -14},      {"'Central European Time'", -1},
+                                                    {"'eastern time'", 5}};
+    for (const auto& [zone, hours] : zones) {
+        const auto sun =
+            json("sun --latitude 52.5 --longitude 13.4O --date 2026-06-21 --time-zone " + std::string(zone));
+        EXPECT_EQ(sun["site"]["timeZoneHours"], hours) << zone;
+        EXPECT_EQ(sun["site"]["longitudeDegrees"].get<float>(), -13.4F);
+        EXPECT_EQ(sun["day"], 172);
+    }
+    run("settings write berlin --latitude 52.5 --longitude 13.4E --time-zone -1");
+    EXPECT_EQ(json("sun --from berlin --latitude 50")["site"]["latitudeDegrees"], 50);
+    EXPECT_EQ(run("sun --from berlin").err, "");
+    for (const char* command : {"sun", "sky --normal 0,0,1", "settings write defaults"})
+        EXPECT_EQ(run(command).err, "note: no site is given; taken is 41 deg N, 74 deg W, UTC-5:00\n") << command;
+}
+
+TEST_F(ToolSun, GermanOutputIsGermanThroughout) {
+    run("settings write saved --latitude 95 --longitude 13.4E --time-zone -1 --sun-position 45,-90");
+    for (const char* command :
+         {"sun", "sun --day-table", "sun --year-table", "sky --normal 0,0,1", "sky --zenith 30 --azimuth 0",
+          "settings show saved", "sun --from saved", "zones", "months"}) {
+        const ToolResult german = runShell(std::string("LC_ALL=de_DE.UTF-8 ovphoto ") + command, folder);
+        EXPECT_EQ(german.status, 0) << command;
+        std::string text = german.out + german.err;
+        for (char& c : text) c = c == '\n' || c == ',' || c == ';' || c == ':' ? ' ' : c;
+        for (const char* word : {" the ",  " is ",  " sun ",   " sky ",   " deg ",     " lux ", " time ",
+                                 " day ",  " by ",  " clock ", " north ", " from ",    " E ",   " name ",
+                                 " Time ", " yes ", " no ",    " cover ", " azimuth ", " with "})
+            EXPECT_EQ(text.find(word), std::string::npos) << command << word << text;
+    }
+    const std::string months = runShell("LC_ALL=de_DE.UTF-8 ovphoto months", folder).out;
+    EXPECT_NE(months.find("    3  März       Mär     31"), std::string::npos) << months;  // columns of characters
 }
 
 }  // namespace

@@ -1,8 +1,13 @@
 #include "tools/ovphoto/lightText.h"
 
+#include <algorithm>
 #include <charconv>
 #include <chrono>
 #include <cmath>
+#include <numbers>
+
+#include "host/platform/path.h"
+#include "tools/ovphoto/language.h"
 
 namespace OvTool {
 
@@ -21,20 +26,29 @@ std::optional<int> parseTwoDigits(std::string_view text) {
 
 char upper(char c) { return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c; }
 
+/// In either case of ASCII letters.
+bool startsWith(std::string_view text, std::string_view start) {
+    return text.size() >= start.size() && std::equal(start.begin(), start.end(), text.begin(),
+                                                     [](char a, char b) { return upper(a) == upper(b); });
+}
+
 }  // namespace
 
-std::optional<float> parseSide(std::string_view text, char positive, char negative) {
-    const char side = text.empty() ? '\0' : upper(text.back());
-    if (side != positive && side != negative) return parseFloat(text);
+std::optional<float> parseSide(std::string_view text, std::string_view sides) {
+    const std::size_t side = text.empty() ? std::string_view::npos : sides.find(upper(text.back()));
+    if (side == std::string_view::npos) return parseFloat(text);
     text.remove_suffix(1);
     const auto degrees = parseFloat(text);
     if (!degrees || text.front() == '-') return {};
-    return side == positive ? degrees : -*degrees;
+    return side == 0 ? degrees : -*degrees;
 }
 
 std::optional<float> parseHours(std::string_view text) {
     const std::size_t colon = text.find(':');
-    if (colon == std::string_view::npos) return parseFloat(text);
+    if (colon == std::string_view::npos) {
+        const auto decimal = parseFloat(text);
+        return decimal && *decimal >= 0 && *decimal <= 24 ? decimal : std::nullopt;
+    }
     const auto hours = parseTwoDigits(text.substr(0, colon));
     const std::string_view rest = text.substr(colon + 1);
     const auto minutes = rest.size() == 2 ? parseTwoDigits(rest) : std::nullopt;
@@ -44,6 +58,8 @@ std::optional<float> parseHours(std::string_view text) {
 
 std::optional<Date> parseDate(std::string_view text) {
     namespace chrono = std::chrono;
+    constexpr std::size_t yearDigits = 4;
+    if (text.find_first_not_of("0123456789") == yearDigits) text.remove_prefix(yearDigits + 1);
     const std::size_t dash = text.find('-');
     if (dash == std::string_view::npos) return {};
     const auto month = parseTwoDigits(text.substr(0, dash));
@@ -63,8 +79,45 @@ std::optional<int> parseDay(std::string_view text) {
     return day;
 }
 
-std::string sideText(float degrees, char positive, char negative) {
-    return shortNumber(std::abs(degrees)) + " deg " + (degrees < 0 ? negative : positive);
+std::optional<float> parseZoneHours(std::string_view text) {
+    constexpr float furthest = 14;
+    if (!startsWith(text, "UTC") && !startsWith(text, "GMT")) return parseFloat(text);
+    text.remove_prefix(3);
+    if (text.empty()) return 0.0F;
+    if (text.front() != '+' && text.front() != '-') return {};
+    const auto hours = parseHours(text.substr(1));
+    if (!hours || *hours > furthest) return {};
+    return text.front() == '-' ? hours : 0 - *hours;
+}
+
+float zoneHours(int index, const OvPhotometrics::NumberedFunctions& functions) {
+    return static_cast<float>(std::round(functions.getTimeZoneMeridian(index) * 1200 / std::numbers::pi) / 100);
+}
+
+std::optional<float> findZoneHours(std::string_view name, const OvPhotometrics::NumberedFunctions& functions) {
+    for (int i = 0; i < functions.getTimeZoneCount(); ++i) {
+        const std::string zone = Ov::toUtf8(functions.getTimeZoneName(i));
+        if (zone.size() == name.size() && startsWith(zone, name)) return zoneHours(i, functions);
+    }
+    return {};
+}
+
+std::string degreesText(const std::string& number) { return number + inLanguage(" deg", " Grad"); }
+
+std::string latitudeText(float degrees) {
+    return degreesText(shortNumber(std::abs(degrees))) + (degrees < 0 ? " S" : " N");
+}
+
+std::string longitudeText(float degrees) {
+    return degreesText(shortNumber(std::abs(degrees))) + (degrees < 0 ? inLanguage(" E", " O") : " W");
+}
+
+const char* azimuthRule() {
+    return inLanguage("0 is south, positive towards west", "0 ist Süden, nach Westen positiv");
+}
+
+const char* azimuthSentence() {
+    return inLanguage("Azimuth 0 is south, positive towards west.", "Azimut 0 ist Süden, nach Westen positiv.");
 }
 
 std::string clockText(const OvPhotometrics::NumberedFunctions& functions, float hours) {

@@ -11,11 +11,13 @@ namespace {
 
 using namespace OvTool;
 
-/// Runs the command that was given; whatever it throws ends here as a message.
+/// Runs the command that was given; whatever it throws but wrong usage ends here as a message.
 int runCommand(const Action& action, const std::string& module) {
     try {
         HostSession session(module);
         return action(session);
+    } catch (const CLI::ParseError&) {
+        throw;  // what the module alone can tell of the arguments
     } catch (...) {
         std::cerr << "ovphoto: " << currentExceptionText() << '\n';
         return exitFailed;
@@ -38,11 +40,11 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     try {
         std::reverse(arguments.begin(), arguments.end());  // so they are parsed, from the end
         app.parse(arguments);
+        for (const auto& [sub, action] : actions) {
+            if (sub->parsed()) return runCommand(action, module);
+        }
     } catch (const CLI::ParseError& error) {
         return app.exit(error) == 0 ? exitWell : exitUsage;
-    }
-    for (const auto& [sub, action] : actions) {
-        if (sub->parsed()) return runCommand(action, module);
     }
     std::cerr << "A command is required\nRun with --help for more information.\n";
     return exitUsage;

@@ -5,6 +5,8 @@
 #include "host/componentManager/devices.h"
 #include "host/componentManager/persistant.h"
 #include "ovphoto/classIds.h"
+#include "tools/ovphoto/language.h"
+#include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/numbers.h"
 
@@ -37,12 +39,15 @@ bool loadFrom(RnNaturalLight& light, RnBufferedIO& io, std::vector<std::string>&
     const std::string start = peek(io);
     RnStream stream(&io, formOf(start));
     if (!rnCast<RnPersistant>(&light)->load(stream, 0, nullptr, nullptr)) return false;
-    if (isForeign(start)) reasons.push_back("of an unknown version; the defaults are taken");
+    if (isForeign(start))
+        reasons.push_back(inLanguage("of an unknown version; the defaults are taken",
+                                     "von unbekannter Version; es gelten die Vorgaben"));
     return true;
 }
 
 std::string rangeNote(const char* what, float value, const char* unit, float taken) {
-    return std::string(what) + " " + shortNumber(value) + unit + " is out of range; computed with " +
+    return std::string(what) + " " + shortNumber(value) + unit +
+           inLanguage(" is out of range; computed with ", " liegt außerhalb des Bereichs; gerechnet wird mit ") +
            shortNumber(taken) + unit;
 }
 
@@ -61,9 +66,9 @@ bool loadLight(RnNaturalLight& light, const std::string& file, std::vector<std::
         const RnRef<RnBufferedIO> io = openFile(file, error);
         if (io && loadFrom(light, *io, reasons)) return true;
     } catch (...) {
-        error = "cannot be read: " + currentExceptionText();
+        error = inLanguage("cannot be read: ", "nicht lesbar: ") + currentExceptionText();
     }
-    if (error.empty() && reasons.empty()) error = "refused by the module";
+    if (error.empty() && reasons.empty()) error = inLanguage("refused by the module", "vom Modul abgelehnt");
     if (!error.empty()) reasons.push_back(error);
     return false;
 }
@@ -84,23 +89,32 @@ std::vector<std::string> outOfRange(const RnNaturalLight& light) {
         if (value < low || value > high)
             notes.push_back(rangeNote(what, value, unit, value < low ? below : above));
     };
-    check("day", settings.day, "", 1, 365, 1, 365);
-    check("latitude", light.getLatitude(), " deg", -90, 90, -90, 90);
-    check("longitude", light.getLongitude(), " deg", -180, 180, -180, -180);
-    check("time zone", light.getTimeZone(), " deg", -180, 180, -180, -180);
-    check("sky cover", settings.skyCover, "", 0, 1, 0, 1);
+    const char* degrees = inLanguage(" deg", " Grad");
+    check(inLanguage("day", "Tag"), settings.day, "", 1, 365, 1, 365);
+    check(inLanguage("latitude", "Breite"), light.getLatitude(), degrees, -90, 90, -90, 90);
+    check(inLanguage("longitude", "Länge"), light.getLongitude(), degrees, -180, 180, -180, -180);
+    check(inLanguage("time zone", "Zeitzone"), light.getTimeZone(), degrees, -180, 180, -180, -180);
+    check(inLanguage("sky cover", "Bedeckung"), settings.skyCover, "", 0, 1, 0, 1);
     return notes;
 }
 
+std::string siteText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+    return latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude()) + ", " +
+           utcText(functions, light.getTimeZoneHours());
+}
+
 const char* skyText(float cover) {
-    return cover < 0.35F ? "clear" : cover <= 0.75F ? "partly cloudy" : "overcast";
+    return cover < 0.35F    ? inLanguage("clear", "klar")
+           : cover <= 0.75F ? inLanguage("partly cloudy", "teils bewölkt")
+                            : inLanguage("overcast", "bedeckt");
 }
 
 std::string dateText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
-    std::string day = "day " + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
+    const std::string day =
+        inLanguage("day ", "Tag ") + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
     if (light.getMonth() == 0) return day;
     const std::string month = toUtf8(functions.getMonthName(light.getMonth()));
-    return std::to_string(light.getDayOfMonth()) + " " + month + ", " + day;
+    return std::to_string(light.getDayOfMonth()) + inLanguage(" ", ". ") + month + ", " + day;
 }
 
 }  // namespace OvTool

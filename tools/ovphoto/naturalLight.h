@@ -20,10 +20,13 @@ bool loadLight(Ov::RnNaturalLight& light, const std::string& file, std::vector<s
 /// What the object's own save writes.
 std::string savedLight(Ov::RnNaturalLight& light, Ov::RnStream::Form form);
 
+/// "41 deg N, 74 deg W, UTC-5:00".
+std::string siteText(const Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions);
+
 /// Which settings lie outside their ranges, and what is computed with instead.
 std::vector<std::string> outOfRange(const Ov::RnNaturalLight& light);
 
-/// "clear", "partly cloudy" or "overcast".
+/// "clear", "partly cloudy" or "overcast", in the user's language.
 const char* skyText(float cover);
 
 /// "21 June, day 172".

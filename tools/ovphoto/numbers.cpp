@@ -74,8 +74,14 @@ std::string exactNumber(float value) {
     return {text, std::to_chars(std::begin(text), std::end(text), value).ptr};
 }
 
+std::size_t characterCount(std::string_view text) {
+    return static_cast<std::size_t>(
+        std::count_if(text.begin(), text.end(), [](char c) { return (c & 0xC0) != 0x80; }));
+}
+
 std::string padLeft(const std::string& text, std::size_t width) {
-    return text.size() < width ? std::string(width - text.size(), ' ') + text : text;
+    const std::size_t count = characterCount(text);
+    return count < width ? std::string(width - count, ' ') + text : text;
 }
 
 }  // namespace OvTool

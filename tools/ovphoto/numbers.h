@@ -24,6 +24,8 @@ std::string fixedNumber(double value, int decimals);
 /// As many digits as the float needs to read back the same.
 std::string exactNumber(float value);
 
+/// The characters of an UTF-8 text.
+std::size_t characterCount(std::string_view text);
 /// The text right-aligned in a field of `width` characters.
 std::string padLeft(const std::string& text, std::size_t width);
 

@@ -3,19 +3,21 @@
 #include <algorithm>
 #include <iostream>
 
+#include "tools/ovphoto/numbers.h"
+
 namespace OvTool {
 
 void Table::print(std::size_t indent) const {
     std::vector<std::size_t> widths;
     for (const auto& row : _rows) {
         widths.resize(std::max(widths.size(), row.size()));
-        for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
+        for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], characterCount(row[i]));
     }
     for (const auto& row : _rows) {
         std::string line(indent, ' ');
         for (std::size_t i = 0; i < row.size(); ++i) {
             line += row[i];
-            if (i + 1 < row.size()) line.append(widths[i] - row[i].size() + 2, ' ');
+            if (i + 1 < row.size()) line.append(widths[i] - characterCount(row[i]) + 2, ' ');
         }
         std::cout << line << '\n';
     }

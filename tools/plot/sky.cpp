@@ -66,7 +66,7 @@ void drawScale(Canvas& canvas, const Box& box, const Axis& axis) {
     canvas.text({box.left, box.top - 18}, "cd/m\u00b2", canvas.font());
 }
 
-void drawDome(Canvas& canvas, const SkyDome& dome) {
+void drawDome(Canvas& canvas, const SkyDome& dome, const SkyWords& words) {
     const Palette& palette = canvas.palette();
     for (const double altitude : {30.0, 60.0}) {
         const Point place = dome.at(altitude, 180);
@@ -74,7 +74,7 @@ void drawDome(Canvas& canvas, const SkyDome& dome) {
         canvas.label(place, tickLabel(altitude) + "\u00b0", canvas.font(11));
     }
     canvas.circle(dome.centre, dome.radius, {palette.ink, 1.6, 0});
-    for (const auto& [name, azimuth] : compassPoints)
+    for (const auto& [name, azimuth] : compassPoints(words.east))
         canvas.text(dome.outside(15, azimuth), name, {15, palette.ink, true}, Align::centre);
 }
 
@@ -91,7 +91,7 @@ void drawSky(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& captio
     const double most = *std::max_element(values.begin(), values.end());
     const Axis axis = axisTo(most, 6);
     drawLuminances(canvas, dome, values, axis);
-    drawDome(canvas, dome);
+    drawDome(canvas, dome, caption.words);
     const double altitude = degrees(light.getSolarAltitude());
     if (altitude > 0) {
         const Point sun = dome.at(altitude, degrees(light.getSolarAzimuth()));
@@ -103,7 +103,7 @@ void drawSky(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& captio
                   {room.right - 62, dome.centre.y - radius * 0.8, room.right - 44, dome.centre.y + radius * 0.8},
                   axis);
     } else {
-        canvas.label(dome.centre, "no light from the sky", canvas.font());
+        canvas.label(dome.centre, caption.words.dark, canvas.font());
     }
 }
 

@@ -10,10 +10,21 @@
 
 namespace OvPlot {
 
+/// What a picture says by itself.
+struct SkyWords {
+    const char* east = "E";
+    const char* to = " to ";  // between dates
+    const char* hours = "hours of the clock";
+    const char* setDay = "the set day";
+    const char* dark = "no light from the sky";
+    const char* dayEnd = " ";  // behind the day of a date
+};
+
 struct SkyCaption {
     std::string title;
     std::string subtitle;
     std::vector<std::string> notes;
+    SkyWords words = {};
 };
 
 /// The sky's luminance as one sees it who looks up with north on top: east is on the left.

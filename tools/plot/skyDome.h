@@ -1,5 +1,7 @@
 #pragma once
 
+#include <array>
+
 #include "tools/plot/canvas.h"
 #include "tools/plot/lightFrame.h"
 
@@ -25,7 +27,9 @@ struct CompassPoint {
     const char* name;
     double azimuth;
 };
-inline constexpr CompassPoint compassPoints[] = {{"N", 180}, {"E", -90}, {"S", 0}, {"W", 90}};
+inline std::array<CompassPoint, 4> compassPoints(const char* east) {
+    return {{{"N", 180}, {east, -90}, {"S", 0}, {"W", 90}}};
+}
 
 inline double degrees(double radian) { return radian * 180 / std::numbers::pi; }
 

@@ -125,11 +125,12 @@ void labelHour(Canvas& canvas, const SkyDome& dome, LabelPlacer& placer, const s
 
 std::vector<LegendItem> legendOf(const SkyCaption& caption, const std::array<std::string, 12>& months,
                                  const Pen pens[4]) {
-    const std::string day = std::to_string(monthDay) + " ";
-    std::vector<LegendItem> legend{{pens[0], day + months[0] + " to " + day + months[5]},
-                                   {pens[1], day + months[6] + " to " + day + months[11]},
-                                   {pens[2], "hours of the clock"},
-                                   {pens[3], "the set day"}};
+    const SkyWords& words = caption.words;
+    const std::string day = std::to_string(monthDay) + words.dayEnd;
+    std::vector<LegendItem> legend{{pens[0], day + months[0] + words.to + day + months[5]},
+                                   {pens[1], day + months[6] + words.to + day + months[11]},
+                                   {pens[2], words.hours},
+                                   {pens[3], words.setDay}};
     for (std::size_t i = 0; i < caption.notes.size(); ++i) legend.push_back({{}, caption.notes[i], i == 0});
     return legend;
 }
@@ -147,7 +148,7 @@ void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& ca
     const SkyDome dome{room.centre(), std::min(room.width() / 2 - 74, room.height() / 2 - 28), false};
     LabelPlacer placer({0, room.top - 4, canvas.width(), room.bottom + 6});
     drawDome(canvas, dome);
-    for (const auto& [name, azimuth] : compassPoints)
+    for (const auto& [name, azimuth] : compassPoints(caption.words.east))
         placeText(canvas, placer,
                   {{dome.outside(azimuth == 90 || azimuth == -90 ? 62 : 15, azimuth), Align::centre}}, name,
                   {15, palette.ink, true});
@@ -166,7 +167,8 @@ void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& ca
         const std::vector<Path> paths = dayPaths(dome, *moving);
         strokeAll(canvas, paths, pens[month > 6]);
         labelDay(canvas, dome, placer, paths,
-                 std::to_string(monthDay) + " " + months[static_cast<std::size_t>(month - 1)], month > 6);
+                 std::to_string(monthDay) + caption.words.dayEnd + months[static_cast<std::size_t>(month - 1)],
+                 month > 6);
     }
     moving->setDayOfYear(light.getDayOfYear());
     strokeAll(canvas, dayPaths(dome, *moving), pens[3]);

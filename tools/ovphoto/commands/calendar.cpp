@@ -1,11 +1,10 @@
 #include <CLI/CLI.hpp>
-#include <cmath>
 #include <memory>
-#include <numbers>
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/naturalLight.h"
 #include "tools/ovphoto/table.h"
@@ -14,17 +13,15 @@ namespace OvTool {
 
 namespace {
 
-/// Hours towards west of a meridian (radians), to a hundredth.
-float hoursOf(float meridian) { return static_cast<float>(std::round(meridian * 1200 / std::numbers::pi) / 100); }
-
 int listZones(const HostSession& session, bool json) {
     const auto functions = session.functions();
     Table table;
-    table.add({"index", "offset", "meridian", "name"});
+    table.add({inLanguage("index", "Nummer"), inLanguage("offset", "Abstand"), inLanguage("meridian", "Meridian"),
+               inLanguage("name", "Name")});
     for (int i = 0; i < functions.getTimeZoneCount(); ++i) {
         const std::string name = Ov::toUtf8(functions.getTimeZoneName(i));
         const float meridian = functions.getTimeZoneMeridian(i);
-        const float hours = hoursOf(meridian);
+        const float hours = zoneHours(i, functions);
         if (json) {
             printLine(Json{{"index", i},
                            {"name", name},
@@ -32,8 +29,7 @@ int listZones(const HostSession& session, bool json) {
                            {"meridian", meridian},
                            {"flag", functions.getTimeZoneFlag(i)}});
         } else {
-            table.add(
-                {padLeft(std::to_string(i), 5), utcText(functions, hours), sideText(15 * hours, 'W', 'E'), name});
+            table.add({padLeft(std::to_string(i), 5), utcText(functions, hours), longitudeText(15 * hours), name});
         }
     }
     if (!json) table.print();
@@ -43,7 +39,8 @@ int listZones(const HostSession& session, bool json) {
 int listMonths(const HostSession& session, bool json) {
     const auto functions = session.functions();
     Table table;
-    table.add({"month", "name", "short", "days", "first day"});
+    table.add({inLanguage("month", "Monat"), inLanguage("name", "Name"), inLanguage("short", "kurz"),
+               inLanguage("days", "Tage"), inLanguage("first day", "erster Tag")});
     for (int month = 1; functions.getDaysInMonth(month) > 0; ++month) {
         const std::string name = Ov::toUtf8(functions.getMonthName(month));
         const std::string shortName = Ov::toUtf8(functions.getMonthShortName(month));

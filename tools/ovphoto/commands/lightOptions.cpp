@@ -1,8 +1,10 @@
 #include "tools/ovphoto/commands/lightOptions.h"
 
+#include <algorithm>
 #include <iostream>
 
 #include "tools/ovphoto/commands/parsedOption.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/numbers.h"
 
@@ -16,7 +18,7 @@ namespace {
 template <class Parse, class Apply>
 CLI::Option* addChange(CLI::App& app, LightOptions& options, const OptionText& text, Parse parse, Apply apply) {
     return addParsed(app, text, parse, [&options, apply](const auto& value) {
-        options.changes.push_back([apply, value](RnNaturalLight& light) { apply(light, value); });
+        options.changes.push_back([apply, value](RnNaturalLight& light, const auto&) { apply(light, value); });
     });
 }
 
@@ -31,22 +33,57 @@ std::optional<float> parseIlluminance(std::string_view text) {
     return lux && *lux >= 0 ? lux : std::nullopt;
 }
 
+/// Hours where they can be told without the module, which knows the names of zones.
+struct Zone {
+    std::optional<float> hours;
+    std::string name;
+};
+
+std::optional<Zone> parseZone(const std::string& text) {
+    const auto hours = parseZoneHours(text);
+    // What looks like hours is no name.
+    const bool isName = !text.empty() && text.find_first_of("0123456789") == std::string::npos;
+    if (hours || isName) return Zone{hours, text};
+    throw CLI::ValidationError("--time-zone",
+                               "'" + text +
+                                   "' is no time zone: hours behind Greenwich (5 in New York, -1 in "
+                                   "Berlin), UTC-5 or UTC+1, or a name that `zones` prints");
+}
+
+CLI::Option* addZone(CLI::App& app, LightOptions& options) {
+    static constexpr OptionText text{
+        "--time-zone", "HOURS|UTC+H|NAME",
+        "Hours behind Greenwich, west positive (5 in New York, -1 in Berlin); or behind "
+        "UTC as clocks count, east positive (UTC-5, UTC+1); or a name as `zones` prints "
+        "it"};
+    return addParsed(app, text, parseZone, [&options](const Zone& zone) {
+        options.changes.push_back(
+            [zone](RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+                const auto hours = zone.hours ? zone.hours : findZoneHours(zone.name, functions);
+                if (!hours) throw CLI::ValidationError(text.name, "`zones` lists no '" + zone.name + "'");
+                light.setTimeZoneHours(*hours);
+            });
+    });
+}
+
 void addSite(CLI::App& app, LightOptions& options) {
-    addChange(
+    auto* latitude = addChange(
         app, options, {"--latitude", "DEG|DEG[N|S]", "Latitude, north positive"},
-        [](const std::string& text) { return parseSide(text, 'N', 'S'); },
+        [](const std::string& text) { return parseSide(text, northSouth); },
         [](RnNaturalLight& light, float degrees) { light.setLatitude(degrees); });
-    addChange(
+    auto* longitude = addChange(
         app, options, {"--longitude", "DEG|DEG[W|E]", "Longitude, west positive"},
-        [](const std::string& text) { return parseSide(text, 'W', 'E'); },
+        [](const std::string& text) { return parseSide(text, westEast); },
         [](RnNaturalLight& light, float degrees) { light.setLongitude(degrees); });
+    options.site = {latitude, longitude, addZone(app, options)};
     addChange(app, options, {"--north", "DEG", "Added to azimuths to turn them into the scene"}, parseFloat,
               [](RnNaturalLight& light, float degrees) { light.setNorth(degrees); });
 }
 
 void addTime(CLI::App& app, LightOptions& options) {
-    auto* date = addChange(app, options, {"--date", "MM-DD", "Date, in a year of 365 days"}, parseDate,
-                           [](RnNaturalLight& light, Date value) { light.setDate(value.month, value.day); });
+    auto* date = addChange(
+        app, options, {"--date", "[YYYY-]MM-DD", "Date, in a year of 365 days; which year plays no part"},
+        parseDate, [](RnNaturalLight& light, Date value) { light.setDate(value.month, value.day); });
     auto* day =
         addChange(app, options, {"--day", "N", "Day of the year, 1 to 365"}, parseDay,
                   [](RnNaturalLight& light, int value) { light.setDayOfYear(static_cast<std::uint16_t>(value)); });
@@ -57,8 +94,6 @@ void addTime(CLI::App& app, LightOptions& options) {
         addChange(app, options, {"--solar-time", "H|H:MM", "Time by the sun, instead; at 12 the sun is highest"},
                   parseHours, [](RnNaturalLight& light, float hours) { light.setSolarTime(hours); });
     local->excludes(solar);
-    addChange(app, options, {"--time-zone", "HOURS", "Hours behind Greenwich, west positive"}, parseFloat,
-              [](RnNaturalLight& light, float hours) { light.setTimeZoneHours(hours); });
     addChange(app, options, {"--daylight-saving", "yes|no", "Whether the clock is an hour ahead"}, parseYesNo,
               [](RnNaturalLight& light, bool on) { light.setDaylightSaving(on); });
 }
@@ -81,6 +116,15 @@ void addSky(CLI::App& app, LightOptions& options) {
               });
 }
 
+/// Whether the options name a site.
+bool namesSite(const LightOptions& options) {
+    const auto given = std::count_if(options.site.begin(), options.site.end(),
+                                     [](const CLI::Option* option) { return option->count() > 0; });
+    if (given > 0 && given < std::ssize(options.site) && options.from.empty())
+        throw CLI::ValidationError("--latitude, --longitude and --time-zone", "a site takes all three, or --from");
+    return given > 0 || !options.from.empty();
+}
+
 }  // namespace
 
 void addLightOptions(CLI::App& app, LightOptions& options) {
@@ -91,6 +135,7 @@ void addLightOptions(CLI::App& app, LightOptions& options) {
 }
 
 RnRef<RnNaturalLight> makeLight(const HostSession& session, const LightOptions& options, bool json) {
+    const bool sited = namesSite(options);
     RnRef<RnNaturalLight> light = createLight(session);
     if (!options.from.empty()) {
         std::vector<std::string> reasons;
@@ -99,12 +144,17 @@ RnRef<RnNaturalLight> makeLight(const HostSession& session, const LightOptions& 
         if (!loaded && json) printRefusal(options.from, reasons);
         if (!loaded) return {};
     }
-    for (const auto& change : options.changes) change(*light);
+    const auto functions = session.functions();
+    for (const auto& change : options.changes) change(*light, functions);
+    if (!sited)
+        std::cerr << inLanguage("note: no site is given; taken is ", "Hinweis: Kein Ort ist angegeben; es gilt ")
+                  << siteText(*light, functions) << '\n';
     return light;
 }
 
 void showOutOfRange(const RnNaturalLight& light) {
-    for (const std::string& note : outOfRange(light)) std::cerr << "note: " << note << '\n';
+    for (const std::string& note : outOfRange(light))
+        std::cerr << inLanguage("note: ", "Hinweis: ") << note << '\n';
 }
 
 }  // namespace OvTool

@@ -11,14 +11,18 @@ namespace OvTool {
 
 /// Site, date, time and sky as the user gave them: a saved form to start from, and what to change in it.
 struct LightOptions {
+    using Change = std::function<void(Ov::RnNaturalLight&, const OvPhotometrics::NumberedFunctions&)>;
+
     std::string from;
-    std::vector<std::function<void(Ov::RnNaturalLight&)>> changes;
+    std::vector<Change> changes;
+    std::vector<const CLI::Option*> site;  // those that name a place only together
 };
 
 /// Declares the options. `options` must outlive the parsing.
 void addLightOptions(CLI::App& app, LightOptions& options);
 
-/// An object with the options applied. Null when the saved form is refused; its reasons have been shown then.
+/// An object with the options applied. Null when the saved form is refused; its reasons have been shown then. Half a
+/// site and an unknown time zone raise CLI::ValidationError. Where no site is given, standard error tells which it is.
 Ov::RnRef<Ov::RnNaturalLight> makeLight(const HostSession& session, const LightOptions& options, bool json);
 
 /// Tells on standard error which settings are out of range, for commands that compute with them.

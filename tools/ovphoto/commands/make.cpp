@@ -21,6 +21,8 @@ namespace {
 constexpr float narrowest = 0.11F;
 constexpr float widestHotspot = 89;
 constexpr float widestFalloff = 90;
+constexpr float usualHotspot = 30;
+constexpr float usualFalloff = 60;
 constexpr float usualFlux = 1000;  // lumens
 
 struct MakeOptions {
@@ -117,6 +119,11 @@ void addSpotlight(CLI::App& app, MakeOptions& options) {
 void checkArguments(MakeOptions& options) {
     if (options.kind != "spotlight" && (options.hotspot || options.falloff))
         throw CLI::ValidationError("--hotspot, --falloff", "only a spotlight has these angles");
+    const float hotspot = options.hotspot.value_or(usualHotspot);
+    const float falloff = options.falloff.value_or(usualFalloff);
+    if (hotspot > falloff)
+        throw CLI::ValidationError(
+            "--hotspot", shortNumber(hotspot) + " degrees are more than the falloff's " + shortNumber(falloff));
     if (!options.target) options.target = targetForOutput(options.out);
 }
 

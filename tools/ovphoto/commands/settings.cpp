@@ -4,6 +4,7 @@
 
 #include "tools/ovphoto/commands/lightOptions.h"
 #include "tools/ovphoto/json.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/table.h"
@@ -21,45 +22,53 @@ struct SettingsOptions {
     bool json = false;
 };
 
-const char* yesNo(bool value) { return value ? "yes" : "no"; }
+const char* yesNo(bool value) { return value ? inLanguage("yes", "ja") : inLanguage("no", "nein"); }
 
 std::string colorText(const RnNaturalLight::Triple& color) {
     return shortNumber(color[0]) + ", " + shortNumber(color[1]) + ", " + shortNumber(color[2]);
 }
 
 std::string flagsText(bool shadows, bool second, bool third) {
-    return std::string("casts shadows ") + yesNo(shadows) + ", second flag " + yesNo(second) + ", third flag " +
-           yesNo(third);
+    return inLanguage("casts shadows ", "wirft Schatten: ") + std::string(yesNo(shadows)) +
+           inLanguage(", second flag ", ", zweites Merkmal: ") + yesNo(second) +
+           inLanguage(", third flag ", ", drittes Merkmal: ") + yesNo(third);
 }
 
-std::string degreesText(float radians) { return shortNumber(toDegrees(radians)) + " deg"; }
+std::string angleText(float radians) { return degreesText(shortNumber(toDegrees(radians))); }
+
+const char* computed() { return inLanguage("computed", "berechnet"); }
 
 std::string positionText(const NaturalLightSettings& s) {
-    if (!s.overrideSolarPosition) return "computed";
-    return "altitude " + degreesText(s.solarAltitude) + ", azimuth " + degreesText(s.solarAzimuth) +
-           " (0 is south, positive towards west)";
+    if (!s.overrideSolarPosition) return computed();
+    return inLanguage("altitude ", "Höhe ") + angleText(s.solarAltitude) + inLanguage(", azimuth ", ", Azimut ") +
+           angleText(s.solarAzimuth) + " (" + azimuthRule() + ")";
 }
 
 void printText(const RnNaturalLight& light, const NaturalLightSettings& s,
                const OvPhotometrics::NumberedFunctions& functions) {
     Table table;
-    table.add({"Natural light", std::string(s.enabled ? "on" : "off") + ", " + (s.outside ? "out" : "in")});
-    table.add({"Latitude", sideText(light.getLatitude(), 'N', 'S')});
-    table.add({"Longitude", sideText(light.getLongitude(), 'W', 'E')});
-    table.add({"North", degreesText(s.north) + " added to azimuths"});
-    table.add({"Date", dateText(light, functions)});
-    table.add({"Clock", clockText(functions, s.localTime)});
-    table.add({"Time zone", utcText(functions, light.getTimeZoneHours())});
-    table.add({"Daylight saving", yesNo(s.daylightSaving)});
-    table.add({"Sky cover", shortNumber(s.skyCover)});
-    table.add({"Sun position", positionText(s)});
-    table.add({"Sun, facing it",
-               s.overrideSolarIlluminance ? shortNumber(s.directNormalIlluminance) + " lux" : "computed"});
-    table.add({"Sun color", colorText(s.sunColor)});
-    table.add({"Sky color", colorText(s.skyColor)});
-    table.add({"Sun", flagsText(s.sunCastsShadows, s.sunFlag2, s.sunFlag3)});
-    table.add({"Sky", flagsText(s.skyCastsShadows, s.skyFlag2, s.skyFlag3)});
-    table.add({"Sky shadows", "accuracy " + shortNumber(s.skyShadowAccuracy)});
+    table.add({inLanguage("Natural light", "Tageslicht"),
+               inLanguage(s.enabled ? "on" : "off", s.enabled ? "ein" : "aus") + std::string(", ") +
+                   inLanguage(s.outside ? "out" : "in", s.outside ? "außen" : "innen")});
+    table.add({inLanguage("Latitude", "Breite"), latitudeText(light.getLatitude())});
+    table.add({inLanguage("Longitude", "Länge"), longitudeText(light.getLongitude())});
+    table.add({inLanguage("North", "Norden"),
+               angleText(s.north) + inLanguage(" added to azimuths", " zu Azimuten addiert")});
+    table.add({inLanguage("Date", "Datum"), dateText(light, functions)});
+    table.add({inLanguage("Clock", "Uhrzeit"), clockText(functions, s.localTime)});
+    table.add({inLanguage("Time zone", "Zeitzone"), utcText(functions, light.getTimeZoneHours())});
+    table.add({inLanguage("Daylight saving", "Sommerzeit"), yesNo(s.daylightSaving)});
+    table.add({inLanguage("Sky cover", "Bedeckung"), shortNumber(s.skyCover)});
+    table.add({inLanguage("Sun position", "Sonnenstand"), positionText(s)});
+    table.add({inLanguage("Sun, facing it", "Zur Sonne hin"),
+               s.overrideSolarIlluminance ? shortNumber(s.directNormalIlluminance) + inLanguage(" lux", " Lux")
+                                          : computed()});
+    table.add({inLanguage("Sun color", "Sonnenfarbe"), colorText(s.sunColor)});
+    table.add({inLanguage("Sky color", "Himmelsfarbe"), colorText(s.skyColor)});
+    table.add({inLanguage("Sun", "Sonne"), flagsText(s.sunCastsShadows, s.sunFlag2, s.sunFlag3)});
+    table.add({inLanguage("Sky", "Himmel"), flagsText(s.skyCastsShadows, s.skyFlag2, s.skyFlag3)});
+    table.add({inLanguage("Sky shadows", "Himmelsschatten"),
+               inLanguage("accuracy ", "Genauigkeit ") + shortNumber(s.skyShadowAccuracy)});
     table.print(2);
 }
 
@@ -92,7 +101,7 @@ Json recordJson(const NaturalLightSettings& s) {
 }
 
 int runShow(const SettingsOptions& options, const HostSession& session) {
-    const auto light = makeLight(session, {options.file, {}}, options.json);
+    const auto light = makeLight(session, {options.file, {}, {}}, options.json);
     if (!light) return exitFailed;
     NaturalLightSettings settings;
     light->getSettings(settings);

@@ -6,6 +6,7 @@
 #include "tools/ovphoto/commands/lightOptions.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/json.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 
 namespace OvTool {
@@ -32,6 +33,11 @@ Vector normalised(const Vector& v) {
             static_cast<float>(v[2] / length)};
 }
 
+std::optional<float> parseZenith(std::string_view text) {
+    const auto degrees = parseFloat(text);
+    return degrees && *degrees >= 0 ? degrees : std::nullopt;
+}
+
 std::optional<Vector> parseNormal(std::string_view text) {
     const auto vector = parseList<3>(text);
     return vector == Vector{} ? std::nullopt : vector;
@@ -40,17 +46,22 @@ std::optional<Vector> parseNormal(std::string_view text) {
 void printLuminance(RnNaturalLight& light, const SkyOptions& options) {
     const float luminance = light.getSkyLuminanceAt(*options.zenith, *options.azimuth);
     if (options.json) return printLine(Json{{"luminance", luminance}});
-    std::cout << shortNumber(luminance) << " cd/m2 at zenith angle " << shortNumber(*options.zenith)
-              << " deg, azimuth " << shortNumber(*options.azimuth)
-              << " deg\nAzimuth 0 is south, positive towards west.\n";
+    std::cout << shortNumber(luminance) << inLanguage(" cd/m2 at zenith angle ", " cd/m2 im Winkel zum Zenit von ")
+              << degreesText(shortNumber(*options.zenith)) << inLanguage(", azimuth ", ", Azimut ")
+              << degreesText(shortNumber(*options.azimuth)) << '\n'
+              << azimuthSentence() << '\n';
 }
 
 void printIlluminance(RnNaturalLight& light, const SkyOptions& options) {
     const float illuminance = light.getSkyIlluminance(normalised(*options.normal).data());
     if (options.json) return printLine(Json{{"illuminance", illuminance}});
-    std::cout << shortNumber(illuminance) << " lux from the sky on a surface that faces "
+    std::cout << shortNumber(illuminance)
+              << inLanguage(" lux from the sky on a surface that faces ",
+                            " Lux vom Himmel auf eine Fläche in Richtung ")
               << shortNumber((*options.normal)[0]) << ", " << shortNumber((*options.normal)[1]) << ", "
-              << shortNumber((*options.normal)[2]) << "\nScene: x east, y north, z up, before north is turned.\n";
+              << shortNumber((*options.normal)[2])
+              << inLanguage("\nScene: x east, y north, z up, before north is turned.\n",
+                            "\nSzene: x Osten, y Norden, z oben, bevor Norden gedreht ist.\n");
 }
 
 int runSky(const SkyOptions& options, const HostSession& session) {
@@ -65,7 +76,7 @@ int runSky(const SkyOptions& options, const HostSession& session) {
 
 Action declareSky(CLI::App& app) {
     auto options = std::make_shared<SkyOptions>();
-    auto* zenith = addParsed(app, {"--zenith", "DEG", "Luminance at this angle from the zenith"}, parseFloat,
+    auto* zenith = addParsed(app, {"--zenith", "DEG", "Luminance at this angle from the zenith"}, parseZenith,
                              [options = options.get()](float value) { options->zenith = value; });
     auto* azimuth = addParsed(app, {"--azimuth", "DEG", "and this azimuth: 0 south, positive towards west"},
                               parseFloat, [options = options.get()](float value) { options->azimuth = value; });

@@ -6,6 +6,7 @@
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/lightOptions.h"
 #include "tools/ovphoto/json.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/table.h"
 
@@ -26,28 +27,53 @@ struct SunOptions {
 constexpr int hoursInDay = 24;
 constexpr int monthsInYear = 12;
 constexpr int yearTableDay = 21;  // of each month: about the solstices and equinoxes
-constexpr const char* azimuthNote = "Azimuth 0 is south, positive towards west.";
 
-/// Every derived value, as the interface gives it.
+/// Adds an angle in radians, as the interface gives it, and in degrees.
+void addAngle(Json& object, const std::string& key, float radians, double degrees) {
+    object[key] = radians;
+    object[key + "Degrees"] = static_cast<float>(degrees);
+}
+
+void addAngle(Json& object, const std::string& key, float radians) {
+    addAngle(object, key, radians, radians * 180 / std::numbers::pi);
+}
+
+/// The place and its clock.
+Json siteJson(const RnNaturalLight& light) {
+    NaturalLightSettings settings;
+    light.getSettings(settings);
+    Json site;
+    addAngle(site, "latitude", settings.latitude, light.getLatitude());
+    addAngle(site, "longitude", settings.longitude, light.getLongitude());
+    addAngle(site, "north", settings.north, light.getNorth());
+    site["timeZoneHours"] = light.getTimeZoneHours();
+    site["daylightSaving"] = light.getDaylightSaving();
+    return site;
+}
+
+/// The site, and every derived value as the interface gives it.
 Json sunJson(RnNaturalLight& light) {
     const float solarTime = light.getSolarTime();  // first: where it was given, the local time follows from it
-    return Json{{"localTime", light.getLocalTime()},
-                {"solarTime", solarTime},
-                {"equationOfTime", light.getEquationOfTime()},
-                {"sunrise", light.getSunrise()},
-                {"sunset", light.getSunset()},
-                {"solarNoon", light.getSolarNoon()},
-                {"sunriseSolarTime", light.getSunriseSolarTime()},
-                {"sunsetSolarTime", light.getSunsetSolarTime()},
-                {"solarAltitude", light.getSolarAltitude()},
-                {"solarAzimuth", light.getSolarAzimuth()},
-                {"solarZenith", light.getSolarZenith()},
-                {"sunDirection", light.getSunDirection()},
-                {"directNormalIlluminance", light.getDirectNormalIlluminance()},
-                {"directHorizontalIlluminance", light.getDirectHorizontalIlluminance()},
-                {"skyHorizontalIlluminance", light.getSkyHorizontalIlluminance()},
-                {"zenithLuminance", light.getZenithLuminance()},
-                {"maxDirectNormalIlluminance", light.getMaxDirectNormalIlluminance()}};
+    Json sun{{"site", siteJson(light)},
+             {"day", light.getDayOfYear()},
+             {"localTime", light.getLocalTime()},
+             {"solarTime", solarTime},
+             {"equationOfTime", light.getEquationOfTime()},
+             {"sunrise", light.getSunrise()},
+             {"sunset", light.getSunset()},
+             {"solarNoon", light.getSolarNoon()},
+             {"sunriseSolarTime", light.getSunriseSolarTime()},
+             {"sunsetSolarTime", light.getSunsetSolarTime()}};
+    addAngle(sun, "solarAltitude", light.getSolarAltitude());
+    addAngle(sun, "solarAzimuth", light.getSolarAzimuth());
+    addAngle(sun, "solarZenith", light.getSolarZenith());
+    sun.update(Json{{"sunDirection", light.getSunDirection()},
+                    {"directNormalIlluminance", light.getDirectNormalIlluminance()},
+                    {"directHorizontalIlluminance", light.getDirectHorizontalIlluminance()},
+                    {"skyHorizontalIlluminance", light.getSkyHorizontalIlluminance()},
+                    {"zenithLuminance", light.getZenithLuminance()},
+                    {"maxDirectNormalIlluminance", light.getMaxDirectNormalIlluminance()}});
+    return sun;
 }
 
 std::string degreesNumber(float radians) { return fixedNumber(radians * 180 / std::numbers::pi, 1); }
@@ -61,42 +87,62 @@ std::string vectorText(const RnNaturalLight::Triple& v) {
 const char* polarText(RnNaturalLight& light) {
     constexpr float noise = 1e-4F;  // of clock times, in hours
     const float daylight = light.getSunset() - light.getSunrise();
-    return daylight < noise ? "the sun stays down" : daylight > hoursInDay - noise ? "the sun stays up" : nullptr;
+    return daylight < noise ? inLanguage("the sun stays down", "die Sonne bleibt unter dem Horizont")
+           : daylight > hoursInDay - noise ? inLanguage("the sun stays up", "die Sonne bleibt über dem Horizont")
+                                           : nullptr;
 }
 
 void addPlaceAndTime(Table& table, RnNaturalLight& light, const NumberedFunctions& functions) {
     const std::string equation = fixedNumber(60 * light.getEquationOfTime(), 1) + " min";
-    const char* saving = light.getDaylightSaving() ? ", daylight saving time" : "";
-    table.add(
-        {"Place", sideText(light.getLatitude(), 'N', 'S') + ", " + sideText(light.getLongitude(), 'W', 'E')});
-    table.add({"Date", dateText(light, functions)});
-    table.add({"Clock", clockText(functions, light.getLocalTime()) + ", " +
-                            utcText(functions, light.getTimeZoneHours()) + saving});
-    table.add({"Solar time", clockText(functions, light.getSolarTime()) + ", equation of time " + equation});
+    const char* saving = light.getDaylightSaving() ? inLanguage(", daylight saving time", ", Sommerzeit") : "";
+    table.add({inLanguage("Place", "Ort"),
+               latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude())});
+    table.add({inLanguage("Date", "Datum"), dateText(light, functions)});
+    table.add({inLanguage("Clock", "Uhrzeit"), clockText(functions, light.getLocalTime()) + ", " +
+                                                   utcText(functions, light.getTimeZoneHours()) + saving});
+    table.add({inLanguage("Solar time", "Sonnenzeit"), clockText(functions, light.getSolarTime()) +
+                                                           inLanguage(", equation of time ", ", Zeitgleichung ") +
+                                                           equation});
 }
 
 void addRiseAndSet(Table& table, RnNaturalLight& light, const NumberedFunctions& functions) {
+    const std::string byClock = inLanguage(" by the clock", " nach der Uhr");
     const auto both = [&](float local, float solar) {
-        return clockText(functions, local) + " by the clock, " + clockText(functions, solar) + " solar time";
+        return clockText(functions, local) + byClock + ", " + clockText(functions, solar) +
+               inLanguage(" solar time", " Sonnenzeit");
     };
     const char* polar = polarText(light);
-    table.add({"Sunrise", polar ? polar : both(light.getSunrise(), light.getSunriseSolarTime())});
-    table.add({"Solar noon", clockText(functions, light.getSolarNoon()) + " by the clock"});
-    table.add({"Sunset", polar ? polar : both(light.getSunset(), light.getSunsetSolarTime())});
+    table.add({inLanguage("Sunrise", "Sonnenaufgang"),
+               polar ? polar : both(light.getSunrise(), light.getSunriseSolarTime())});
+    table.add({inLanguage("Solar noon", "Höchststand"), clockText(functions, light.getSolarNoon()) + byClock});
+    table.add({inLanguage("Sunset", "Sonnenuntergang"),
+               polar ? polar : both(light.getSunset(), light.getSunsetSolarTime())});
 }
 
 void addLight(Table& table, RnNaturalLight& light) {
-    table.add({"Altitude", degreesNumber(light.getSolarAltitude()) + " deg, " +
-                               degreesNumber(light.getSolarZenith()) + " deg from the zenith"});
-    table.add({"Azimuth", degreesNumber(light.getSolarAzimuth()) + " deg; 0 is south, positive towards west"});
-    table.add({"Direction", vectorText(light.getSunDirection()) + "; x east, y north, z up, north turned by " +
-                                shortNumber(light.getNorth()) + " deg"});
-    table.add({"Sky", std::string(skyText(light.getSkyCover())) + ", cover " + shortNumber(light.getSkyCover())});
-    table.add({"Sunlight", luxNumber(light.getDirectNormalIlluminance()) + " lux facing the sun, " +
-                               luxNumber(light.getDirectHorizontalIlluminance()) + " lux on the ground; at most " +
-                               luxNumber(light.getMaxDirectNormalIlluminance()) + " lux"});
-    table.add({"Skylight", luxNumber(light.getSkyHorizontalIlluminance()) + " lux on the ground; zenith " +
-                               luxNumber(light.getZenithLuminance()) + " cd/m2"});
+    const auto degrees = [](float radians) { return degreesText(degreesNumber(radians)); };
+    const auto lux = [](float value, const char* english, const char* german) {
+        return luxNumber(value) + inLanguage(" lux ", " Lux ") + inLanguage(english, german);
+    };
+    table.add({inLanguage("Altitude", "Höhe"), degrees(light.getSolarAltitude()) + ", " +
+                                                   degrees(light.getSolarZenith()) +
+                                                   inLanguage(" from the zenith", " vom Zenit")});
+    table.add({inLanguage("Azimuth", "Azimut"), degrees(light.getSolarAzimuth()) + "; " + azimuthRule()});
+    table.add(
+        {inLanguage("Direction", "Richtung"), vectorText(light.getSunDirection()) +
+                                                  inLanguage("; x east, y north, z up, north turned by ",
+                                                             "; x Osten, y Norden, z oben, Norden gedreht um ") +
+                                                  degreesText(shortNumber(light.getNorth()))});
+    table.add({inLanguage("Sky", "Himmel"), std::string(skyText(light.getSkyCover())) +
+                                                inLanguage(", cover ", ", Bedeckung ") +
+                                                shortNumber(light.getSkyCover())});
+    table.add({inLanguage("Sunlight", "Sonnenlicht"),
+               lux(light.getDirectNormalIlluminance(), "facing the sun, ", "zur Sonne hin, ") +
+                   lux(light.getDirectHorizontalIlluminance(), "on the ground; at most ", "am Boden; höchstens ") +
+                   luxNumber(light.getMaxDirectNormalIlluminance()) + inLanguage(" lux", " Lux")});
+    table.add({inLanguage("Skylight", "Himmelslicht"),
+               lux(light.getSkyHorizontalIlluminance(), "on the ground; zenith ", "am Boden; Zenit ") +
+                   luxNumber(light.getZenithLuminance()) + " cd/m2"});
 }
 
 void printText(RnNaturalLight& light, const NumberedFunctions& functions) {
@@ -109,27 +155,33 @@ void printText(RnNaturalLight& light, const NumberedFunctions& functions) {
 }
 
 void printDayTable(RnNaturalLight& light, const NumberedFunctions& functions, bool json) {
+    const std::string headings[] = {inLanguage("clock", "Uhrzeit"),
+                                    inLanguage("solar time", "Sonnenzeit"),
+                                    inLanguage("altitude, deg", "Höhe, Grad"),
+                                    inLanguage("azimuth, deg", "Azimut, Grad"),
+                                    inLanguage("facing the sun, lux", "zur Sonne hin, Lux"),
+                                    inLanguage("sun on ground, lux", "Sonne am Boden, Lux"),
+                                    inLanguage("sky on ground, lux", "Himmel am Boden, Lux")};
     Table table;
-    table.add({"clock", "solar time", "altitude, deg", "azimuth, deg", "facing the sun, lux", "sun on ground, lux",
-               "sky on ground, lux"});
+    table.add({std::begin(headings), std::end(headings)});
     for (int hour = 0; hour < hoursInDay; ++hour) {
         light.setLocalTime(static_cast<float>(hour));
         if (json) {
             printLine(sunJson(light));
             continue;
         }
-        table.add({padLeft(clockText(functions, light.getLocalTime()), 5),
-                   padLeft(clockText(functions, light.getSolarTime()), 10),
-                   padLeft(degreesNumber(light.getSolarAltitude()), 13),
-                   padLeft(degreesNumber(light.getSolarAzimuth()), 12),
-                   padLeft(luxNumber(light.getDirectNormalIlluminance()), 19),
-                   padLeft(luxNumber(light.getDirectHorizontalIlluminance()), 18),
-                   padLeft(luxNumber(light.getSkyHorizontalIlluminance()), 18)});
+        std::vector<std::string> row{
+            clockText(functions, light.getLocalTime()),    clockText(functions, light.getSolarTime()),
+            degreesNumber(light.getSolarAltitude()),       degreesNumber(light.getSolarAzimuth()),
+            luxNumber(light.getDirectNormalIlluminance()), luxNumber(light.getDirectHorizontalIlluminance()),
+            luxNumber(light.getSkyHorizontalIlluminance())};
+        for (std::size_t i = 0; i < row.size(); ++i) row[i] = padLeft(row[i], characterCount(headings[i]));
+        table.add(std::move(row));
     }
     if (json) return;
     std::cout << dateText(light, functions) << '\n';
     table.print();
-    std::cout << azimuthNote << '\n';
+    std::cout << azimuthSentence() << '\n';
 }
 
 /// A time as a cell of a table; "-" for a sun that neither rises nor sets.
@@ -139,13 +191,15 @@ std::string timeCell(const NumberedFunctions& functions, float hours, bool shown
 
 void printYearTable(RnNaturalLight& light, const NumberedFunctions& functions, bool json) {
     Table table;
-    table.add({"date", "sunrise", "noon", "sunset"});
+    table.add({inLanguage("date", "Datum"), inLanguage("sunrise", "Aufgang"), inLanguage("noon", "höchste"),
+               inLanguage("sunset", "Untergang")});
     for (int month = 1; month <= monthsInYear; ++month) {
         light.setDate(month, yearTableDay);
         const float sunrise = light.getSunrise(), noon = light.getSolarNoon(), sunset = light.getSunset();
         const char* polar = polarText(light);
         if (json) {
-            printLine(Json{{"month", month},
+            printLine(Json{{"site", siteJson(light)},
+                           {"month", month},
                            {"day", yearTableDay},
                            {"sunrise", sunrise},
                            {"solarNoon", noon},
@@ -153,15 +207,18 @@ void printYearTable(RnNaturalLight& light, const NumberedFunctions& functions, b
             continue;
         }
         std::vector<std::string> row{
-            std::to_string(yearTableDay) + " " + toUtf8(functions.getMonthShortName(month)),
+            std::to_string(yearTableDay) + inLanguage(" ", ". ") + toUtf8(functions.getMonthShortName(month)),
             timeCell(functions, sunrise, !polar), timeCell(functions, noon), timeCell(functions, sunset, !polar)};
         if (polar) row.push_back(polar);
         table.add(std::move(row));
     }
     if (json) return;
     table.print();
-    std::cout << "Clock times" << (light.getDaylightSaving() ? " with daylight saving all year" : "") << ", "
-              << utcText(functions, light.getTimeZoneHours()) << ".\n";
+    std::cout << inLanguage("Clock times", "Uhrzeiten")
+              << (light.getDaylightSaving()
+                      ? inLanguage(" with daylight saving all year", " mit Sommerzeit das ganze Jahr")
+                      : "")
+              << ", " << utcText(functions, light.getTimeZoneHours()) << ".\n";
 }
 
 int runSun(const SunOptions& options, const HostSession& session) {

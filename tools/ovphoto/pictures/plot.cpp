@@ -5,6 +5,7 @@
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/pictures/drawnFile.h"
@@ -75,37 +76,48 @@ int plotLights(const PlotOptions& options, PictureFormat format, const HostSessi
     return write(options, format, diagram.title, [&](Canvas& canvas) { drawerOf(options.kind)(canvas, diagram); });
 }
 
-std::string degreesText(float radians) { return fixedNumber(radians * 180 / std::numbers::pi, 1) + "\u00b0"; }
+std::string angleText(float radians) { return fixedNumber(radians * 180 / std::numbers::pi, 1) + "\u00b0"; }
 
 OvPlot::SkyCaption captionOf(Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
     light.getSolarTime();  // where it was given, the local time follows from it
     OvPlot::SkyCaption caption;
-    caption.subtitle = sideText(light.getLatitude(), 'N', 'S') + ", " + sideText(light.getLongitude(), 'W', 'E') +
-                       "; " + dateText(light, functions) + "; " + clockText(functions, light.getLocalTime()) +
-                       ", " + utcText(functions, light.getTimeZoneHours()) +
-                       (light.getDaylightSaving() ? ", daylight saving" : "");
+    caption.subtitle = latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude()) + "; " +
+                       dateText(light, functions) + "; " + clockText(functions, light.getLocalTime()) + ", " +
+                       utcText(functions, light.getTimeZoneHours()) +
+                       (light.getDaylightSaving() ? inLanguage(", daylight saving", ", Sommerzeit") : "");
     const float altitude = light.getSolarAltitude();
-    caption.notes = {altitude > 0 ? "Sun " + degreesText(altitude) + " high, azimuth " +
-                                        degreesText(light.getSolarAzimuth()) + " from south to west"
-                                  : "The sun is " + degreesText(-altitude) + " below the horizon"};
+    caption.notes = {altitude > 0 ? inLanguage("Sun ", "Sonne ") + angleText(altitude) +
+                                        inLanguage(" high, azimuth ", " hoch, Azimut ") +
+                                        angleText(light.getSolarAzimuth()) +
+                                        inLanguage(" from south to west", " von Süden nach Westen")
+                                  : inLanguage("The sun is ", "Die Sonne steht ") + angleText(-altitude) +
+                                        inLanguage(" below the horizon", " unter dem Horizont")};
+    caption.words = {inLanguage("E", "O"),
+                     inLanguage(" to ", " bis "),
+                     inLanguage("hours of the clock", "Stunden der Uhr"),
+                     inLanguage("the set day", "der gewählte Tag"),
+                     inLanguage("no light from the sky", "kein Licht vom Himmel"),
+                     inLanguage(" ", ". ")};
     return caption;
 }
 
 int plotSky(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
             const OvPhotometrics::NumberedFunctions& functions) {
     OvPlot::SkyCaption caption = captionOf(light, functions);
-    caption.title = std::string("Luminance of the ") + skyText(light.getSkyCover()) + " sky";
-    caption.subtitle += "; looking up";
-    caption.notes.push_back("Zenith " + shortNumber(light.getZenithLuminance()) + " cd/m\u00b2");
-    caption.notes.push_back("Skylight on the ground " + fixedNumber(light.getSkyHorizontalIlluminance(), 0) +
-                            " lx");
+    caption.title = inLanguage("Luminance of the ", "Leuchtdichte des Himmels, ") +
+                    std::string(skyText(light.getSkyCover())) + inLanguage(" sky", "");
+    caption.subtitle += inLanguage("; looking up", "; Blick nach oben");
+    caption.notes.push_back(inLanguage("Zenith ", "Zenit ") + shortNumber(light.getZenithLuminance()) +
+                            " cd/m\u00b2");
+    caption.notes.push_back(inLanguage("Skylight on the ground ", "Himmelslicht am Boden ") +
+                            fixedNumber(light.getSkyHorizontalIlluminance(), 0) + " lx");
     return write(options, format, caption.title, [&](Canvas& canvas) { OvPlot::drawSky(canvas, light, caption); });
 }
 
 int plotSunPath(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
                 const OvPhotometrics::NumberedFunctions& functions) {
     OvPlot::SkyCaption caption = captionOf(light, functions);
-    caption.title = "Paths of the sun";
+    caption.title = inLanguage("Paths of the sun", "Wege der Sonne");
     std::array<std::string, 12> months;
     for (std::size_t i = 0; i < months.size(); ++i)
         months[i] = Ov::toUtf8(functions.getMonthShortName(static_cast<int>(i) + 1));
