@@ -82,9 +82,57 @@ TEST_F(ToolUsage, OutputThatCannotBeWrittenIsToldAndGivesStatus1) {
         EXPECT_EQ(result.status, 1) << command;
         EXPECT_TRUE(result.says("standard output cannot be written")) << command << result.err;
     }
-    // An endless input ends with its reader.
-    const ToolResult closed =
-        runShell("{ yes 0,0 | { ovphoto intensity good.ies; echo status $? >&2; } | head -n 1; }", folder);
-    EXPECT_TRUE(closed.says("status 1") && closed.says("100 cd")) << closed.out << closed.err;
+    // An endless input ends with its reader, and who has read enough is no fault.
+    for (const std::string many :
+         {"yes 0,0 | { ovphoto intensity good.ies", "{ ovphoto check $(yes good.ies | head -n 999)",
+          "{ ovphoto info $(yes good.ies | head -n 999)"}) {
+        const ToolResult closed = runShell("{ " + many + "; echo status $? >&2; } | head -n 1; }", folder);
+        EXPECT_EQ(closed.err, "status 1\n") << many;
+        EXPECT_NE(closed.out, "") << many;
+    }
     EXPECT_EQ(runShell("ovphoto intensity good.ies <&-", folder).status, 1);
+}
+
+/// What "-" gives is what a file gives, but for names.
+TEST_F(ToolUsage, StandardInputAndOutputAreNamedByADash) {
+    std::string light = readBytes(folder.path() / "good.ies");
+    light.replace(light.find("TEST"), 4, "LUMINAIRE");  // what pictures show for a name
+    folder.write("good.ies", light);
+    const auto renamed = [](std::string text) {
+        for (const auto& [name, dash] : {std::pair<std::string, std::string>{"good.ies", "-"}, {"good", "stdin"}})
+            for (std::size_t at; (at = text.find(name)) != std::string::npos;) text.replace(at, name.size(), dash);
+        return text;
+    };
+    std::vector<std::string> commands{"info @",         "info @ --json", "intensity @ 0,0 45,0",
+                                      "check @ --json", "check @",       "formats --detect @"};
+    for (const char* output : {"convert @ OUT --to tbt", "convert @ OUT --to ies", "plot @ -o OUT --format png",
+                               "plot @ -o OUT.svg", "report @ -o OUT.html"}) {
+        if (windowsTool() && std::string(output).find("-o") != std::string::npos) continue;
+        commands.emplace_back(output);
+    }
+    for (const std::string& command : commands) {
+        std::string byName = command, byDash = command;
+        byName.replace(byName.find('@'), 1, "good.ies");
+        byDash.replace(byDash.find('@'), 1, "-");
+        std::string wanted;
+        const std::size_t out = command.find("OUT");
+        if (out != std::string::npos) {
+            const std::string file = command.substr(out, command.find(' ', out) - out);
+            byDash.replace(byDash.find(file), file.size(), "-");
+            EXPECT_EQ(runTool(byName, folder).status, 0) << byName;
+            wanted = readBytes(folder.path() / file);
+        } else {
+            wanted = runTool(byName, folder).out;
+        }
+        const ToolResult result = runTool(byDash, folder, light);
+        EXPECT_EQ(result.status, 0) << byDash << result.err;
+        EXPECT_NE(wanted, "") << byName;
+        EXPECT_TRUE(renamed(result.out) == renamed(wanted)) << byDash;
+    }
+    EXPECT_EQ(runTool("check - -", folder, light).status, 1);
+    EXPECT_TRUE(runTool("check - -", folder, light).says("only once"));
+    for (const std::string wrong : {"intensity -", "convert - -", "convert - - --to ies --json",
+                                    "convert - --into o --to ies", "report - good.ies -o -", "report . -o -"}) {
+        EXPECT_EQ(runTool(wrong, folder, light).status, 2) << wrong;
+    }
 }

@@ -7,6 +7,7 @@
 #include "tools/ovphoto/lightFile.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -116,8 +117,9 @@ void printReport(const Json& report, const Conversion& conversion, bool json) {
         printLine(report);
         std::cout.flush();  // what is done is told even if a later file ends the process
     } else if (report["ok"].get<bool>()) {
-        std::cout << conversion.in << " -> " << conversion.out << ": " << report["format"].get<std::string>()
-                  << " to " << conversion.target->name << ", " << lossText(report) << '\n';
+        reportStreamFor(conversion.out)
+            << conversion.in << " -> " << conversion.out << ": " << report["format"].get<std::string>() << " to "
+            << conversion.target->name << ", " << lossText(report) << '\n';
     }
     for (const Json& message : report["messages"])
         std::cerr << conversion.in << ": " << message.get<std::string>() << '\n';

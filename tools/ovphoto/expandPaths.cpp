@@ -5,6 +5,7 @@
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
@@ -39,7 +40,7 @@ std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths) {
     for (const std::string& path : paths) {
         std::error_code error;
         const fs::path native = Ov::nativePath(Ov::fromUtf8(path));
-        if (fs::is_directory(native, error)) {
+        if (!isStandardStream(path) && fs::is_directory(native, error)) {
             addFolder(native, files);
         } else {
             files.push_back({path, false, {}});

@@ -9,6 +9,7 @@
 #include "ovphoto/classIds.h"
 #include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -105,7 +106,7 @@ void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string
     }
     result.format = formatName(*builder);
     result.classId = builder->getClassId();
-    const std::wstring path = fromUtf8(result.file);
+    const std::wstring path = fromUtf8(isStandardStream(result.file) ? "stdin" : result.file);
     auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&result](const OvPhotometrics::FileFact& fact) {
         result.facts.push_back({fact.key, fact.text});
     });
@@ -139,6 +140,7 @@ std::string extensionOf(RnComponentBuilder& builder) {
 }
 
 RnRef<RnBufferedIO> openFile(const std::string& file, std::string& error) {
+    if (isStandardStream(file)) return openStandardInput(error);
     const std::wstring path = fromUtf8(file);
     if (auto io = openInputFile(path.c_str())) return io;
     std::error_code code;

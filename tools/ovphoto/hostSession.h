@@ -70,7 +70,7 @@ std::string formatName(const Ov::RnBuilderDescription& builder);
 /// The first extension that the builder imports, or empty.
 std::string extensionOf(Ov::RnComponentBuilder& builder);
 
-/// Opens a file for reading. When that fails it gives null and says in `error` why.
+/// Opens a file, or standard input as "-", for reading. When that fails it gives null and says in `error` why.
 Ov::RnRef<Ov::RnBufferedIO> openFile(const std::string& file, std::string& error);
 
 /// What the exception in flight says; to be called in a handler.

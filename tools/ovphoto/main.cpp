@@ -66,6 +66,7 @@ int main(int argc, char** argv) {
         "time zones and azimuths (0 is south) towards west.");
     const int status = parseAndRun(app, commandLine(argc, argv));
     if (std::cout.flush()) return status;
-    std::cerr << "ovphoto: standard output cannot be written\n";
+    // Whoever closes a pipe has read enough.
+    if (!standardOutputIsClosedPipe()) std::cerr << "ovphoto: standard output cannot be written\n";
     return status == exitWell ? exitFailed : status;
 }

@@ -3,10 +3,12 @@
 #include <cerrno>
 #include <filesystem>
 #include <fstream>
+#include <iostream>
 #include <random>
 #include <system_error>
 
 #include "host/platform/path.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -54,6 +56,10 @@ private:
 }  // namespace
 
 std::string writeFile(const std::string& file, std::string_view bytes) {
+    if (isStandardStream(file)) {
+        std::cout.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+        return {};  // the end of the tool tells of output that fails
+    }
     std::error_code error;
     fs::path target = Ov::nativePath(Ov::fromUtf8(file));
     const fs::file_status status = fs::status(target, error);

@@ -15,6 +15,8 @@ namespace OvTool {
 /// bytes pass as they are.
 void prepareStandardStreams();
 bool standardErrorIsTerminal();
+/// Whether standard output, to which writing has failed, is a pipe that nobody reads any more.
+bool standardOutputIsClosedPipe();
 /// What `main` was given behind the program's name, in UTF-8; wildcards that a shell has left are expanded.
 std::vector<std::string> commandLine(int argc, char** argv);
 std::filesystem::path executableFolder();

@@ -1,8 +1,10 @@
 #include "tools/ovphoto/platform.h"
 
 #include <fcntl.h>
+#include <poll.h>
 #include <spawn.h>
 #include <sys/auxv.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -71,6 +73,14 @@ void prepareStandardStreams() {
 }
 
 bool standardErrorIsTerminal() { return ::isatty(STDERR_FILENO) != 0; }
+
+bool standardOutputIsClosedPipe() {
+    pollfd output{STDOUT_FILENO, 0, 0};
+    struct stat status = {};
+    const bool isPipe =
+        ::fstat(STDOUT_FILENO, &status) == 0 && (S_ISFIFO(status.st_mode) || S_ISSOCK(status.st_mode));
+    return isPipe && ::poll(&output, 1, 0) == 1 && (output.revents & (POLLERR | POLLHUP)) != 0;
+}
 
 std::vector<std::string> commandLine(int argc, char** argv) { return {argv + std::min(argc, 1), argv + argc}; }
 

@@ -96,6 +96,13 @@ void prepareStandardStreams() {
     SetConsoleOutputCP(CP_UTF8);
 }
 
+bool standardOutputIsClosedPipe() {
+    const HANDLE output = GetStdHandle(STD_OUTPUT_HANDLE);
+    DWORD written = 0;
+    return GetFileType(output) == FILE_TYPE_PIPE && !WriteFile(output, "", 0, &written, nullptr) &&
+           (GetLastError() == ERROR_NO_DATA || GetLastError() == ERROR_BROKEN_PIPE);
+}
+
 bool standardErrorIsTerminal() {
     // One that takes the control sequences that terminals of other systems take.
     const HANDLE console = GetStdHandle(STD_ERROR_HANDLE);

@@ -104,7 +104,9 @@ int runCheck(const CheckOptions& options, const HostSession& session) {
 
 Action declareCheck(CLI::App& app) {
     auto options = std::make_shared<CheckOptions>();
-    app.add_option("PATH", options->paths, "Photometric files, or folders to search for them")->required();
+    app.add_option("PATH", options->paths,
+                   "Photometric files, - for standard input, or folders to search for them")
+        ->required();
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
     return [options](const HostSession& session) { return runCheck(*options, session); };

@@ -1,4 +1,5 @@
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <charconv>
 #include <memory>
 
@@ -6,6 +7,7 @@
 #include "tools/ovphoto/commands/convertFolder.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/conversion.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -29,8 +31,14 @@ int convertOne(const ConvertOptions& options, const HostSession& session) {
 
 /// What depends on more than one argument.
 void checkArguments(ConvertOptions& options) {
-    if (!options.folder.empty()) return;
+    if (!options.folder.empty()) {
+        if (std::any_of(options.paths.begin(), options.paths.end(), isStandardStream))
+            throw CLI::ValidationError("--into", "what comes from standard input has no name there");
+        return;
+    }
     if (options.paths.size() != 2) throw CLI::ValidationError("IN OUT", "two files are wanted, or --into FOLDER");
+    if (options.json && isStandardStream(options.paths[1]))
+        throw CLI::ValidationError("--json", "standard output takes the file");
     if (!options.target) options.target = targetForOutput(options.paths[1]);
 }
 
@@ -38,10 +46,10 @@ void checkArguments(ConvertOptions& options) {
 
 Action declareConvert(CLI::App& app) {
     auto options = std::make_shared<ConvertOptions>();
-    app.add_option(
-           "PATH", options->paths,
-           "IN and OUT, the file to read and the file to write; with --into, any number of files, or folders "
-           "to search for them")
+    app.add_option("PATH", options->paths,
+                   "IN and OUT, the file to read and the file to write, - for standard input and output; with "
+                   "--into, any number of files, or folders "
+                   "to search for them")
         ->required();
     CLI::Option* to = addToOption(app, options->target);
     CLI::Option* into = app.add_option("--into", options->folder,

@@ -89,6 +89,7 @@ int runInfo(const InfoOptions& options, const HostSession& session) {
     int status = exitWell;
     const char* separator = "";
     for (const std::string& file : options.files) {
+        if (!std::cout) break;
         const ReadResult result = session.read(file, options.as);
         showReasons(result);
         if (!result.web) {
@@ -109,7 +110,7 @@ int runInfo(const InfoOptions& options, const HostSession& session) {
 
 Action declareInfo(CLI::App& app) {
     auto options = std::make_shared<InfoOptions>();
-    app.add_option("FILE", options->files, "Photometric files")->required();
+    app.add_option("FILE", options->files, "Photometric files, - for standard input")->required();
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
     app.add_flag("--values", options->values, "Print the relative values too, a row for each psi (JSON only)")

@@ -6,6 +6,7 @@
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -114,7 +115,7 @@ int runIntensity(const IntensityOptions& options, const HostSession& session) {
 
 Action declareIntensity(CLI::App& app) {
     auto options = std::make_shared<IntensityOptions>();
-    app.add_option("FILE", options->file, "Photometric file")->required();
+    app.add_option("FILE", options->file, "Photometric file, - for standard input")->required();
     app.add_option("DIRECTION", options->directions,
                    "Directions theta,psi in degrees; without any, lines \"theta psi\" from standard input")
         ->check(CLI::Validator(checkDirection, "", "direction"));
@@ -129,6 +130,10 @@ Action declareIntensity(CLI::App& app) {
     };
     app.add_option_function<std::string>("--flux", setFlux, "Total flux in lumens, instead of the file's")
         ->type_name("LM");
+    app.callback([options] {
+        if (options->directions.empty() && isStandardStream(options->file))
+            throw CLI::RequiredError("DIRECTION, as standard input holds the file,");
+    });
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
     return [options](const HostSession& session) { return runIntensity(*options, session); };

@@ -9,6 +9,7 @@
 #include "tools/ovphoto/lightFile.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {
 
@@ -72,8 +73,9 @@ int runMake(const MakeOptions& options, const HostSession& session) {
     const auto made = writeLight(*light, options, session, reasons);
     showReasons(options.out, reasons);
     if (!made) return exitFailed;
-    std::cout << options.out << ": " << options.kind << ", " << shortNumber(light->getPeakIntensity()) << " cd, "
-              << shortNumber(light->getFlux()) << " lm\n";
+    reportStreamFor(options.out) << options.out << ": " << options.kind << ", "
+                                 << shortNumber(light->getPeakIntensity()) << " cd, "
+                                 << shortNumber(light->getFlux()) << " lm\n";
     const ConversionLoss loss = measureLoss(*light, *made->light);
     for (const std::string& warning : lossWarnings(loss, *options.target, *light, *made))
         std::cerr << options.out << ": warning: " << warning << '\n';

@@ -13,6 +13,7 @@ enum class PictureKind { polar, cartesian, cone, isolux, solid, sky, sunPath };
 struct PlotOptions {
     std::vector<std::string> files;
     std::string out;
+    std::string format;  // "svg", "png" or "pdf"; empty: as `out` ends
     std::string as;
     PictureKind kind = PictureKind::polar;
     std::vector<double> planes{0, 90};

@@ -96,8 +96,11 @@ void addSkyFlag(CLI::App& app, PlotOptions& options, const char* name, PictureKi
 Action declarePlot(CLI::App& app) {
     auto shared = std::make_shared<PlotOptions>();
     PlotOptions& options = *shared;
-    app.add_option("FILE", options.files, "Photometric files; polar and cartesian diagrams show up to 8");
-    app.add_option("-o,--out", options.out, "Picture to write: .svg, .png or .pdf")->required()->type_name("OUT");
+    app.add_option("FILE", options.files,
+                   "Photometric files, - for standard input; polar and cartesian diagrams show up to 8");
+    app.add_option("-o,--out", options.out, "Picture to write: .svg, .png or .pdf, or - for standard output")
+        ->required()
+        ->type_name("OUT");
     auto* kind = addParsed(app, {"--kind", "KIND", "polar (default), cartesian, cone, isolux or solid"}, parseKind,
                            [&options](PictureKind value) { options.kind = value; });
     auto* planes =
@@ -112,6 +115,10 @@ Action declarePlot(CLI::App& app) {
                   options.width = value.width;
                   options.rows = value.rows;
               });
+    app.add_option("--format", options.format,
+                   "Write svg, png or pdf, whatever OUT ends in; svg to standard output")
+        ->type_name("FORMAT")
+        ->transform(CLI::IsMember({"svg", "png", "pdf"}, CLI::ignore_case).description(""));
     app.add_flag("--dark", options.dark, "Light lines on dark paper");
     addSkyFlag(app, options, "--sky", PictureKind::sky, "The sky's luminance instead, as it stands over the site",
                {kind, planes, height});

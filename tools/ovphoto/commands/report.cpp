@@ -8,9 +8,11 @@ namespace OvTool {
 Action declareReport(CLI::App& app) {
     auto options = std::make_shared<ReportOptions>();
     app.add_option("PATH", options->paths,
-                   "A photometric file, or several, or folders to search for them, which give an index")
+                   "A photometric file, - for standard input, or several, or folders to search for them, which "
+                   "give an index")
         ->required();
-    app.add_option("-o,--out", options->out, "Page to write: .html; those of an index's files go beside it")
+    app.add_option("-o,--out", options->out,
+                   "Page to write: .html, or - for standard output; those of an index's files go beside it")
         ->required()
         ->type_name("OUT");
     addAsOption(app, options->as);

@@ -9,6 +9,7 @@
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/pictures/drawnFile.h"
+#include "tools/ovphoto/standardStreams.h"
 #include "tools/plot/picture.h"
 #include "tools/plot/skyDiagram.h"
 
@@ -19,11 +20,14 @@ namespace {
 using OvPlot::Canvas;
 using OvPlot::PictureFormat;
 
-std::optional<PictureFormat> formatOf(const std::string& path) {
+std::optional<PictureFormat> formatOf(const PlotOptions& options) {
     static constexpr std::pair<const char*, PictureFormat> endings[] = {
         {".svg", PictureFormat::svg}, {".png", PictureFormat::png}, {".pdf", PictureFormat::pdf}};
+    const std::string path = !options.format.empty()         ? "." + options.format
+                             : isStandardStream(options.out) ? ".svg"
+                                                             : CLI::detail::to_lower(options.out);
     for (const auto& [ending, format] : endings)
-        if (CLI::detail::to_lower(path).ends_with(ending)) return format;
+        if (path.ends_with(ending)) return format;
     return {};
 }
 
@@ -136,7 +140,7 @@ int plotNaturalLight(const PlotOptions& options, PictureFormat format, const Hos
 }  // namespace
 
 int runPlot(const PlotOptions& options, const HostSession& session) {
-    const auto format = formatOf(options.out);
+    const auto format = formatOf(options);
     if (!format) {
         std::cerr << options.out << ": does not end in .svg, .png or .pdf\n";
         return exitUsage;

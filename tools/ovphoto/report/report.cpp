@@ -14,6 +14,7 @@
 #include "tools/ovphoto/progress.h"
 #include "tools/ovphoto/report/html.h"
 #include "tools/ovphoto/report/page.h"
+#include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/webTexts.h"
 
 namespace OvTool {
@@ -239,12 +240,18 @@ int reportMany(const ReportOptions& options, const HostSession& session) {
 }  // namespace
 
 int runReport(const ReportOptions& options, const HostSession& session) {
-    if (CLI::detail::to_lower(nativeOf(options.out).extension().string()) != ".html") {
+    const bool toStream = isStandardStream(options.out);
+    if (!toStream && CLI::detail::to_lower(nativeOf(options.out).extension().string()) != ".html") {
         std::cerr << options.out << ": does not end in .html\n";
         return exitUsage;
     }
     std::error_code error;
-    const bool one = options.paths.size() == 1 && !fs::is_directory(nativeOf(options.paths.front()), error);
+    const bool one = options.paths.size() == 1 && (isStandardStream(options.paths.front()) ||
+                                                   !fs::is_directory(nativeOf(options.paths.front()), error));
+    if (toStream && !one) {
+        std::cerr << "standard output takes the page of one file, not an index and its pages\n";
+        return exitUsage;
+    }
     return (one ? reportOne : reportMany)(options, session);
 }
 
