@@ -1,6 +1,9 @@
 #include "components/messageFile/message.h"
 
+#include <set>
+
 #include "components/messageFile/messageStore.h"
+#include "host/base/immortal.h"
 #include "host/platform/path.h"
 
 namespace Ov {
@@ -13,28 +16,41 @@ constexpr char source[] = "components/messageFile/message";
 constexpr int lineNoFilename = 145;
 constexpr int lineNoCatalogue = 160;
 
+/// Each text that was asked for, once.
+struct KeptTexts {
+    std::mutex lock;
+    std::set<std::wstring> texts;
+};
+
 }  // namespace
 
 RnMessageFile::RnMessageFile() = default;
 RnMessageFile::~RnMessageFile() = default;
 
 void RnMessageFile::setFileName(const wchar_t* path) {
-    _fileName = path ? path : L"";
+    std::wstring name = path ? path : L"";
+    const std::lock_guard guard(_lock);
+    _fileName.swap(name);
     _store.reset();
 }
 
-bool RnMessageFile::isThere() {
+std::wstring RnMessageFile::fileName() const {
+    const std::lock_guard guard(_lock);
+    return _fileName;
+}
+
+std::shared_ptr<const RnMessageFile::Store> RnMessageFile::store() {
+    const std::lock_guard guard(_lock);
     if (!_store && !_fileName.empty()) _store = Store::open(_fileName);
-    return _store != nullptr;
+    return _store;
 }
 
-RnMessageFile::Store& RnMessageFile::store() {
-    if (isThere()) return *_store;
-    if (_fileName.empty()) throw RnMessageFileEx::ExNoFilename();
-    throw RnMessageFileEx::ExNoCatalogue(_fileName);
+std::wstring RnMessageFile::getText(unsigned id) {
+    if (const auto found = store()) return found->text(id);
+    const std::wstring name = fileName();
+    if (name.empty()) throw RnMessageFileEx::ExNoFilename();
+    throw RnMessageFileEx::ExNoCatalogue(name);
 }
-
-std::wstring RnMessageFile::getText(unsigned id) { return store().text(id); }
 
 std::wstring RnMessageFile::format(unsigned id, ...) {
     const std::wstring text = getText(id);
@@ -65,9 +81,20 @@ RnMessageFileEx::ExNoCatalogue::ExNoCatalogue(const std::wstring& fileName)
     : RnMessageFileEx(toUtf8(fileName) + ": Cannot open message catalogue.", lineNoCatalogue) {}
 RnMessageFileEx::ExNoCatalogue::~ExNoCatalogue() = default;
 
-RnMessageFile& messageFile() {
-    static RnMessageFile catalogue;
-    return catalogue;
+RnMessageFile& messageFile() { return immortal<RnMessageFile>(); }
+
+const wchar_t* keptText(unsigned id) {
+    std::wstring text = messageFile().format(id);
+    auto& kept = immortal<KeptTexts>();
+    const std::lock_guard guard(kept.lock);
+    return kept.texts.insert(std::move(text)).first->c_str();
+}
+
+void releaseTexts() {
+    messageFile().setFileName(nullptr);
+    auto& kept = immortal<KeptTexts>();
+    const std::lock_guard guard(kept.lock);
+    kept.texts.clear();
 }
 
 }  // namespace Ov

@@ -2,6 +2,7 @@
 
 #include <cstdarg>
 #include <memory>
+#include <mutex>
 #include <string>
 
 #include "host/base/exBase.h"
@@ -21,7 +22,7 @@ namespace Ov {
 ///
 /// Errors:   RnMessageFileEx before a file name is set or when the file cannot be opened; a number without a text
 ///           gives the empty text.
-/// Threads:  one at a time until the first lookup has opened the file.
+/// Threads:  any number may look up and set the file at once; a lookup uses the file that it found to its end.
 class RnMessageFile {
 public:
     RnMessageFile();
@@ -32,10 +33,11 @@ public:
     /// Sets the companion file; the next lookup opens it, or the one of the language set in the host
     /// (<folder>/<language>/<file>) where that exists. A file opened before is closed.
     void setFileName(const wchar_t* path);
-    const std::wstring& fileName() const { return _fileName; }
+    std::wstring fileName() const;
 
-    /// Whether the file is open or can be opened, which it then is.
-    bool isThere();
+    class Store;
+    /// The open companion (messageStore.h), which stays open as long as it is held; null when there is none.
+    std::shared_ptr<const Store> store();
     /// The raw text of a message.
     std::wstring getText(unsigned id);
     /// The text with its arguments put in. They must be what the text's markers say.
@@ -43,12 +45,9 @@ public:
     std::wstring formatV(unsigned id, std::va_list args);
 
 private:
-    class Store;  // the open companion; one implementation a platform
-
-    Store& store();
-
+    mutable std::mutex _lock;  // of all below
     std::wstring _fileName;
-    std::unique_ptr<Store> _store;
+    std::shared_ptr<const Store> _store;
 };
 
 /// The formatting language on its own.
@@ -78,7 +77,14 @@ public:
     ~ExNoCatalogue() override;
 };
 
-/// The library's one catalogue.
+/// The library's one catalogue, which is never destroyed.
 RnMessageFile& messageFile();
+
+/// A text of it that takes no arguments, valid as long as the module is loaded. Errors and threads are those of
+/// RnMessageFile.
+const wchar_t* keptText(unsigned id);
+
+/// Closes the catalogue, forgets its name and lets go of the kept texts: the module is about to be unloaded.
+void releaseTexts();
 
 }  // namespace Ov

@@ -16,6 +16,10 @@ __attribute__((constructor)) void attach() {
     OvPhotometrics::enterModule(module.dli_fbase, Ov::widePath(failure ? module.dli_fname : path));
 }
 
+/// The loader runs this before it detaches the module: when it is unloaded, or at the end of the process, behind all
+/// exit handlers, hence behind the destructors of the host's static objects.
+__attribute__((destructor)) void detach() { OvPhotometrics::leaveModule(); }
+
 }  // namespace
 
 Ov::RnComponentRegistry* RnGetComponentDescription() { return &OvPhotometrics::lidComponent(); }

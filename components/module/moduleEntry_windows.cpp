@@ -10,7 +10,8 @@ constexpr DWORD longestPath = 504;  // the companion's is up to seven longer
 
 }  // namespace
 
-extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID) {
+extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID processEnds) {
+    if (reason == DLL_PROCESS_DETACH && !processEnds) OvPhotometrics::leaveModule();
     if (reason != DLL_PROCESS_ATTACH) return TRUE;
     DisableThreadLibraryCalls(instance);
     wchar_t path[512]{};

@@ -192,8 +192,9 @@ const wchar_t* parseFormatSpec(const wchar_t* text, const wchar_t* end, FormatSp
 }
 
 void appendInteger(std::wstring& out, const FormatSpec& spec, std::int32_t value) {
-    if (spec.letter == L'c' || spec.letter == L'C') return appendCharacter(out, spec, static_cast<wchar_t>(value));
     const bool isShort = spec.modifier == L'h';
+    if (spec.letter == L'c' || spec.letter == L'C')
+        return appendCharacter(out, spec, static_cast<wchar_t>(isShort ? value & 0xFFFF : value));
     const bool isSigned = isSignedLetter(spec.letter);
     if (isShort && isSigned) value = static_cast<std::int16_t>(value);
     const bool negative = isSigned && value < 0;

@@ -2,16 +2,19 @@
 
 #include <vector>
 
+#include "host/base/immortal.h"
 #include "host/componentManager/persistant.h"
 
 namespace Ov {
 
 namespace {
 
-std::vector<RnTranslator>& translators() {
-    static std::vector<RnTranslator> list;
-    return list;
-}
+struct Translators {
+    std::vector<RnTranslator> list;
+};
+
+/// Objects are cast until the process ends.
+std::vector<RnTranslator>& translators() { return immortal<Translators>().list; }
 
 }  // namespace
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cwchar>
 
+#include "host/base/immortal.h"
 #include "host/componentManager/castImpl.h"
 #include "host/platform/module.h"
 #include "host/platform/path.h"
@@ -116,9 +117,8 @@ std::vector<Builder> ComponentManager::importersFor(const wchar_t* category, RnB
 }  // namespace
 
 RnCastable* RnGetComponentManager() {
-    // Never destroyed: objects of a module may outlive everything else of the process.
-    static auto* const manager = new ComponentManager;
-    return manager;
+    // Objects of a module may outlive everything else of the process.
+    return &immortal<ComponentManager>();
 }
 
 }  // namespace Ov

@@ -4,6 +4,8 @@
 #include <mutex>
 #include <utility>
 
+#include "host/base/immortal.h"
+
 namespace Ov {
 
 struct RnPostLoadList::Node {
@@ -32,11 +34,8 @@ private:
     Node* _free = nullptr;
 };
 
-/// Never destroyed: lists of other static objects may end after this file's.
-RnPostLoadList::Pool& RnPostLoadList::pool() {
-    static Pool& instance = *new Pool;
-    return instance;
-}
+/// Lists of other static objects may end after this file's.
+RnPostLoadList::Pool& RnPostLoadList::pool() { return immortal<Pool>(); }
 
 RnPostLoadList::~RnPostLoadList() {
     try {

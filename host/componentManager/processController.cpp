@@ -3,7 +3,10 @@
 #include <algorithm>
 #include <cstdio>
 #include <map>
+#include <memory>
+#include <mutex>
 
+#include "host/base/immortal.h"
 #include "host/componentManager/castImpl.h"
 #include "host/platform/path.h"
 
@@ -70,7 +73,8 @@ public:
     void findFile(std::wstring& result, const wchar_t* name, const wchar_t* basePath,
                   const wchar_t* listName) override;
 
-    MessageReporter reporter;
+    std::recursive_mutex reporting;  // held while a message is reported; again when the reporter causes another
+    std::shared_ptr<const MessageReporter> reporter;  // null: standard error
     std::map<std::wstring, std::vector<std::wstring>> pathLists;
 
 private:
@@ -79,8 +83,9 @@ private:
 
 void HostController::report(int level, const wchar_t* text) {
     if (!text) text = L"";
-    if (reporter) {
-        reporter(level, text);
+    const std::lock_guard guard(reporting);
+    if (const auto current = reporter) {  // stays while it is called, even if it sets another
+        (*current)(level, text);
     } else {
         reportToStandardError(text);
     }
@@ -115,16 +120,14 @@ std::vector<fs::path> HostController::searchFolders(const wchar_t* basePath, con
     return folders;
 }
 
-/// Never destroyed: a module may report until the process ends.
-HostController& hostController() {
-    static auto* const controller = new HostController;
-    return *controller;
-}
+/// A module may report until the process ends.
+HostController& hostController() { return immortal<HostController>(); }
 
-RnRef<RnCastable>& currentController() {
-    static auto* const current = new RnRef<RnCastable>(RnRef<RnCastable>::share(&hostController()));
-    return *current;
-}
+struct CurrentController {
+    RnRef<RnCastable> object = RnRef<RnCastable>::share(&hostController());
+};
+
+RnRef<RnCastable>& currentController() { return immortal<CurrentController>().object; }
 
 }  // namespace
 
@@ -132,8 +135,16 @@ RnCastable* RnGetProcessController() { return currentController().get(); }
 
 RnCastable* RnGetThreadProcessController() { return currentController().get(); }
 
+void RnReport(int level, const wchar_t* text) {
+    const std::lock_guard guard(hostController().reporting);
+    rnCast<RnProcessController>(RnGetProcessController())->report(level, text);
+}
+
 MessageReporter setMessageReporter(MessageReporter reporter) {
-    return std::exchange(hostController().reporter, std::move(reporter));
+    auto next = reporter ? std::make_shared<const MessageReporter>(std::move(reporter)) : nullptr;
+    const std::lock_guard guard(hostController().reporting);
+    const auto previous = std::exchange(hostController().reporter, std::move(next));
+    return previous ? *previous : nullptr;
 }
 
 void setPathList(const std::wstring& listName, std::vector<std::wstring> folders) {

@@ -9,6 +9,9 @@
 namespace Ov {
 
 /// The host's services to whoever runs in it: a place to report messages, and a finder of files.
+///
+/// Threads:  any number may call the host's own. One that stands in for it is asked for files by all threads that
+///           read; how it is called with messages, `RnReport` says.
 class OVHOST_API RnProcessController : public RnCastable {
 public:
     /// Id of the interface.
@@ -29,12 +32,19 @@ OVHOST_API RnCastable* RnGetProcessController();
 OVHOST_API RnCastable* RnGetThreadProcessController();
 /// @}
 
-/// Receives the messages of the process.
+/// Reports to the controller of the process on the calling thread, and raises ExBadCast without one. One thread at a
+/// time: another waits until the controller, and the reporter that it calls, is done. These may call back into the
+/// library: what that reports comes to them at once, inside their call. They must not wait for other threads that
+/// may report. What they throw is passed on.
+OVHOST_API void RnReport(int level, const wchar_t* text);
+
+/// Receives the messages of the process, as `RnReport` says. The text is valid during the call.
 using MessageReporter = std::function<void(int level, const wchar_t* text)>;
 
-// Host side. All of this belongs to the process: set it while nothing is being imported.
+// Host side. All of this belongs to the process: set it while nothing is being imported, but for the reporter.
 
-/// Who receives the messages; null: standard error, a line each. The result is the previous one.
+/// Who receives the messages; null: standard error, a line each. The result is the previous one, which other threads
+/// call no more once this has returned. A reporter may be replaced from inside its own call.
 OVHOST_API MessageReporter setMessageReporter(MessageReporter reporter);
 /// The folders of a path list. Readers look for the files that theirs name in those of "WebPathList".
 OVHOST_API void setPathList(const std::wstring& listName, std::vector<std::wstring> folders);

@@ -3,16 +3,19 @@
 #include <cstdlib>
 #include <string_view>
 
+#include "host/base/immortal.h"
 #include "host/platform/path.h"
 
 namespace WendSDK::Util {
 
 namespace {
 
-std::wstring& currentLanguage() {
-    static std::wstring language;
-    return language;
-}
+struct Language {
+    std::wstring name;
+};
+
+/// A module opens its texts as late as it reports.
+std::wstring& currentLanguage() { return Ov::immortal<Language>().name; }
 
 /// The value of the variable that decides about texts, or an empty text.
 std::string_view localeName() {

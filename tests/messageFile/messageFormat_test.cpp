@@ -16,6 +16,7 @@ TEST(MessageFormat, ArgumentsStandAtTheirMarkers) {
     EXPECT_EQ(formatMessage(L"%1!u! %2!#x! %3!X! %4!o!", -1, 255, 0xAB, 15), L"4294967295 0xff AB 17");
     EXPECT_EQ(formatMessage(L"%1!hd! %2!hu! %3!ld!", 65535, -1, 70000), L"-1 65535 70000");
     EXPECT_EQ(formatMessage(L"\"%1!c!\" %2!C!", L'x', L'\u00e4'), L"\"x\" \u00e4");
+    EXPECT_EQ(formatMessage(L"%1!hc!%2!hC!", 0x103b8, -0xfc48), L"\u03b8\u03b8");
     EXPECT_EQ(formatMessage(L"%1!.2f! %2!e! %3!G!", 0.125, 1.5, 1e-10), L"0.12 1.500000e+00 1E-10");
     EXPECT_EQ(formatMessage(L"%1!f!", -std::numeric_limits<double>::infinity()), L"-inf");
     EXPECT_EQ(formatMessage(L"%1!-20.2s!|", L"text"), L"text|");  // flags and widths are not for texts

@@ -1,6 +1,8 @@
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <iostream>
 #include <sstream>
 
 #include "host/componentManager/componentManager.h"
@@ -194,6 +196,50 @@ TEST_F(Boundary, AModuleIsUsedUnloadedAndLoadedAgain) {
         EXPECT_EQ(std::exchange(reported, L""), first);
     }
     EXPECT_NE(first, L"");
+}
+
+/// A static object of a host, made before the module is loaded: it ends behind whatever the module leaves to the end
+/// of the process. It uses all that outlives a call.
+class LateUser {
+public:
+    explicit LateUser(std::wstring refusedFile) : _file(std::move(refusedFile)) {
+        setMessageReporter([this](int, const wchar_t* text) { _told += toUtf8(text) + '|'; });
+    }
+    ~LateUser() {
+        use();
+        use();
+        std::cerr << _told << '\n';
+    }
+
+    void use() {
+        const Module& module = manager()->loadModule(_module.c_str());
+        EXPECT_THROW(iesImporter()->import(_file.c_str(), nullptr), RnStreamEx::ExReadError);
+        _told += toUtf8(OvPhotometrics::numberedFunctions(module).getMonthName(6)) + '|';
+        RnStream stream(rnCreate<RnMemoryBuffer>().get(), RnStream::Form::binary);
+        stream << lamp().get();
+        stream.device().seek(0, 0);
+        _told += std::to_string(rnCast<RnIntensityDist>(stream.readObject(nullptr).get())->getFlux()) + '|';
+    }
+
+private:
+    std::wstring _module = fromUtf8(modulePath());
+    std::wstring _file;
+    std::string _told;
+};
+
+TEST_F(Boundary, TheModuleServesStaticObjectsThatEndAfterMain) {
+    const std::wstring cut = folder.write("cut.ies", "IESNA91");
+    const auto host = [&](bool isUsedBefore) {
+        setVariable("LC_ALL", "de_DE.UTF-8");
+        static LateUser user(cut);
+        if (isUsedBefore) user.use();
+        std::exit(0);
+    };
+    const std::string once =
+        "Die photometrische Datei kann nicht gelesen werden: Die Datei endet vor ihrer Zeile "
+        "TILT=.|Juni|1000.000000|";
+    EXPECT_EXIT(host(false), testing::ExitedWithCode(0), testing::EndsWith(once + once + '\n'));
+    EXPECT_EXIT(host(true), testing::ExitedWithCode(0), testing::EndsWith(once + once + once + '\n'));
 }
 
 }  // namespace

@@ -19,7 +19,7 @@
 //           relative to the peak in an installed web.
 // Errors:   false, after reported messages (12935, 12936, 12943 to 12948, 12959 to 12962, 12964 to 12968, 12982 to
 //           12991); only a host without its services raises, ExBadCast.
-// Threads:  one at a time, as messages are reported.
+// Threads:  any number; each reading has its own state.
 // More:     docs/formats/cibse.md
 
 namespace OvPhotometrics {

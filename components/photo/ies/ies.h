@@ -19,7 +19,7 @@
 // Units:    degrees and candela in the file, candela being value times multiplier and both ballast factors;
 //           radians and values relative to the peak in an installed web.
 // Errors:   false, after reported messages (12932 to 12968); only a host without its services raises, ExBadCast.
-// Threads:  one at a time, as messages are reported.
+// Threads:  any number; each reading has its own state.
 // More:     docs/formats/ies.md
 
 namespace OvPhotometrics {

@@ -3,13 +3,15 @@
 #include <array>
 #include <cstddef>
 #include <memory_resource>
-#include <new>
 #include <unordered_map>
 
+#include "host/base/immortal.h"
 #include "host/componentManager/builder.h"
 #include "host/componentManager/castImpl.h"
 
 namespace OvPhotometrics {
+
+using Ov::immortal;
 
 /// Every builder of the library by class id. One table a process; it is filled before the module's first call and
 /// only read afterwards. Neither table nor builders are ever freed; as static storage they go with the module.
@@ -52,14 +54,5 @@ public:
 };
 
 LidComponent& lidComponent();
-
-/// The one object of a class, made on first use in static storage and never destroyed, so that it may be asked
-/// until the process ends or the module goes.
-template <class T>
-T& immortal() {
-    alignas(T) static std::byte place[sizeof(T)];
-    static T* const object = new (place) T;
-    return *object;
-}
 
 }  // namespace OvPhotometrics

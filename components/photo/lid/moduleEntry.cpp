@@ -20,4 +20,6 @@ void enterModule(void* instance, std::wstring_view modulePath) {
     catalogue.setFileName(companionPath(modulePath).c_str());
 }
 
+void leaveModule() { Ov::releaseTexts(); }
+
 }  // namespace OvPhotometrics

@@ -13,4 +13,8 @@ std::wstring companionPath(std::wstring_view modulePath);
 /// takes the host's language and names the companion to the catalogue, which opens it at the first message.
 void enterModule(void* instance, std::wstring_view modulePath);
 
+/// What it does before the module is unloaded: gives back the heap. Catalogue, builders and registry stay as they are,
+/// without texts; so do they for whoever asks after this at the end of a process.
+void leaveModule();
+
 }  // namespace OvPhotometrics

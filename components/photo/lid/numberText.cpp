@@ -36,15 +36,11 @@ bool matchesAt(Ov::RnBufferedIO& io, const wchar_t* text) {
     return *text == 0;
 }
 
-bool NumberText::fail(unsigned id) {
+template <class... Arguments>
+bool NumberText::fail(unsigned id, Arguments... arguments) {
     _failed = true;
-    reportParseMessage(id);
-    return false;
-}
-
-bool NumberText::fail(unsigned id, int argument) {
-    _failed = true;
-    reportParseMessage(id, argument);
+    if (!_report) _report.emplace();
+    _report->postParseMessage(id, arguments...);
     return false;
 }
 

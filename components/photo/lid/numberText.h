@@ -2,10 +2,12 @@
 
 #include <cstdint>
 #include <limits>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "components/photo/lid/reportMessage.h"
 #include "host/componentManager/stream.h"
 
 // Lines, free-form numbers and value lists of text formats.
@@ -50,13 +52,14 @@ private:
     bool findNumber(unsigned unexpected, std::int32_t& instead);
     bool atNumberEnd();
     void skipZeroFraction();
-    bool fail(unsigned id);
-    bool fail(unsigned id, int argument);
+    template <class... Arguments>
+    bool fail(unsigned id, Arguments... arguments);
 
     Ov::RnStream& _in;
     AtEnd _atEnd;
     bool _failed = false;
     bool _ended = false;
+    std::optional<Report> _report;  // from the first fault on: there may be thousands
 };
 
 /// Writes formatted text and ends the line.

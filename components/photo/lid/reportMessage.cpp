@@ -1,78 +1,47 @@
 #include "components/photo/lid/reportMessage.h"
 
-#include <chrono>
-
-#include "components/messageFile/message.h"
-#include "components/messageFile/messageIds.h"
+#include "components/messageFile/messageStore.h"
 #include "host/componentManager/processController.h"
 
 namespace OvPhotometrics {
 
 namespace {
 
-std::wstring lastMessage;
+std::wstring numberOf(unsigned id) { return L"Message " + std::to_wstring(id) + L"."; }
 
-void post(std::wstring text) {
-    lastMessage = std::move(text);
-    const auto controller = Ov::rnCast<Ov::RnProcessController>(Ov::RnGetProcessController());
-    controller->report(0, lastMessage.c_str());
-}
-
-/// Whether there is a catalogue. One that is missing is looked for again a little later, not for each of the
-/// thousands of faults that a file may have.
-bool hasTexts() {
-    using Clock = std::chrono::steady_clock;
-    static std::wstring missing;
-    static Clock::time_point again;
-    const std::wstring& name = Ov::messageFile().fileName();
-    if (name == missing && Clock::now() < again) return false;
-    if (Ov::messageFile().isThere()) return true;
-    missing = name;
-    again = Clock::now() + std::chrono::milliseconds(10);
-    return false;
-}
-
-/// The formatted text of a message, or its number without a catalogue.
-std::wstring textOf(unsigned id, std::va_list args) {
-    return hasTexts() ? Ov::messageFile().formatV(id, args) : L"Message " + std::to_wstring(id) + L".";
-}
-
-/// Posts a message that holds `detail`, or that alone without a catalogue.
-void postWrapped(const std::wstring& detail, unsigned wrapper, std::va_list args) {
-    post(hasTexts() ? Ov::messageFile().formatV(wrapper, args) : detail);
-}
+void postText(const std::wstring& text) { Ov::RnReport(0, text.c_str()); }
 
 }  // namespace
 
-void reportMessage(unsigned id, ...) {
-    std::va_list args;
-    va_start(args, id);
-    std::wstring text = textOf(id, args);
-    va_end(args);
-    post(std::move(text));
+std::wstring Report::textV(unsigned id, std::va_list args) const {
+    return _texts ? Ov::formatMessageV(_texts->text(id).c_str(), args) : numberOf(id);
 }
 
-std::wstring messageText(unsigned id, ...) {
+std::wstring Report::text(unsigned id, ...) const {
     std::va_list args;
     va_start(args, id);
-    std::wstring text = textOf(id, args);
+    std::wstring result = textV(id, args);
     va_end(args);
-    return text;
+    return result;
 }
 
-void reportWrapped(const std::wstring& detail, unsigned wrapper, ...) {
+std::wstring Report::rawText(unsigned id) const { return _texts ? _texts->text(id) : numberOf(id); }
+
+void Report::post(unsigned id, ...) const {
+    std::va_list args;
+    va_start(args, id);
+    const std::wstring text = textV(id, args);
+    va_end(args);
+    postText(text);
+}
+
+void Report::postWrapped(const std::wstring& detail, unsigned wrapper, ...) const {
+    if (!_texts) return postText(detail);
     std::va_list args;
     va_start(args, wrapper);
-    postWrapped(detail, wrapper, args);
+    const std::wstring text = textV(wrapper, args);
     va_end(args);
-}
-
-void reportParseMessage(unsigned id, ...) {
-    std::va_list args;
-    va_start(args, id);
-    const std::wstring detail = textOf(id, args);
-    va_end(args);
-    reportWrapped(detail, messages::fileNotRead, detail.c_str());
+    postText(text);
 }
 
 }  // namespace OvPhotometrics

@@ -1,7 +1,6 @@
 #include "components/photo/naturallight/calendar.h"
 
 #include <cstdint>
-#include <string>
 
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
@@ -35,9 +34,9 @@ constexpr Month months[monthsInYear] = {
 /// The row of a month 1..12, or null.
 const Month* findMonth(int month) { return month >= 1 && month <= monthsInYear ? &months[month - 1] : nullptr; }
 
-std::wstring monthText(int month, std::int32_t Month::*message) {
+const wchar_t* monthText(int month, std::int32_t Month::*message) {
     const Month* row = findMonth(month);
-    return row ? Ov::messageFile().format(static_cast<unsigned>(row->*message)) : std::wstring();
+    return row ? Ov::keptText(static_cast<unsigned>(row->*message)) : L"";
 }
 
 }  // namespace
@@ -61,16 +60,8 @@ bool monthAndDay(int yearDay, int* month, int* day) {
     return true;
 }
 
-const wchar_t* getMonthName(int month) {
-    static std::wstring text;
-    text = monthText(month, &Month::name);
-    return text.c_str();
-}
+const wchar_t* getMonthName(int month) { return monthText(month, &Month::name); }
 
-const wchar_t* getMonthShortName(int month) {
-    static std::wstring text;
-    text = monthText(month, &Month::shortName);
-    return text.c_str();
-}
+const wchar_t* getMonthShortName(int month) { return monthText(month, &Month::shortName); }
 
 }  // namespace OvPhotometrics

@@ -16,8 +16,10 @@ int dayOfYear(int month, int day);
 /// The date of a day of the year. Outside 1..365 it answers false and writes nothing. Null pointers are skipped.
 bool monthAndDay(int yearDay, int* month, int* day);
 
-/// The month's name from the message catalogue; empty outside 1..12. The text stays valid until the same function
-/// is called again. Errors:   RnMessageFileEx when there is no catalogue. Threads:  one caller at a time.
+/// The month's name from the message catalogue; empty outside 1..12. The text stays valid as long as the module is
+/// loaded.
+/// Errors:   RnMessageFileEx when there is no catalogue.
+/// Threads:  any number.
 const wchar_t* getMonthName(int month);
 const wchar_t* getMonthShortName(int month);
 

@@ -2,7 +2,6 @@
 
 #include <string>
 
-#include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
 #include "components/photo/lid/reportMessage.h"
 
@@ -35,13 +34,9 @@ void setSunFlags(Settings& s, unsigned word) { setFlags(word, s.sunCastsShadows,
 void setSkyFlags(Settings& s, unsigned word) { setFlags(word, s.skyCastsShadows, s.skyFlag2, s.skyFlag3); }
 
 void reportFormError(unsigned message, int line) {
-    std::wstring text;
-    try {
-        text = Ov::messageFile().getText(message);
-    } catch (const Ov::RnMessageFileEx&) {
-        return reportMessage(message);
-    }
-    reportMessage(messages::naturalLightLine, text.c_str(), line);
+    const Report report;
+    const std::wstring detail = report.rawText(message);
+    report.postWrapped(detail, messages::naturalLightLine, detail.c_str(), line);
 }
 
 }  // namespace OvPhotometrics

@@ -3,7 +3,6 @@
 #include <cmath>
 #include <cstdint>
 #include <numbers>
-#include <string>
 
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
@@ -71,10 +70,8 @@ const TimeZone* findZone(int index) { return index >= 0 && index < zoneCount ? &
 int getTimeZoneCount() { return zoneCount; }
 
 const wchar_t* getTimeZoneName(int index) {
-    static std::wstring text;
     const TimeZone* zone = findZone(index);
-    text = zone ? Ov::messageFile().format(zone->name) : std::wstring();
-    return text.c_str();
+    return zone ? Ov::keptText(zone->name) : L"";
 }
 
 int getTimeZoneFlag(int index) {

@@ -7,10 +7,10 @@ namespace OvPhotometrics {
 
 int getTimeZoneCount();
 
-/// The zone's name from the message catalogue; empty for an invalid index. The text stays valid until the function
-/// is called again.
+/// The zone's name from the message catalogue; empty for an invalid index. The text stays valid as long as the
+/// module is loaded.
 /// Errors:   RnMessageFileEx when there is no catalogue.
-/// Threads:  one caller at a time.
+/// Threads:  any number.
 const wchar_t* getTimeZoneName(int index);
 
 /// The zone's flag, 0 or 1: 1 marks the second of two zones of one offset. 0 for an invalid index.

@@ -20,7 +20,7 @@
 //           values relative to the peak in an installed web.
 // Errors:   false, after a reported message (12970 to 12981, 12935, 12936); only the bad cast of a distribution's
 //           web raises.
-// Threads:  one read at a time; the line number that messages carry belongs to the module.
+// Threads:  any number; each reading counts its own lines.
 // More:     docs/formats/nimb.md
 
 namespace OvPhotometrics {

@@ -15,25 +15,27 @@ constexpr std::size_t fieldWidth = 4;
 constexpr int magicPlace = 36;
 constexpr int valuesPerLine = 17;
 
-int nimbLineNumber = 0;
-
-/// Reports what is wrong with the current line; false.
-template <class... Arguments>
-bool nimbReportError(unsigned id, Arguments... arguments) {
-    const std::wstring detail = messageText(id, arguments...);
-    reportWrapped(detail, messages::nimbLine, nimbLineNumber, detail.c_str());
-    return false;
-}
-
-/// One line as the reader keeps it, cut into fields.
-class Line {
+/// A file being read, line by line: the current one, cut into fields.
+class Lines {
 public:
-    /// False, after a message, at the end of the input.
-    bool read(Ov::RnStream& s) {
-        const int length = nimbReadLine(_buffer.data(), s);
-        if (length < 0) return nimbReportError(messages::nimbEndOfFile);
+    explicit Lines(Ov::RnStream& in) : _in(in) {}
+
+    /// Reads the next line. False, after a message, at the end of the input.
+    bool next() {
+        ++_number;
+        const int length = nimbReadLine(_buffer.data(), _in);
+        if (length < 0) return refuse(messages::nimbEndOfFile);
         _text = {_buffer.data(), static_cast<std::size_t>(length)};
         return true;
+    }
+
+    /// Reports what is wrong with the current line; false.
+    template <class... Arguments>
+    bool refuse(unsigned id, Arguments... arguments) const {
+        const Report report;
+        const std::wstring detail = report.text(id, arguments...);
+        report.postWrapped(detail, messages::nimbLine, _number, detail.c_str());
+        return false;
     }
 
     std::wstring_view text() const { return _text; }
@@ -55,33 +57,33 @@ public:
     }
 
 private:
+    Ov::RnStream& _in;
+    int _number = 0;
     std::array<wchar_t, nimbLineLength + 1> _buffer{};
     std::wstring_view _text;
 };
 
-bool readHeader(NimbRecord& rec, Ov::RnStream& s) {
-    Line line;
-    if (!line.read(s)) return false;
-    const int fields = line.fields();
-    if (fields < 10) return nimbReportError(messages::nimbHeaderFields, fields);
-    if (line.text().substr(magicPlace, 4) != L"NIMB") return nimbReportError(messages::nimbMagic);
+bool readHeader(NimbRecord& rec, Lines& lines) {
+    if (!lines.next()) return false;
+    const int fields = lines.fields();
+    if (fields < 10) return lines.refuse(messages::nimbHeaderFields, fields);
+    if (lines.text().substr(magicPlace, 4) != L"NIMB") return lines.refuse(messages::nimbMagic);
 
-    rec.identifier = line.field(0);
-    if (rec.identifier < 0) rec.identifier = fields >= 12 ? line.field(10) * 10000 + line.field(11) : 0;
+    rec.identifier = lines.field(0);
+    if (rec.identifier < 0) rec.identifier = fields >= 12 ? lines.field(10) * 10000 + lines.field(11) : 0;
     int next = 1;
     for (std::int32_t* number : {&rec.psiMax, &rec.thetaMax, &rec.psiStep, &rec.thetaStep, &rec.orientationAngle,
                                  &rec.spare1, &rec.spare2, &rec.spare3})
-        *number = line.field(next++);
-    rec.symmetryCode1 = fields >= 13 ? line.field(12) : -1;
-    rec.symmetryCode2 = fields >= 14 ? line.field(13) : -1;
+        *number = lines.field(next++);
+    rec.symmetryCode1 = fields >= 13 ? lines.field(12) : -1;
+    rec.symmetryCode2 = fields >= 14 ? lines.field(13) : -1;
     return true;
 }
 
-bool readTextLines(NimbRecord& rec, Ov::RnStream& s) {
-    Line line;
+bool readTextLines(NimbRecord& rec, Lines& lines) {
     for (std::wstring& text : rec.lines) {
-        if (!line.read(s)) return false;
-        text = line.text();
+        if (!lines.next()) return false;
+        text = lines.text();
     }
     return true;
 }
@@ -89,7 +91,7 @@ bool readTextLines(NimbRecord& rec, Ov::RnStream& s) {
 bool dividesRightAngle(int step) { return step > 0 && 90 % step == 0; }
 bool isSymmetryCode(int code) { return code >= -1 && code <= 3; }
 
-bool checkHeader(const NimbRecord& rec) {
+bool checkHeader(const NimbRecord& rec, const Lines& lines) {
     const struct {
         bool valid;
         unsigned message;
@@ -106,19 +108,18 @@ bool checkHeader(const NimbRecord& rec) {
         {isSymmetryCode(rec.symmetryCode2), messages::nimbSymmetryCode2, rec.symmetryCode2},
     };
     for (const auto& check : checks)
-        if (!check.valid) return nimbReportError(check.message, check.value);
+        if (!check.valid) return lines.refuse(check.message, check.value);
     return true;
 }
 
-bool readValues(NimbRecord& rec, Ov::RnStream& s) {
+bool readValues(NimbRecord& rec, Lines& lines) {
     const int count = rec.valueCount();
     rec.values.reserve(static_cast<std::size_t>(count));
-    Line line;
     for (int done = 0; done < count; done += valuesPerLine) {
-        if (!line.read(s)) return false;
+        if (!lines.next()) return false;
         const int expected = std::min(count - done, valuesPerLine);
-        if (line.fields() != expected) return nimbReportError(messages::nimbLineFields, line.fields());
-        for (int k = 0; k < expected; ++k) rec.values.push_back(static_cast<std::int16_t>(line.field(k)));
+        if (lines.fields() != expected) return lines.refuse(messages::nimbLineFields, lines.fields());
+        for (int k = 0; k < expected; ++k) rec.values.push_back(static_cast<std::int16_t>(lines.field(k)));
     }
     return true;
 }
@@ -134,7 +135,6 @@ bool nimbCanRead(Ov::RnBufferedIO& io) {
 }
 
 int nimbReadLine(wchar_t* buffer73, Ov::RnStream& s) {
-    ++nimbLineNumber;
     int c = s.getChar();
     if (c < 0) return -1;
     int length = 0;
@@ -158,10 +158,12 @@ int nimbReadLine(wchar_t* buffer73, Ov::RnStream& s) {
 }
 
 bool nimbRead(NimbRecord& rec, Ov::RnStream& s) {
-    nimbLineNumber = 0;
     rec = NimbRecord();
-    if (withinMemory(
-            [&] { return readHeader(rec, s) && readTextLines(rec, s) && checkHeader(rec) && readValues(rec, s); }))
+    Lines lines(s);
+    if (withinMemory([&] {
+            return readHeader(rec, lines) && readTextLines(rec, lines) && checkHeader(rec, lines) &&
+                   readValues(rec, lines);
+        }))
         return true;
     rec = NimbRecord();
     return false;

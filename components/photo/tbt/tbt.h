@@ -26,7 +26,7 @@
 //           the file does not give; the same values, relative to their peak, and radians in an installed web.
 // Errors:   false, after a reported message (12993 to 13025, 12935, 12936); only the bad cast of a distribution's
 //           web raises.
-// Threads:  one at a time, as messages are reported.
+// Threads:  any number; each reading has its own state.
 // More:     docs/formats/tbt.md
 
 namespace OvPhotometrics {

@@ -15,23 +15,26 @@ constexpr std::int32_t anyCount = std::numeric_limits<std::int32_t>::max();
 /// Something else stands where a number, fill or end marker must stand.
 bool syntaxError(const TbtTokenizer& in, unsigned id) {
     constexpr std::size_t longestDescription = 63;
-    const std::wstring detail = messageText(id);
-    const std::wstring found = messageText(static_cast<unsigned>(in.kind()), in.text().c_str());
-    reportWrapped(detail, messages::tbtSyntaxError, in.lineFeeds(), detail.c_str(),
-                  found.size() <= longestDescription ? found.c_str() : nullptr);
+    const Report report;
+    const std::wstring detail = report.text(id);
+    const std::wstring found = report.text(static_cast<unsigned>(in.kind()), in.text().c_str());
+    report.postWrapped(detail, messages::tbtSyntaxError, in.lineFeeds(), detail.c_str(),
+                       found.size() <= longestDescription ? found.c_str() : nullptr);
     return false;
 }
 
 template <class... Values>
 bool valueError(const TbtTokenizer& in, unsigned id, Values... values) {
-    const std::wstring detail = messageText(id, values...);
-    reportWrapped(detail, messages::tbtValueError, in.lineFeeds(), detail.c_str());
+    const Report report;
+    const std::wstring detail = report.text(id, values...);
+    report.postWrapped(detail, messages::tbtValueError, in.lineFeeds(), detail.c_str());
     return false;
 }
 
 bool outOfMemory() {
-    reportWrapped(messageText(messages::outOfMemory), messages::tbtResourceError,
-                  static_cast<int>(messages::outOfMemory));
+    const Report report;
+    report.postWrapped(report.text(messages::outOfMemory), messages::tbtResourceError,
+                       static_cast<int>(messages::outOfMemory));
     return false;
 }
 

@@ -239,8 +239,16 @@ TEST_F(LightForms, FormsOfOtherReleases) {
     const std::string release2 = "Marovendel Natural Light Version 1, Release 2\n" + common + overrides;
     EXPECT_EQ(refusal(release2 + accuracy, Form::text).substr(0, 11), "12896 12921");
     EXPECT_EQ(refusal(release2 + "Sky Casts Shadows: no\n", Form::text).substr(0, 11), "12896 12924");
-    Ov::messageFile().setFileName(L"");
-    EXPECT_EQ(refusal("", Form::binary), "Message 12898.");
+    // Texts come and go as a whole, at once.
+    const std::wstring texts = Ov::messageFile().fileName();
+    const TempFolder folder;
+    const std::wstring later = folder.wide("later");
+    for (const std::wstring& missing : {std::wstring(), later}) {
+        Ov::messageFile().setFileName(missing.c_str());
+        EXPECT_EQ(refusal("", Form::binary), "Message 12898.");
+    }
+    std::filesystem::copy_file(Ov::nativePath(texts), Ov::nativePath(later));
+    EXPECT_EQ(refusal("", Form::binary), "12896 12898 0");
     for (const char version : {'\0', '\2'}) {
         light->setLatitude(3);
         EXPECT_TRUE(load({version, 0, 3, 0}, Form::binary));
