@@ -48,8 +48,9 @@ public:
     virtual RnRef<RnCastable> create() = 0;
 };
 
-/// Imports objects of one class from files; the second base of a builder. One caller at a time imports into a
-/// module.
+/// Imports objects of one class from files; the second base of a builder.
+///
+/// Threads:  any number may use a builder at once, each with a device of its own.
 class OVHOST_API RnImportBuilder : public RnCastable {
 public:
     /// Id of the interface.

@@ -8,8 +8,8 @@ namespace Ov {
 
 /// Imports files of a family of formats without being told which.
 ///
-/// Threads:  one caller at a time for all importers and importing builders of a module: its readers keep what they
-///           are at, and its last message, for the module as a whole.
+/// Threads:  any number may import at once, by one importer, too, each from a file or device of its own. The texts of
+///           `getFileTypes` and `getDefaultSearch` belong to the importer: one thread at a time asks it for them.
 class OVHOST_API RnImporter : public RnCastable {
 public:
     /// Id of the interface.

@@ -20,7 +20,7 @@ namespace Ov {
 ///
 /// Errors: a value that is missing or cannot be held raises RnStreamEx::ExReadError, one that cannot be written
 /// RnStreamEx::ExWriteError. The formatted operations return counts instead.
-/// Threads: one at a time.
+/// Threads: one at a time for a stream and its device.
 class OVHOST_API RnStream {
 public:
     /// How values stand in the device.

@@ -15,7 +15,7 @@ namespace Ov {
 ///           for a web distribution whose web is turned.
 /// Units:    candela, lumens, radians.
 /// Errors:   a zero vector raises the assertion "len > 0" where a direction is normalised.
-/// Threads:  the intensity operations change nothing; any number of threads may ask at once.
+/// Threads:  any number may ask, clone and save a distribution at once that nobody changes.
 class RnIntensityDist : public RnCastable {
 public:
     /// Id of the interface.

@@ -12,7 +12,8 @@
 extern "C" {
 
 /// The entry point, export 1 and the module's only named function: its builders. The object is static; no
-/// reference is taken.
+/// reference is taken. It and its builders serve any number of threads as long as the module is loaded, after `main`
+/// has ended, too.
 OVPHOTO_EXPORT Ov::RnComponentRegistry* RnGetComponentDescription();
 }
 

@@ -56,7 +56,7 @@ struct NaturalLightSettings {
 /// Lazy:     the values below "derived" are computed together by the first of them that is asked for after
 ///           a change, which is why those operations are not const. Getters of settings never compute: after `setSolarTime`
 ///           the local time follows when a derived value is next asked for.
-/// Threads:  one at a time.
+/// Threads:  one at a time for an object, as getters compute; any number with objects of their own.
 class RnNaturalLight : public RnCastable {
 public:
     /// Id of the interface.

@@ -18,8 +18,9 @@
 // 1 January. An index of a time zone is valid from 0 to one below the count. Null pointers to results are skipped.
 // Nothing throws, but the functions that give names do (RnMessageFileEx) when there is no catalogue of messages.
 //
-// Names are in the host's language; their texts are the module's, each valid until its function is called again.
-// The functions that give names take one caller at a time, the others any number.
+// Names are in the host's language; their texts are the module's, valid as long as it is loaded.
+//
+// Any number of threads may call any of the functions, each with streams, devices and visitors of its own.
 //
 // Files (435 to 438, 440 and 441) and intensities (439) are described where they stand below.
 
@@ -113,7 +114,7 @@ struct NumberedFunctions {
     /// gives them, of any format: lines of another format go where there is room, keywords in front; the name of a
     /// web distribution's web goes where no fact says what the luminaire is.
     /// False, and nothing has been written, after messages to the host's reporter; a stream that fails raises
-    /// RnStreamEx. One caller at a time.
+    /// RnStreamEx.
     bool (*writeIes)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
                      std::int32_t count);
     bool (*writeCibse)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
@@ -130,7 +131,7 @@ struct NumberedFunctions {
     /// and may not overlap them. Both may be null when `count` is 0. False, and nothing has been written, when
     /// `light` is null or no distribution, a pointer is null, the count is below 0 or the form is none of those
     /// above. A zero vector raises the assertion that the single operation raises; what has been written by then
-    /// is not to be used. Any number of threads may ask at once. The wrappers in ovphoto/intensities.h take spans.
+    /// is not to be used. The wrappers in ovphoto/intensities.h take spans.
     bool (*getIntensities)(Ov::RnCastable* light, DirectionForm form, const float* directions, std::int64_t count,
                            float* candela);
 
@@ -138,14 +139,14 @@ struct NumberedFunctions {
     /// The format is that of the web class `format`, or, when that is null, of the first whose content test
     /// accepts the input. `basePath` (may be null) is where a tilt file is looked for first. The texts are valid
     /// during the visit. False, and nothing has been visited, when the input is refused (after messages) or of no
-    /// known format. One caller at a time.
+    /// known format.
     bool (*readFileFacts)(Ov::RnBufferedIO& io, const Ov::RnUid* format, const wchar_t* basePath,
                           Ov::RnEnumerator<const FileFact&>& visitor);
 
     /// Both in one reading: imports a web as the builder of the web class `format` does, which raises
     /// RnStreamEx::ExReadError where it refuses, and then visits what the file says beyond it. `name`, which
     /// becomes the web's, and `basePath` may be null. Null, and nothing has been read, where `format` is no web
-    /// class. One caller at a time.
+    /// class.
     Ov::RnRef<Ov::RnCastable> (*importWithFacts)(Ov::RnBufferedIO& io, const Ov::RnUid& format,
                                                  const wchar_t* name, const wchar_t* basePath,
                                                  Ov::RnEnumerator<const FileFact&>& visitor);

@@ -15,7 +15,7 @@ namespace Ov {
 /// Units:    radians; relative values whose peak is 1, to be multiplied by `getMaxCandela` for candela; lumens.
 /// Outside:  a web is dark above its first and below its last vertical angle.
 /// Empty:    a web that nothing was loaded into answers 0, the identity and empty ranges.
-/// Threads:  any number may query a loaded web at once.
+/// Threads:  any number may query, clone and save a loaded web at once.
 class RnPhotoWebData : public RnCastable {
 public:
     /// Id of the interface.
