@@ -136,3 +136,55 @@ TEST_F(ToolUsage, StandardInputAndOutputAreNamedByADash) {
         EXPECT_EQ(runTool(wrong, folder, light).status, 2) << wrong;
     }
 }
+
+TEST_F(ToolUsage, WhatIsShownToPeopleActsOnNoTerminal) {
+    if (windowsTool()) GTEST_SKIP() << "names there hold no control characters";
+    std::string file = IesFile{.tilt = "a\x1b]0;x\x07"}.text();
+    file.replace(file.find("[TEST] one"), 10, "[TEST] \x1b[2J \x7f\t.");
+    const std::string name =
+        "n\nok       IES    \x1b[31m\x9b"
+        "1m\xc2\x85\r.ies";
+    folder.write("in/" + name, file);
+    folder.write("in/a\x1b]0;x\x07", "1 2 0 90 1 1");
+    folder.write("bad\x1b[1m\n.ies", "IESNA91\nTILT=\x1b[2J\n");
+    const std::string in = "'in/" + name + "'", bad = "'bad\x1b[1m\n.ies'", unknown = "'\x1b[1m\nok'";
+    for (const std::string& command : {"info " + in,
+                                       "check in " + bad,
+                                       "intensity " + in + " 0,0",
+                                       "intensity " + bad + " 0,0",
+                                       "convert " + in + " --into out --to nimb",
+                                       "convert " + bad + " " + in + " --to ies --into out --jobs 2",
+                                       "convert " + in + " 'in/x\n\x1b/y.ies'",
+                                       "plot " + bad + " -o 'x\x1b\n'",
+                                       "report in " + bad + " -o out/i.html",
+                                       "formats --detect " + in,
+                                       "settings show " + bad,
+                                       "settings show " + unknown,
+                                       "sun --from " + bad,
+                                       "make isotropic " + unknown + " --to ies",
+                                       "make isotropic " + unknown,
+                                       "info --as " + unknown,
+                                       unknown,
+                                       "info " + in + " --module " + unknown,
+                                       "sun --date " + unknown,
+                                       "info --json " + in + " " + bad}) {
+        const ToolResult result = runTool(command, folder);
+        const std::string shown = result.out + result.err;
+        EXPECT_GT(shown.size(), 0U) << command;
+        for (std::size_t i = 0; i < shown.size(); ++i) {
+            const auto c = static_cast<unsigned char>(shown[i]);
+            const bool second = (c & 0xe0) == 0x80 && i > 0 && shown[i - 1] == '\xc2';
+            EXPECT_TRUE((c >= ' ' || c == '\n') && c != 0x7f && !second) << command << '\n' << shown;
+        }
+        EXPECT_EQ(("\n" + shown).find("\nok"), std::string::npos) << command << shown;
+    }
+    const ToolResult human = runTool("info " + in, folder);
+    EXPECT_TRUE(human.says("in/n\\nok       IES    \\x1b[31m\\x9b1m\\x85\\r.ies\n")) << human.out;
+    EXPECT_TRUE(human.says("  \\x1b[2J \\x7f .\n")) << human.out;
+    // JSON is exact, but for the byte that is no text.
+    const auto exact = runTool("info --json " + in, folder).json().at(0);
+    EXPECT_EQ(exact["file"],
+              "in/n\nok       IES    \x1b[31m\ufffd"
+              "1m\u0085\r.ies");
+    EXPECT_EQ(exact["facts"][1]["value"], "\x1b[2J \x7f\t.");
+}

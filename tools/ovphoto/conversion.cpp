@@ -7,7 +7,7 @@
 #include "tools/ovphoto/lightFile.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
-#include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -117,14 +117,13 @@ void printReport(const Json& report, const Conversion& conversion, bool json) {
         printLine(report);
         std::cout.flush();  // what is done is told even if a later file ends the process
     } else if (report["ok"].get<bool>()) {
-        reportStreamFor(conversion.out)
-            << conversion.in << " -> " << conversion.out << ": " << report["format"].get<std::string>() << " to "
-            << conversion.target->name << ", " << lossText(report) << '\n';
+        sayOf(conversion.out, conversion.in + " -> " + conversion.out + ": " +
+                                  report["format"].get<std::string>() + " to " + conversion.target->name + ", " +
+                                  lossText(report));
     }
-    for (const Json& message : report["messages"])
-        std::cerr << conversion.in << ": " << message.get<std::string>() << '\n';
+    for (const Json& message : report["messages"]) complain(conversion.in + ": " + message.get<std::string>());
     for (const Json& warning : report["warnings"])
-        std::cerr << conversion.in << ": warning: " << warning.get<std::string>() << '\n';
+        complain(conversion.in + ": warning: " + warning.get<std::string>());
 }
 
 }  // namespace OvTool

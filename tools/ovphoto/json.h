@@ -12,7 +12,7 @@ namespace OvTool {
 using Json = nlohmann::basic_json<nlohmann::ordered_map, std::vector, std::string, bool, std::int64_t,
                                   std::uint64_t, float>;
 
-/// Prints the object on a line of its own. Bytes that are no UTF-8 become U+FFFD.
+/// Prints the object on a line of its own. Bytes that are no UTF-8 become U+FFFD; control characters are escaped.
 void printLine(const Json& object);
 
 }  // namespace OvTool

@@ -6,10 +6,13 @@
 
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/platform.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace {
 
 using namespace OvTool;
+
+constexpr const char* helpHint = "Run with --help for more information.";
 
 /// Runs the command that was given; whatever it throws but wrong usage ends here as a message.
 int runCommand(const Action& action, const std::string& module) {
@@ -19,7 +22,7 @@ int runCommand(const Action& action, const std::string& module) {
     } catch (const CLI::ParseError&) {
         throw;  // what the module alone can tell of the arguments
     } catch (...) {
-        std::cerr << "ovphoto: " << currentExceptionText() << '\n';
+        complain("ovphoto: " + currentExceptionText());
         return exitFailed;
     }
 }
@@ -31,6 +34,9 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     app.require_subcommand(0, 1);
     app.fallthrough();
     app.allow_windows_style_options(false);
+    // What was wrong quotes arguments. Subcommands take this over.
+    app.failure_message(
+        [](const CLI::App*, const CLI::Error& error) { return printable(error.what()) + '\n' + helpHint + '\n'; });
 
     std::vector<std::pair<const CLI::App*, Action>> actions;
     for (const Command& command : commands()) {
@@ -46,7 +52,8 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     } catch (const CLI::ParseError& error) {
         return app.exit(error) == 0 ? exitWell : exitUsage;
     }
-    std::cerr << "A command is required\nRun with --help for more information.\n";
+    complain("A command is required");
+    complain(helpHint);
     return exitUsage;
 }
 
@@ -67,6 +74,6 @@ int main(int argc, char** argv) {
     const int status = parseAndRun(app, commandLine(argc, argv));
     if (std::cout.flush()) return status;
     // Whoever closes a pipe has read enough.
-    if (!standardOutputIsClosedPipe()) std::cerr << "ovphoto: standard output cannot be written\n";
+    if (!standardOutputIsClosedPipe()) complain("ovphoto: standard output cannot be written");
     return status == exitWell ? exitFailed : status;
 }

@@ -14,6 +14,4 @@ Ov::RnRef<Ov::RnBufferedIO> openStandardInput(std::string& error) {
     return {};
 }
 
-std::ostream& reportStreamFor(std::string_view file) { return isStandardStream(file) ? std::cerr : std::cout; }
-
 }  // namespace OvTool

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <iosfwd>
 #include <string>
 #include <string_view>
 
@@ -15,8 +14,5 @@ inline bool isStandardStream(std::string_view file) { return file == "-"; }
 
 /// Standard input, which can be read once: null, and why in `error`, from the second time on.
 Ov::RnRef<Ov::RnBufferedIO> openStandardInput(std::string& error);
-
-/// Where a command tells what it wrote to `file`: standard output, unless that took the file itself.
-std::ostream& reportStreamFor(std::string_view file);
 
 }  // namespace OvTool

@@ -1,11 +1,16 @@
 #include "tools/ovphoto/table.h"
 
 #include <algorithm>
-#include <iostream>
 
 #include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
+
+void Table::add(std::vector<std::string> row) {
+    for (std::string& text : row) text = printable(text);
+    _rows.push_back(std::move(row));
+}
 
 void Table::print(std::size_t indent) const {
     std::vector<std::size_t> widths;
@@ -19,7 +24,7 @@ void Table::print(std::size_t indent) const {
             line += row[i];
             if (i + 1 < row.size()) line.append(widths[i] - characterCount(row[i]) + 2, ' ');
         }
-        std::cout << line << '\n';
+        say(line);
     }
 }
 

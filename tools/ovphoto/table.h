@@ -8,7 +8,7 @@ namespace OvTool {
 /// Rows of texts, printed with their columns aligned.
 class Table {
 public:
-    void add(std::vector<std::string> row) { _rows.push_back(std::move(row)); }
+    void add(std::vector<std::string> row);
     /// Prints the rows to standard output, each behind `indent` blanks.
     void print(std::size_t indent = 0) const;
 

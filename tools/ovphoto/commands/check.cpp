@@ -1,11 +1,13 @@
 #include <CLI/CLI.hpp>
 #include <iostream>
 #include <memory>
+#include <sstream>
 
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/expandPaths.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/progress.h"
+#include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webWarnings.h"
 
 namespace OvTool {
@@ -38,9 +40,8 @@ void printTexts(const char* label, const std::vector<std::string>& texts) {
     for (std::size_t i = 0; i < texts.size();) {
         std::size_t end = i + 1;
         while (end < texts.size() && texts[end] == texts[i]) ++end;
-        std::cout << "    " << label << texts[i];
-        if (end - i > 1) std::cout << " (" << end - i << " times)";
-        std::cout << '\n';
+        const std::string times = end - i > 1 ? " (" + std::to_string(end - i) + " times)" : "";
+        say(std::string("    ") + label + texts[i] + times);
         i = end;
     }
 }
@@ -49,18 +50,19 @@ void printText(const ReadResult& result, const std::vector<std::string>& warning
     std::string format = result.format.empty() ? "-" : result.format;
     format.resize(5, ' ');
     const char* verdict = !result.web ? "refused  " : warnings.empty() ? "ok       " : "warning  ";
-    std::cout << verdict << format << "  " << result.file << '\n';
+    say(verdict + format + "  " + result.file);
     printTexts("", result.reasons());
     printTexts("warning: ", warnings);
 }
 
 void printSummary(const Totals& totals) {
     const int files = totals.well + totals.refused;
-    std::cout << files << (files == 1 ? " file: " : " files: ") << totals.well << " ok";
-    if (totals.withWarnings > 0) std::cout << " (" << totals.withWarnings << " with warnings)";
-    std::cout << ", " << totals.refused << " refused";
-    if (totals.skipped > 0) std::cout << "; " << totals.skipped << " more of no known format";
-    std::cout << '\n';
+    std::ostringstream line;
+    line << files << (files == 1 ? " file: " : " files: ") << totals.well << " ok";
+    if (totals.withWarnings > 0) line << " (" << totals.withWarnings << " with warnings)";
+    line << ", " << totals.refused << " refused";
+    if (totals.skipped > 0) line << "; " << totals.skipped << " more of no known format";
+    say(line.str());
 }
 
 ReadResult readFound(const FoundFile& file, const CheckOptions& options, const HostSession& session) {

@@ -1,9 +1,9 @@
 #include "tools/ovphoto/commands/commands.h"
 
 #include <CLI/CLI.hpp>
-#include <iostream>
 
 #include "tools/ovphoto/json.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -63,7 +63,7 @@ const TargetFormat* targetForOutput(const std::string& out) {
 }
 
 void showReasons(const std::string& file, const std::vector<std::string>& reasons) {
-    for (const std::string& reason : reasons) std::cerr << file << ": " << reason << '\n';
+    for (const std::string& reason : reasons) complain(file + ": " + reason);
 }
 
 void showReasons(const ReadResult& result) { showReasons(result.file, result.reasons()); }

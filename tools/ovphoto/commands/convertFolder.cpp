@@ -14,6 +14,7 @@
 #include "tools/ovphoto/expandPaths.h"
 #include "tools/ovphoto/progress.h"
 #include "tools/ovphoto/selfRunner.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -186,11 +187,12 @@ Totals carryOut(const Plan& plan, const ConvertOptions& options, const HostSessi
 
 void printSummary(const Totals& totals, int skipped) {
     const int files = totals.converted + totals.failed;
-    std::cout << files << (files == 1 ? " file: " : " files: ") << totals.converted << " converted";
-    if (totals.withWarnings > 0) std::cout << " (" << totals.withWarnings << " with warnings)";
-    std::cout << ", " << totals.failed << " failed";
-    if (skipped > 0) std::cout << "; " << skipped << " more of no known format";
-    std::cout << '\n';
+    std::ostringstream line;
+    line << files << (files == 1 ? " file: " : " files: ") << totals.converted << " converted";
+    if (totals.withWarnings > 0) line << " (" << totals.withWarnings << " with warnings)";
+    line << ", " << totals.failed << " failed";
+    if (skipped > 0) line << "; " << skipped << " more of no known format";
+    say(line.str());
 }
 
 }  // namespace
@@ -200,7 +202,7 @@ int convertIntoFolder(const ConvertOptions& options, const HostSession& session)
     std::error_code error;
     fs::create_directories(Ov::nativePath(Ov::fromUtf8(options.folder)), error);
     if (error) {
-        std::cerr << options.folder << ": cannot be made: " << error.message() << '\n';
+        complain(options.folder + ": cannot be made: " + error.message());
         return exitFailed;
     }
     const Totals totals = carryOut(plan, options, session);

@@ -1,12 +1,12 @@
 #include <CLI/CLI.hpp>
 #include <cstdio>
-#include <iostream>
 #include <memory>
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/table.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -51,7 +51,7 @@ int listBuilders(const FormatsOptions& options, const HostSession& session) {
 }
 
 void printDetection(const std::string& file, const std::string& taken, const Json& canImport) {
-    std::cout << file << ": " << (taken.empty() ? unknownFormat : taken.c_str()) << '\n';
+    say(file + ": " + (taken.empty() ? unknownFormat : taken));
     Table table;
     for (const auto& [format, accepts] : canImport.items()) {
         table.add({format, accepts.get<bool>() ? "accepts it" : "does not accept it"});

@@ -1,7 +1,7 @@
 #include <CLI/CLI.hpp>
 #include <cmath>
-#include <iostream>
 #include <memory>
+#include <utility>
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/beamAngles.h"
@@ -10,6 +10,7 @@
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/table.h"
+#include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webTexts.h"
 
 namespace OvTool {
@@ -69,7 +70,7 @@ void printBeamAngles(const RnPhotoWebData& web, const RnWebIntensityDist& light)
 
 void printFacts(const std::vector<Fact>& facts) {
     if (facts.empty()) return;
-    std::cout << "  In the file\n";
+    say("  In the file");
     Table table;
     for (const Fact& fact : facts) table.add({toUtf8(fact.key), toUtf8(fact.text)});
     table.print(4);
@@ -79,7 +80,7 @@ void printText(const ReadResult& result, const HostSession& session) {
     const RnPhotoWebData& web = *result.web;
     Table table;
     for (const auto& [name, text] : webTexts(result)) table.add({name, text});
-    std::cout << result.file << '\n';
+    say(result.file);
     table.print(2);
     printBeamAngles(web, *session.distribute(*result.web, web.getLumens()));
     printFacts(result.facts);
@@ -87,7 +88,7 @@ void printText(const ReadResult& result, const HostSession& session) {
 
 int runInfo(const InfoOptions& options, const HostSession& session) {
     int status = exitWell;
-    const char* separator = "";
+    bool separated = false;
     for (const std::string& file : options.files) {
         if (!std::cout) break;
         const ReadResult result = session.read(file, options.as);
@@ -98,9 +99,8 @@ int runInfo(const InfoOptions& options, const HostSession& session) {
         } else if (options.json) {
             printJson(result, options.values);
         } else {
-            std::cout << separator;
+            if (std::exchange(separated, true)) say("");
             printText(result, session);
-            separator = "\n";
         }
     }
     return status;

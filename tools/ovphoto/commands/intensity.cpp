@@ -7,6 +7,7 @@
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -66,9 +67,8 @@ public:
         if (_json) {
             printLine(Json{{"theta", direction.theta}, {"psi", direction.psi}, {"candela", candela}});
         } else {
-            std::cout << padLeft(exactNumber(direction.theta), 8) << " deg "
-                      << padLeft(exactNumber(direction.psi), 8) << " deg " << padLeft(exactNumber(candela), 12)
-                      << " cd\n";
+            say(padLeft(exactNumber(direction.theta), 8) + " deg " + padLeft(exactNumber(direction.psi), 8) +
+                " deg " + padLeft(exactNumber(candela), 12) + " cd");
         }
     }
 
@@ -88,12 +88,12 @@ int answerInput(const IntensityPrinter& printer) {
         if (const auto direction = parseDirection(text)) {
             printer.print(*direction);
         } else {
-            std::cerr << "standard input, line " << number << ": no direction (theta psi, in degrees)\n";
+            complain("standard input, line " + std::to_string(number) + ": no direction (theta psi, in degrees)");
             status = exitFailed;
         }
     }
     if (!std::cin.bad()) return status;
-    std::cerr << "standard input cannot be read\n";
+    complain("standard input cannot be read");
     return exitFailed;
 }
 

@@ -1,12 +1,12 @@
 #include "tools/ovphoto/commands/lightOptions.h"
 
 #include <algorithm>
-#include <iostream>
 
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/numbers.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -147,14 +147,13 @@ RnRef<RnNaturalLight> makeLight(const HostSession& session, const LightOptions& 
     const auto functions = session.functions();
     for (const auto& change : options.changes) change(*light, functions);
     if (!sited)
-        std::cerr << inLanguage("note: no site is given; taken is ", "Hinweis: Kein Ort ist angegeben; es gilt ")
-                  << siteText(*light, functions) << '\n';
+        complain(inLanguage("note: no site is given; taken is ", "Hinweis: Kein Ort ist angegeben; es gilt ") +
+                 siteText(*light, functions));
     return light;
 }
 
 void showOutOfRange(const RnNaturalLight& light) {
-    for (const std::string& note : outOfRange(light))
-        std::cerr << inLanguage("note: ", "Hinweis: ") << note << '\n';
+    for (const std::string& note : outOfRange(light)) complain(inLanguage("note: ", "Hinweis: ") + note);
 }
 
 }  // namespace OvTool

@@ -1,6 +1,5 @@
 #include <CLI/CLI.hpp>
 #include <cmath>
-#include <iostream>
 #include <memory>
 
 #include "ovphoto/classIds.h"
@@ -9,7 +8,7 @@
 #include "tools/ovphoto/lightFile.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
-#include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -73,12 +72,11 @@ int runMake(const MakeOptions& options, const HostSession& session) {
     const auto made = writeLight(*light, options, session, reasons);
     showReasons(options.out, reasons);
     if (!made) return exitFailed;
-    reportStreamFor(options.out) << options.out << ": " << options.kind << ", "
-                                 << shortNumber(light->getPeakIntensity()) << " cd, "
-                                 << shortNumber(light->getFlux()) << " lm\n";
+    sayOf(options.out, options.out + ": " + options.kind + ", " + shortNumber(light->getPeakIntensity()) +
+                           " cd, " + shortNumber(light->getFlux()) + " lm");
     const ConversionLoss loss = measureLoss(*light, *made->light);
     for (const std::string& warning : lossWarnings(loss, *options.target, *light, *made))
-        std::cerr << options.out << ": warning: " << warning << '\n';
+        complain(options.out + ": warning: " + warning);
     return exitWell;
 }
 

@@ -1,5 +1,4 @@
 #include <CLI/CLI.hpp>
-#include <iostream>
 #include <memory>
 
 #include "tools/ovphoto/commands/lightOptions.h"
@@ -8,6 +7,7 @@
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/table.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -108,7 +108,7 @@ int runShow(const SettingsOptions& options, const HostSession& session) {
     if (options.json) {
         printLine(recordJson(settings));
     } else {
-        std::cout << options.file << '\n';
+        say(options.file);
         printText(*light, settings, session.functions());
     }
     return exitWell;
@@ -121,7 +121,7 @@ int runWrite(const SettingsOptions& options, const HostSession& session) {
     const auto form = options.binary ? RnStream::Form::binary : RnStream::Form::text;
     const std::string error = writeFile(options.file, savedLight(*light, form));
     if (error.empty()) return exitWell;
-    std::cerr << options.file << ": " << error << '\n';
+    complain(options.file + ": " + error);
     return exitFailed;
 }
 

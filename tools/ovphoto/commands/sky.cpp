@@ -1,5 +1,4 @@
 #include <cmath>
-#include <iostream>
 #include <memory>
 #include <optional>
 
@@ -8,6 +7,7 @@
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -46,22 +46,21 @@ std::optional<Vector> parseNormal(std::string_view text) {
 void printLuminance(RnNaturalLight& light, const SkyOptions& options) {
     const float luminance = light.getSkyLuminanceAt(*options.zenith, *options.azimuth);
     if (options.json) return printLine(Json{{"luminance", luminance}});
-    std::cout << shortNumber(luminance) << inLanguage(" cd/m2 at zenith angle ", " cd/m2 im Winkel zum Zenit von ")
-              << degreesText(shortNumber(*options.zenith)) << inLanguage(", azimuth ", ", Azimut ")
-              << degreesText(shortNumber(*options.azimuth)) << '\n'
-              << azimuthSentence() << '\n';
+    say(shortNumber(luminance) + inLanguage(" cd/m2 at zenith angle ", " cd/m2 im Winkel zum Zenit von ") +
+        degreesText(shortNumber(*options.zenith)) + inLanguage(", azimuth ", ", Azimut ") +
+        degreesText(shortNumber(*options.azimuth)));
+    say(azimuthSentence());
 }
 
 void printIlluminance(RnNaturalLight& light, const SkyOptions& options) {
     const float illuminance = light.getSkyIlluminance(normalised(*options.normal).data());
     if (options.json) return printLine(Json{{"illuminance", illuminance}});
-    std::cout << shortNumber(illuminance)
-              << inLanguage(" lux from the sky on a surface that faces ",
-                            " Lux vom Himmel auf eine Fläche in Richtung ")
-              << shortNumber((*options.normal)[0]) << ", " << shortNumber((*options.normal)[1]) << ", "
-              << shortNumber((*options.normal)[2])
-              << inLanguage("\nScene: x east, y north, z up, before north is turned.\n",
-                            "\nSzene: x Osten, y Norden, z oben, bevor Norden gedreht ist.\n");
+    say(shortNumber(illuminance) +
+        inLanguage(" lux from the sky on a surface that faces ", " Lux vom Himmel auf eine Fläche in Richtung ") +
+        shortNumber((*options.normal)[0]) + ", " + shortNumber((*options.normal)[1]) + ", " +
+        shortNumber((*options.normal)[2]));
+    say(inLanguage("Scene: x east, y north, z up, before north is turned.",
+                   "Szene: x Osten, y Norden, z oben, bevor Norden gedreht ist."));
 }
 
 int runSky(const SkyOptions& options, const HostSession& session) {

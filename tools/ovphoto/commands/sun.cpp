@@ -1,5 +1,4 @@
 #include <CLI/CLI.hpp>
-#include <iostream>
 #include <memory>
 #include <numbers>
 
@@ -9,6 +8,7 @@
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/table.h"
+#include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
 
@@ -179,9 +179,9 @@ void printDayTable(RnNaturalLight& light, const NumberedFunctions& functions, bo
         table.add(std::move(row));
     }
     if (json) return;
-    std::cout << dateText(light, functions) << '\n';
+    say(dateText(light, functions));
     table.print();
-    std::cout << azimuthSentence() << '\n';
+    say(azimuthSentence());
 }
 
 /// A time as a cell of a table; "-" for a sun that neither rises nor sets.
@@ -214,11 +214,10 @@ void printYearTable(RnNaturalLight& light, const NumberedFunctions& functions, b
     }
     if (json) return;
     table.print();
-    std::cout << inLanguage("Clock times", "Uhrzeiten")
-              << (light.getDaylightSaving()
-                      ? inLanguage(" with daylight saving all year", " mit Sommerzeit das ganze Jahr")
-                      : "")
-              << ", " << utcText(functions, light.getTimeZoneHours()) << ".\n";
+    say(std::string(inLanguage("Clock times", "Uhrzeiten")) +
+        (light.getDaylightSaving() ? inLanguage(" with daylight saving all year", " mit Sommerzeit das ganze Jahr")
+                                   : "") +
+        ", " + utcText(functions, light.getTimeZoneHours()) + ".");
 }
 
 int runSun(const SunOptions& options, const HostSession& session) {

@@ -1,6 +1,6 @@
-#include <iostream>
 
 #include "tools/ovphoto/commands/pictureOptions.h"
+#include "tools/ovphoto/terminal.h"
 
 // In place of the pictures, in builds without Cairo.
 
@@ -9,7 +9,7 @@ namespace OvTool {
 namespace {
 
 int refuse() {
-    std::cerr << "ovphoto: this build has no pictures: it was made without Cairo\n";
+    complain("ovphoto: this build has no pictures: it was made without Cairo");
     return exitUsage;
 }
 

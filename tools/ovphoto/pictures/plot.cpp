@@ -1,6 +1,5 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
-#include <iostream>
 #include <numbers>
 
 #include "host/platform/path.h"
@@ -10,6 +9,7 @@
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/pictures/drawnFile.h"
 #include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/terminal.h"
 #include "tools/plot/picture.h"
 #include "tools/plot/skyDiagram.h"
 
@@ -64,7 +64,7 @@ int write(const PlotOptions& options, PictureFormat format, const std::string& t
                             options.dark ? OvPlot::darkPalette() : OvPlot::lightPalette(), title, draw);
     const std::string error = writeFile(options.out, bytes);
     if (error.empty()) return exitWell;
-    std::cerr << options.out << ": " << error << '\n';
+    complain(options.out + ": " + error);
     return exitFailed;
 }
 
@@ -142,7 +142,7 @@ int plotNaturalLight(const PlotOptions& options, PictureFormat format, const Hos
 int runPlot(const PlotOptions& options, const HostSession& session) {
     const auto format = formatOf(options);
     if (!format) {
-        std::cerr << options.out << ": does not end in .svg, .png or .pdf\n";
+        complain(options.out + ": does not end in .svg, .png or .pdf");
         return exitUsage;
     }
     const bool ofSky = options.kind == PictureKind::sky || options.kind == PictureKind::sunPath;

@@ -3,7 +3,6 @@
 #include <deque>
 #include <filesystem>
 #include <future>
-#include <iostream>
 #include <thread>
 
 #include "host/platform/path.h"
@@ -15,6 +14,7 @@
 #include "tools/ovphoto/report/html.h"
 #include "tools/ovphoto/report/page.h"
 #include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webTexts.h"
 
 namespace OvTool {
@@ -26,7 +26,7 @@ namespace {
 fs::path nativeOf(const std::string& path) { return Ov::nativePath(Ov::fromUtf8(path)); }
 
 int fail(const std::string& file, const std::string& error) {
-    std::cerr << file << ": " << error << '\n';
+    complain(file + ": " + error);
     return exitFailed;
 }
 
@@ -232,8 +232,8 @@ int reportMany(const ReportOptions& options, const HostSession& session) {
     const std::string error = writeFile(options.out, indexPage(maker.rows(), maker.files(), maker.refused()));
     if (!error.empty()) return fail(options.out, error);
     folder.keep();
-    std::cout << options.out << ": " << maker.files() << (maker.files() == 1 ? " file, " : " files, ")
-              << maker.refused() << " refused\n";
+    say(options.out + ": " + std::to_string(maker.files()) + (maker.files() == 1 ? " file, " : " files, ") +
+        std::to_string(maker.refused()) + " refused");
     return maker.refused() == 0 ? exitWell : exitFailed;
 }
 
@@ -242,14 +242,14 @@ int reportMany(const ReportOptions& options, const HostSession& session) {
 int runReport(const ReportOptions& options, const HostSession& session) {
     const bool toStream = isStandardStream(options.out);
     if (!toStream && CLI::detail::to_lower(nativeOf(options.out).extension().string()) != ".html") {
-        std::cerr << options.out << ": does not end in .html\n";
+        complain(options.out + ": does not end in .html");
         return exitUsage;
     }
     std::error_code error;
     const bool one = options.paths.size() == 1 && (isStandardStream(options.paths.front()) ||
                                                    !fs::is_directory(nativeOf(options.paths.front()), error));
     if (toStream && !one) {
-        std::cerr << "standard output takes the page of one file, not an index and its pages\n";
+        complain("standard output takes the page of one file, not an index and its pages");
         return exitUsage;
     }
     return (one ? reportOne : reportMany)(options, session);
