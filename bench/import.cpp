@@ -2,6 +2,7 @@
 
 #include "bench/bench.h"
 #include "host/componentManager/devices.h"
+#include "tests/support/plainDevice.h"
 
 // Import of files, everything included, beside a bare loop of std::from_chars over the same bytes.
 
@@ -27,12 +28,17 @@ const Input& input(std::int64_t which) {
     return inputs[static_cast<std::size_t>(which)];
 }
 
-void import(benchmark::State& state) {
+template <class Device>
+void importFrom(benchmark::State& state) {
     const Input& file = input(state.range(0));
-    const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(file.text);
+    const auto io = Ov::rnCreate<Device>(file.text);
     for (auto _ : state) benchmark::DoNotOptimize(bench::import(file.classId, *io)->getLumens());
     bench::countBytes(state, file.text.size());
 }
+
+void import(benchmark::State& state) { importFrom<Ov::RnMemoryBuffer>(state); }
+/// From a host's own device, which shows no bytes.
+void importPlain(benchmark::State& state) { importFrom<PlainDevice>(state); }
 
 void importFloor(benchmark::State& state) {
     const Input& file = input(state.range(0));
@@ -65,6 +71,7 @@ void importFieldsFloor(benchmark::State& state) {
 }
 
 BENCHMARK(import)->DenseRange(0, 4);
+BENCHMARK(importPlain)->DenseRange(1, 4);
 BENCHMARK(importFloor)->Arg(0)->Arg(1)->Arg(2)->Arg(4);
 BENCHMARK(importFieldsFloor)->Arg(3);
 
@@ -86,6 +93,13 @@ const bool listed = bench::addRatios({
      .ours = "import/4",
      .floor = "importFloor/4",
      .atLeast = 0.4},
+    {.what = "import IES without a window, rate over memory",
+     .ours = "importPlain/1",
+     .floor = "import/1",
+     .atLeast = 0.33},
+    {.what = "import CIBSE without a window", .ours = "importPlain/2", .floor = "import/2", .atLeast = 0.33},
+    {.what = "import NIMB without a window", .ours = "importPlain/3", .floor = "import/3", .atLeast = 0.33},
+    {.what = "import TBT without a window", .ours = "importPlain/4", .floor = "import/4", .atLeast = 0.33},
 });
 
 }  // namespace

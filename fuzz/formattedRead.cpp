@@ -8,8 +8,9 @@
 #include "host/componentManager/stream.h"
 #include "host/platform/path.h"
 #include "tests/support/dripDevice.h"
+#include "tests/support/plainDevice.h"
 
-// A format, a line feed, and the input that it reads: from memory, and from a device that shows a byte at a time.
+// A format, a line feed, and the input that it reads: from memory, and from devices that show a byte at a time or none.
 
 namespace OvPhotometrics::fuzz {
 
@@ -27,7 +28,7 @@ struct Outcome {
         fields.fill(std::vector<wchar_t>(size + 2, L'?'));  // a text may be as long as the input
         Ov::RnStream stream(device.get(), Ov::RnStream::Form::text);
         measured(size, [&] { count = read(stream, format, std::make_index_sequence<mostFields>()); });
-        for (int c = device->getChar(); c >= 0; c = device->getChar()) rest += static_cast<char>(c);
+        Ov::RnCharInput(*device).takeWhile([&](int c) { return rest += static_cast<char>(c), true; });
     }
     template <std::size_t... k>
     int read(Ov::RnStream& stream, const wchar_t* format, std::index_sequence<k...>) {
@@ -48,7 +49,8 @@ void tryInput(std::string_view bytes) {
     demand(whole.count >= -1 && whole.count <= fields, "no more is counted than asked for");
     demand(input.ends_with(whole.rest), "what is not read stays");
     const Outcome drip(Ov::rnCreate<DripDevice>(input), format.c_str(), input.size());
-    demand(whole == drip, "every device reads the same");
+    const Outcome plain(Ov::rnCreate<PlainDevice>(input), format.c_str(), input.size());
+    demand(whole == drip && whole == plain, "every device reads the same");
 }
 
 }  // namespace OvPhotometrics::fuzz

@@ -5,7 +5,7 @@
 namespace Ov {
 
 /// The character device behind a stream. One byte is one character, value for value (0 to 255), both ways; a
-/// character above 255 is written as "?".
+/// character above 255 is written as "?". A device that holds bytes ready may answer RnInputWindow, too.
 ///
 /// Errors: a device whose source fails raises RnStreamEx::ExReadError, one whose sink fails ExWriteError.
 class OVHOST_API RnBufferedIO : public RnCastable {
@@ -33,32 +33,6 @@ public:
     /// Moves to `offset` from the start (whence 0) or from the current position (whence 1) and returns the new
     /// position; -1 where that cannot be done. seek(0, 1) tells the position.
     virtual long seek(long offset, int whence) = 0;
-    /// Writes raw bytes; the number written.
-    virtual int writeBytes(const void* data, int count) = 0;
-    /// Line feeds between the start and the current position.
-    virtual int lineFeeds() = 0;
-
-    /// @{
-    /// The unread bytes that the device holds ready, possibly none. A reader may walk them directly and says with
-    /// `advanceTo` how far it came; what it does not find there it gets through `get`.
-    const char* next() const { return _next; }
-    const char* limit() const { return _limit; }
-    void advanceTo(const char* position) { _next = position; }
-    /// @}
-
-    /// As `get`, but the result is the character or -1, and a character that is ready costs no call.
-    int getChar() {
-        if (_next != _limit) return static_cast<unsigned char>(*_next++);
-        wchar_t c;
-        return get(c) < 1 ? -1 : static_cast<int>(c);
-    }
-
-protected:
-    /// @{
-    /// What `next` and `limit` give, kept by the device.
-    const char* _next = nullptr;
-    const char* _limit = nullptr;
-    /// @}
 };
 
 }  // namespace Ov

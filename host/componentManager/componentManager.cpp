@@ -58,6 +58,7 @@ ComponentManager::Modules::iterator ComponentManager::findModule(const wchar_t* 
 }
 
 const Module& ComponentManager::loadModule(const wchar_t* path) {
+    if (!path) throw ExModule("no path of a module is given");
     const auto known = findModule(path);
     if (known != _modules.end()) return **known;
 
@@ -68,6 +69,7 @@ const Module& ComponentManager::loadModule(const wchar_t* path) {
 }
 
 void ComponentManager::unloadModule(const wchar_t* path) {
+    if (!path) return;
     const auto known = findModule(path);
     if (known == _modules.end()) return;
     removeRegistry((*known)->registry());

@@ -32,7 +32,7 @@ public:
     virtual RnRef<RnCastable> createObject(const RnUid& classId) = 0;
 
     /// Loads the module at `path`, calls its entry point and registers what it answers. Raises ExModule, and then
-    /// nothing is loaded. The module stays loaded until it is unloaded or the process ends; loading the same file
+    /// nothing is loaded, for a null path too. The module stays loaded until it is unloaded or the process ends; loading the same file
     /// again, by whatever path, gives the same module.
     virtual const Module& loadModule(const wchar_t* path) = 0;
     /// Takes the module's builders out of the register and unloads it; a module that is not loaded is ignored. No

@@ -36,8 +36,6 @@ void RnMemoryBuffer::append(const char* data, std::size_t count) {
 
 char* RnMemoryBuffer::makeRoom(std::size_t count) {
     const std::size_t here = position();
-    // What is overwritten must not have been counted.
-    if (here < _countedTo) lineFeeds();
     if (count > _bytes.size() - here) _bytes.resize(here + count);
     setPosition(here + count);
     return _bytes.data() + here;
@@ -62,13 +60,6 @@ int RnMemoryBuffer::writeChars(const wchar_t* text, int count) {
     return static_cast<int>(length);
 }
 
-int RnMemoryBuffer::writeBytes(const void* data, int count) {
-    const std::size_t length = sizeOf(count);
-    char* place = prepareWrite(length);
-    if (length > 0) std::memcpy(place, data, length);
-    return static_cast<int>(length);
-}
-
 void RnMemoryBuffer::skipSeparator(int count) {
     for (; count > 0 && fill(); --count) ++_next;
 }
@@ -86,8 +77,6 @@ void RnMemoryBuffer::unget(wchar_t c) {
     if (c == endOfInput) return;
     if (position() == 0) {
         _bytes.insert(_bytes.begin(), narrow(c));
-        _countedTo = 0;
-        _lineFeeds = 0;
         return setPosition(0);
     }
     --_next;
@@ -106,17 +95,6 @@ long RnMemoryBuffer::seek(long offset, int whence) {
     if (target > _bytes.size()) return -1;
     setPosition(target);
     return base + offset;
-}
-
-int RnMemoryBuffer::lineFeeds() {
-    const char* counted = _bytes.data() + _countedTo;
-    if (counted <= _next) {
-        _lineFeeds += static_cast<int>(std::count(counted, _next, '\n'));
-    } else {
-        _lineFeeds -= static_cast<int>(std::count(_next, counted, '\n'));
-    }
-    _countedTo = position();
-    return _lineFeeds;
 }
 
 RnInBuffer::RnInBuffer(std::istream* input) : _source(input) {}
@@ -142,15 +120,11 @@ bool RnInBuffer::readMore() {
     return count > 0;
 }
 
-int RnOutBuffer::writeBytes(const void* data, int count) {
-    const auto* bytes = static_cast<const char*>(data);
-    const std::size_t length = sizeOf(count);
-    if (!_sink->write(bytes, static_cast<std::streamsize>(length))) {
+void RnOutBuffer::write(const char* bytes, std::size_t count) {
+    if (!_sink->write(bytes, static_cast<std::streamsize>(count))) {
         throw RnStreamEx::ExWriteError(source, __LINE__, "output stream");
     }
-    _written += static_cast<long>(length);
-    _lineFeeds += static_cast<int>(std::count(bytes, bytes + length, '\n'));
-    return static_cast<int>(length);
+    _written += static_cast<long>(count);
 }
 
 int RnOutBuffer::writeChars(const wchar_t* text, int count) {
@@ -159,15 +133,14 @@ int RnOutBuffer::writeChars(const wchar_t* text, int count) {
     for (std::size_t done = 0; done < length;) {
         const std::size_t part = std::min(length - done, sizeof block);
         std::transform(text + done, text + done + part, block, narrow);
-        writeBytes(block, static_cast<int>(part));
+        write(block, part);
         done += part;
     }
     return static_cast<int>(length);
 }
 
-void RnOutBuffer::endLine() { writeBytes("\n", 1); }
-void RnOutBuffer::writeSeparator() { writeBytes(" ", 1); }
-int RnOutBuffer::lineFeeds() { return _lineFeeds; }
+void RnOutBuffer::endLine() { write("\n", 1); }
+void RnOutBuffer::writeSeparator() { write(" ", 1); }
 
 long RnOutBuffer::seek(long offset, int whence) {
     const bool stays = whence == 1 ? offset == 0 : whence == 0 && offset == _written;

@@ -6,13 +6,14 @@
 
 #include "host/componentManager/bufferedIO.h"
 #include "host/componentManager/castImpl.h"
+#include "host/componentManager/inputWindow.h"
 
 namespace Ov {
 
 // Devices are counted objects: make them with rnCreate.
 
 /// Device over bytes in memory: reads and writes at one position, and grows as it is written.
-class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
+class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl2<RnBufferedIO, RnInputWindow, RnBufferedIO>> {
 public:
     /// @{
     /// Empty, or holding a copy of `bytes`, at the first of them.
@@ -31,8 +32,6 @@ public:
     int get(wchar_t& c) override;
     void unget(wchar_t c) override;
     long seek(long offset, int whence) override;
-    int writeBytes(const void* data, int count) override;
-    int lineFeeds() override;
 
     /// All that is held, wherever the position is.
     const std::string& bytes() const { return _bytes; }
@@ -52,9 +51,6 @@ private:
     bool fill() { return _next != _limit || readMore(); }
 
     std::string _bytes;
-    // The line feeds before a position of an earlier call, from where the next one counts on.
-    std::size_t _countedTo = 0;
-    int _lineFeeds = 0;
 };
 
 /// Input device over a standard stream, which must outlive it. It reads ahead in blocks, and keeps what it has
@@ -86,13 +82,12 @@ public:
     int get(wchar_t& c) override;
     void unget(wchar_t c) override;
     long seek(long offset, int whence) override;
-    int writeBytes(const void* data, int count) override;
-    int lineFeeds() override;
 
 private:
+    void write(const char* bytes, std::size_t count);
+
     std::ostream* _sink;
     long _written = 0;
-    int _lineFeeds = 0;
 };
 
 }  // namespace Ov

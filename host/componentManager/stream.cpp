@@ -1,5 +1,6 @@
 #include "host/componentManager/stream.h"
 
+#include <algorithm>
 #include <limits>
 #include <new>
 #include <utility>
@@ -13,8 +14,30 @@ namespace {
 
 constexpr const char* source = "host/componentManager/stream";
 constexpr std::int32_t lastColumn = 70;
+constexpr int deepest = 256;  // objects in one another, which take a part of the program's stack each
 
-/// The interface `*iid` of a loaded object, or the object itself.
+RnBufferedIO& given(RnPtr<RnBufferedIO> device) {
+    if (!device) RnCastable::throwBadCast();
+    return *device;
+}
+
+/// One object more that stands in others, as long as it lives. Raises `Failure` where it is one too many.
+template <class Failure>
+class Nesting {
+public:
+    explicit Nesting(int& depth) : _depth(depth) {
+        if (_depth == deepest) throw Failure(source, __LINE__, "object stream: too many objects in one another");
+        ++_depth;
+    }
+    Nesting(const Nesting&) = delete;
+    Nesting& operator=(const Nesting&) = delete;
+    ~Nesting() { --_depth; }
+
+private:
+    int& _depth;
+};
+
+/// The interface `*iid` of an object, or the object itself.
 RnRef<RnCastable> answering(const RnRef<RnCastable>& object, const RnUid* iid) {
     if (!iid) return object;
     RnCastable* found = object->getInterface(*iid);
@@ -26,15 +49,26 @@ RnRef<RnCastable> answering(const RnRef<RnCastable>& object, const RnUid* iid) {
 }  // namespace
 
 RnStream::RnStream(RnPtr<RnBufferedIO> device, Form form, RnPostLoadList* postLoad)
-    : _device(RnRef<RnBufferedIO>::share(device.get())), _form(form), _postLoad(postLoad) {
-    if (!_device) RnCastable::throwBadCast();
-}
+    : _input(given(device)), _form(form), _postLoad(postLoad) {}
 
 RnStream::~RnStream() = default;
 
 bool RnStream::isTextStream() const { return _form == Form::text; }
 bool RnStream::isBinaryStream() const { return _form == Form::binary; }
-int RnStream::computeLineNb() { return _device->lineFeeds() + 1; }
+
+int RnStream::computeLineNb() {
+    const long here = device().seek(0, 1);
+    if (here < 0 || device().seek(0, 0) != 0) return 1;
+    std::ptrdiff_t line = 1;
+    char block[4096];
+    int part = 1;
+    for (long left = here; left > 0 && part > 0; left -= part) {
+        part = rnReadBytes(device(), block, static_cast<int>(std::min<long>(left, sizeof block)));
+        line += std::count(block, block + part, '\n');
+    }
+    device().seek(here, 0);
+    return static_cast<int>(line);
+}
 
 void RnStream::postLoad(RnPersistant* object) {
     if (_postLoad) {
@@ -53,7 +87,7 @@ void RnStream::transfer(RnPostLoadList& list) {
 }
 
 void RnStream::endLine() {
-    _device->endLine();
+    device().endLine();
     column = 0;
     pendingSeparator = false;
 }
@@ -62,21 +96,31 @@ void RnStream::writeItem(const wchar_t* text, int count) {
     if (pendingSeparator && column > lastColumn) {
         endLine();
     } else if (pendingSeparator) {
-        _device->writeSeparator();
+        device().writeSeparator();
         ++column;
     }
     pendingSeparator = false;
-    column += _device->writeChars(text, count);
+    column += device().writeChars(text, count);
+}
+
+void RnStream::writeBytes(std::string_view bytes) {
+    _text.resize(bytes.size());
+    std::transform(bytes.begin(), bytes.end(), _text.begin(),
+                   [](char c) { return static_cast<wchar_t>(static_cast<unsigned char>(c)); });
+    const int count = std::in_range<int>(bytes.size()) ? static_cast<int>(bytes.size()) : -1;
+    if (count < 0 || device().writeChars(_text.data(), count) != count)
+        throw RnStreamEx::ExWriteError(source, __LINE__, "value stream");
 }
 
 void RnStream::skipPendingSeparator() {
     pendingSeparator = false;
-    _device->skipSeparator(1);
+    device().skipSeparator(1);
 }
 
 RnStream& RnStream::operator<<(const RnCastable* object) {
     if (!object) return *this << 0U << 0U << 0U << 0U;
     const auto adapter = rnCast<RnPersistant>(const_cast<RnCastable*>(object));
+    const Nesting<RnStreamEx::ExWriteError> nesting(_depth);
     const RnUid& id = adapter->getClassId();
     *this << id.w0 << id.w1 << id.w2 << id.w3 << adapter->getVersion();
     if (isBinaryStream()) {
@@ -94,12 +138,12 @@ RnStream& RnStream::operator<<(const RnCastable* object) {
 void RnStream::saveContent(RnPersistant& adapter) {
     const auto content = rnCreate<RnMemoryBuffer>();
     struct Redirection {
-        Redirection(RnStream& stream, RnRef<RnBufferedIO> device)
-            : _stream(stream), _outer(std::exchange(stream._device, std::move(device))) {
+        Redirection(RnStream& stream, RnBufferedIO& device)
+            : _stream(stream), _outer(std::exchange(stream._input, RnCharInput(device))) {
             reset();
         }
         ~Redirection() {
-            _stream._device = std::move(_outer);
+            _stream._input = std::move(_outer);
             reset();
         }
         void reset() {
@@ -107,19 +151,16 @@ void RnStream::saveContent(RnPersistant& adapter) {
             _stream.pendingSeparator = false;
         }
         RnStream& _stream;
-        RnRef<RnBufferedIO> _outer;
+        RnCharInput _outer;
     };
     {
-        const Redirection toMemory(*this, content);
+        const Redirection toMemory(*this, *content);
         adapter.save(*this);
     }
     const std::string& bytes = content->bytes();
     if (!std::in_range<int>(bytes.size())) throw RnStreamEx::ExWriteError(source, __LINE__, "object stream");
     *this << static_cast<unsigned int>(bytes.size());
-    const int count = static_cast<int>(bytes.size());
-    if (_device->writeBytes(bytes.data(), count) != count) {
-        throw RnStreamEx::ExWriteError(source, __LINE__, "object stream");
-    }
+    writeBytes(bytes);
 }
 
 RnRef<RnCastable> RnStream::readObject(const RnUid* iid, const wchar_t* name, const wchar_t* basePath) {
@@ -133,6 +174,8 @@ RnRef<RnCastable> RnStream::readObject(const RnUid* iid, const wchar_t* name, co
     const auto object = builder->create();
     if (!object) throw std::bad_alloc();
     const auto adapter = rnCast<RnPersistant>(object.get());
+    answering(object, iid);  // an object that is not wanted is not loaded
+    const Nesting<RnStreamEx::ExReadError> nesting(_depth);
     if (version > adapter->getVersion()) throw RnStreamEx::ExReadError(source, __LINE__, "object stream");
     const bool loaded =
         isBinaryStream() ? loadContent(*adapter, name, basePath) : adapter->load(*this, 0, name, basePath);
@@ -146,13 +189,13 @@ RnRef<RnCastable> RnStream::readObject(const RnUid* iid, const wchar_t* name, co
 bool RnStream::loadContent(RnPersistant& adapter, const wchar_t* name, const wchar_t* basePath) {
     unsigned int length = 0;
     *this >> length;
-    const long start = _device->seek(0, 1);
+    const long start = device().seek(0, 1);
     pendingSeparator = false;
     const bool loaded = adapter.load(*this, 0, name, basePath);
     pendingSeparator = false;
     constexpr long limit = std::numeric_limits<long>::max();
     if (start < 0 || std::cmp_greater(length, limit - start) ||
-        _device->seek(start + static_cast<long>(length), 0) < 0) {
+        device().seek(start + static_cast<long>(length), 0) < 0) {
         throw RnStreamEx::ExReadError(source, __LINE__, "object stream");
     }
     return loaded;

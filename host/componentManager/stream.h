@@ -2,8 +2,9 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 
-#include "host/componentManager/bufferedIO.h"
+#include "host/componentManager/charInput.h"
 #include "host/componentManager/postLoadList.h"
 #include "host/componentManager/streamEx.h"
 
@@ -44,7 +45,8 @@ public:
     virtual void postLoad(RnPersistant* object);
     /// Hands the waiting objects of `list` on to this stream's own list.
     virtual void transfer(RnPostLoadList& list);
-    /// Line of the current position: line feeds consumed so far plus one.
+    /// Line of the current position: the line feeds from the start of the device to there, which are counted by
+    /// reading them again, plus one. 1 on a device that cannot go back.
     virtual int computeLineNb();
 
     // Four groups over fifteen types, in this order of types.
@@ -83,17 +85,19 @@ public:
     /// @}
 
     /// Writes a whole object: its class id and version, then what its persistence adapter saves. Null is written
-    /// as such. Raises ExBadCast for an object that cannot be saved. In text form what the adapter saves starts on
-    /// a fresh line; in binary form its length stands before it.
+    /// as such. Raises ExBadCast for an object that cannot be saved, and ExWriteError where more than 256 objects
+    /// stand in one another. In text form what the adapter saves starts on a fresh line; in binary form its length
+    /// stands before it.
     RnStream& operator<<(const RnCastable* object);
     /// Reads an object that the operator wrote: creates it by its class id, loads it with `name` and `basePath`,
     /// and gives it as the interface `*iid` (null: as it is). A null object, or one whose load answered false,
-    /// gives null; a class that nobody knows raises ExReadError, a missing interface ExBadCast.
+    /// gives null. A class that nobody knows and more than 256 objects in one another raise ExReadError, a missing
+    /// interface ExBadCast; none of the object has been loaded then.
     RnRef<RnCastable> readObject(const RnUid* iid, const wchar_t* name = nullptr,
                                  const wchar_t* basePath = nullptr);
 
     /// The device, without a new reference.
-    RnBufferedIO& device() const { return *_device; }
+    RnBufferedIO& device() const { return _input.device(); }
 
     /// @{
     /// Characters on the current output line, and whether the last item leaves a separator due. The text readers
@@ -102,23 +106,20 @@ public:
     bool pendingSeparator = false;
     /// @}
 
-    /// The next character, or -1 at the end of the input; a pending separator is skipped first.
-    int getChar() {
+    /// The characters of the device. A pending separator is skipped first.
+    RnCharInput& input() {
         if (pendingSeparator) skipPendingSeparator();
-        return _device->getChar();
+        return _input;
     }
-    /// The character that `getChar` would give, which stays.
-    int peekChar() {
-        if (pendingSeparator) skipPendingSeparator();
-        if (_device->next() != _device->limit()) return static_cast<unsigned char>(*_device->next());
-        const int c = _device->getChar();
-        ungetChar(c);
-        return c;
-    }
-    /// Pushes back what `getChar` gave; -1 changes nothing.
-    void ungetChar(int c) {
-        if (c >= 0) _device->unget(static_cast<wchar_t>(c));
-    }
+    /// @{
+    /// Its operations on single characters.
+    int getChar() { return input().getChar(); }
+    int peekChar() { return input().peekChar(); }
+    void ungetChar(int c) { _input.ungetChar(c); }
+    /// @}
+    /// Writes bytes as they are, a character each and all at once. Raises ExWriteError where the device does not take
+    /// all of them.
+    void writeBytes(std::string_view bytes);
     /// Ends the current output line.
     void endLine();
     /// Writes a run of characters that stands for one item of a list, after the separator that is due (a line
@@ -130,10 +131,11 @@ private:
     void saveContent(RnPersistant& adapter);
     bool loadContent(RnPersistant& adapter, const wchar_t* name, const wchar_t* basePath);
 
-    RnRef<RnBufferedIO> _device;
+    RnCharInput _input;
     Form _form;
     RnPostLoadList* _postLoad;
-    std::wstring _formatted;  // formattedWrite's output, kept for its memory
+    int _depth = 0;      // objects being read or written in one another
+    std::wstring _text;  // what goes to the device as characters, kept for its memory
 };
 
 }  // namespace Ov

@@ -73,12 +73,12 @@ void appendFormatted(std::wstring& out, const wchar_t* format, Arguments& argume
 }  // namespace
 
 int RnStream::formattedWrite(const wchar_t* format, ...) {
-    _formatted.clear();
+    _text.clear();
     Arguments arguments;
     va_start(arguments.list, format);
-    appendFormatted(_formatted, format, arguments);
+    appendFormatted(_text, format, arguments);
     va_end(arguments.list);
-    return _device->writeChars(_formatted.data(), static_cast<int>(_formatted.size()));
+    return device().writeChars(_text.data(), static_cast<int>(_text.size()));
 }
 
 }  // namespace Ov

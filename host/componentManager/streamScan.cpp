@@ -1,8 +1,10 @@
+#include <array>
 #include <bit>
 #include <charconv>
 #include <cmath>
 #include <limits>
 #include <string_view>
+#include <utility>
 
 #include "host/base/arguments.h"
 #include "host/base/textClass.h"
@@ -23,35 +25,53 @@ bool convertInteger(std::string_view token, int base, T& value) {
     return std::from_chars(token.data(), token.data() + token.size(), value, base).ec == std::errc{};
 }
 
-/// Converts a plain decimal of up to 15 digits; the position behind it, or null for anything else. The digits and
-/// the power of ten below them are exact doubles, so their quotient is the right double. Rounding that to float is
-/// right, too, unless it lies midway between two floats.
+/// A plain decimal, digit by digit. Up to 15 of them and the power of ten below them are exact doubles, so their
+/// quotient is the right double. Rounding that to float is right, too, unless it lies midway between two floats.
+class ShortDecimal {
+public:
+    void add(int digit) {
+        _digits = 10 * _digits + static_cast<std::uint64_t>(digit - '0');
+        ++_count;
+    }
+    /// From here on digits are decimals.
+    void point() { _whole = _count; }
+
+    /// False where there are too few or too many digits, or the float is not certain.
+    bool convert(bool isNegative, float& value) const {
+        static constexpr double powers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                            1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+        constexpr std::uint64_t belowFloat = (1U << 29) - 1;
+        constexpr std::uint64_t midway = 1U << 28;
+        if (_count == 0 || _count > 15) return false;
+        const double quotient = static_cast<double>(_digits) / powers[_whole < 0 ? 0 : _count - _whole];
+        if ((std::bit_cast<std::uint64_t>(quotient) & belowFloat) == midway) return false;
+        value = static_cast<float>(isNegative ? -quotient : quotient);
+        return true;
+    }
+    bool convert(bool isNegative, std::int32_t& value) const {
+        if (_count == 0 || _count > 9) return false;
+        value = static_cast<std::int32_t>(isNegative ? -_digits : _digits);
+        return true;
+    }
+
+private:
+    std::uint64_t _digits = 0;
+    int _count = 0;
+    int _whole = -1;  // digits before the point; none yet
+};
+
+/// Converts a plain decimal of up to 15 digits; the position behind it, or null for anything else.
 const char* convertShort(const char* text, const char* limit, float& value) {
-    static constexpr double powers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                                        1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
-    constexpr std::uint64_t belowFloat = (1U << 29) - 1;
-    constexpr std::uint64_t midway = 1U << 28;
     const bool isNegative = *text == '-';
     if (isNegative) ++text;
-    std::uint64_t digits = 0;
-    const auto takeDigits = [&] {
-        const char* start = text;
-        for (; text != limit && isDigit(*text); ++text)
-            digits = 10 * digits + static_cast<std::uint64_t>(*text - '0');
-        return text - start;
-    };
-    std::ptrdiff_t count = takeDigits();
-    std::ptrdiff_t decimals = 0;
+    ShortDecimal decimal;
+    for (; text != limit && isDigit(*text); ++text) decimal.add(*text);
     if (text != limit && *text == '.') {
-        ++text;
-        decimals = takeDigits();
-        count += decimals;
+        decimal.point();
+        for (++text; text != limit && isDigit(*text); ++text) decimal.add(*text);
     }
-    if (count == 0 || count > 15 || text == limit || *text == 'e' || *text == 'E') return nullptr;
-    const double quotient = static_cast<double>(digits) / powers[decimals];
-    if ((std::bit_cast<std::uint64_t>(quotient) & belowFloat) == midway) return nullptr;
-    value = static_cast<float>(isNegative ? -quotient : quotient);
-    return text;
+    if (text == limit || *text == 'e' || *text == 'E') return nullptr;
+    return decimal.convert(isNegative, value) ? text : nullptr;
 }
 
 /// Converts the number that starts at `text`; the position behind it, or null when it is not plain or not known to
@@ -72,9 +92,9 @@ const char* convertPlain(const char* text, const char* limit, std::int32_t& valu
 /// Reads a number where the window holds white space, the number and what follows it. False, with nothing consumed
 /// or changed, in every other case.
 template <class T>
-bool readInWindow(RnBufferedIO& device, T& value) {
-    const char* start = device.next();
-    const char* const limit = device.limit();
+bool readInWindow(RnCharInput& input, T& value) {
+    const char* start = input.next();
+    const char* const limit = input.limit();
     while (start != limit && isWhiteSpace(*start)) ++start;
     const char* digits = start != limit && *start == '-' ? start + 1 : start;
     if (digits == limit || !(isDigit(*digits) || *digits == '.')) return false;
@@ -82,21 +102,65 @@ bool readInWindow(RnBufferedIO& device, T& value) {
     const char* stop = convertPlain(start, limit, result);
     if (!stop) return false;
     value = result;
-    device.advanceTo(stop);
+    input.advanceTo(stop);
     return true;
 }
 
 // Input and format.
 
+/// The start of a number, up to where it may end, that has been taken from the input.
+struct NumberStart {
+    static constexpr int longest = 40;
+
+    std::array<char, longest> text;
+    std::size_t length = 0;
+    int ahead;  // the character behind it, taken, too; -1 at the end of the input
+    ShortDecimal decimal;
+
+    /// Takes white space, "-", digits and, for `hasFraction`, a point and more digits.
+    NumberStart(RnCharInput& input, bool hasFraction) {
+        ShortDecimal number;  // local, as all that changes with every character
+        char* end = text.data();
+        const char* const limit = end + longest;
+        int c = input.getChar();
+        const auto take = [&] {
+            *end++ = static_cast<char>(c);
+            c = input.getChar();
+        };
+        const auto takeDigits = [&] {
+            for (; isDigit(c) && end != limit; take()) number.add(c);
+        };
+        while (isWhiteSpace(c)) c = input.getChar();
+        if (c == '-') take();
+        takeDigits();
+        if (hasFraction && c == '.' && end != limit) {
+            number.point();
+            take();
+            takeDigits();
+        }
+        length = static_cast<std::size_t>(end - text.data());
+        ahead = c;
+        decimal = number;
+    }
+    /// Converts all of it; false where it goes on, or does not convert simply.
+    template <class T>
+    bool convert(T& value) const {
+        return length > 0 && ahead != 'e' && ahead != 'E' && decimal.convert(text[0] == '-', value);
+    }
+};
+
 /// The input of one call, with a look-ahead of one character. Inside a field no more than its width is seen.
 class Input {
 public:
-    explicit Input(RnBufferedIO& device) : _device(device) {}
+    explicit Input(RnCharInput& chars) : _chars(chars) {}
+    /// Goes on with what has been taken, all of which the field takes again.
+    Input(RnCharInput& chars, const NumberStart& start)
+        : _chars(chars), _start(start.text.data(), start.length), _behindStart(start.ahead) {}
 
     /// The next character, or -1 at the end of the input or of the field.
     int peek() {
         if (_left == 0) return -1;
-        if (_ahead == unread) _ahead = _device.getChar();
+        if (_ahead == unread) _ahead = fetch();
         return _ahead;
     }
     void take() {
@@ -119,7 +183,7 @@ public:
     void setField(int width) { _left = width; }
     void endField() { _left = std::numeric_limits<int>::max(); }
     void pushBack() {
-        if (_ahead >= 0) _device.unget(static_cast<wchar_t>(_ahead));
+        if (_ahead != unread) _chars.ungetChar(_ahead);
         _ahead = unread;
     }
     int consumed() const { return _consumed; }
@@ -127,7 +191,16 @@ public:
 private:
     static constexpr int unread = -2;
 
-    RnBufferedIO& _device;
+    int fetch() {
+        if (_start.empty()) return _behindStart == unread ? _chars.getChar() : std::exchange(_behindStart, unread);
+        const int c = _start.front();
+        _start.remove_prefix(1);
+        return c;
+    }
+
+    RnCharInput& _chars;
+    std::string_view _start;
+    int _behindStart = unread;
     int _ahead = unread;
     int _left = std::numeric_limits<int>::max();
     int _consumed = 0;
@@ -250,7 +323,7 @@ int baseOf(wchar_t letter) {
 /// Reads one format.
 class Scanner {
 public:
-    Scanner(RnBufferedIO& device, Arguments& arguments) : _input(device), _arguments(arguments) {}
+    Scanner(Input input, Arguments& arguments) : _input(input), _arguments(arguments) {}
 
     int scan(const wchar_t* format) {
         Outcome outcome = Outcome::goOn;
@@ -386,30 +459,46 @@ Scanner::Outcome Scanner::readText(const Directive& directive, bool terminates, 
 }
 
 /// Reads "%f" or "%d" alone, with which files of numbers are read, where the window holds all of the number.
-bool readSingle(RnBufferedIO& device, wchar_t letter, void* target) {
-    if (letter == L'f') return readInWindow(device, *static_cast<float*>(target));
-    return letter == L'd' && readInWindow(device, *static_cast<std::int32_t*>(target));
+bool readSingle(RnCharInput& input, wchar_t letter, void* target) {
+    if (letter == L'f') return readInWindow(input, *static_cast<float*>(target));
+    return letter == L'd' && readInWindow(input, *static_cast<std::int32_t*>(target));
 }
 
-/// Not inlined: its frame would cost the short way as much as a number.
-__attribute__((noinline)) int scanAny(RnBufferedIO& device, const wchar_t* format, Arguments& arguments) {
-    return Scanner(device, arguments).scan(format);
+// Not inlined: their frames would cost the short way as much as a number.
+
+__attribute__((noinline)) int scanAny(const Input& input, const wchar_t* format, Arguments& arguments) {
+    return Scanner(input, arguments).scan(format);
+}
+
+/// Reads the same from any device, character by character.
+__attribute__((noinline)) int scanSingle(RnCharInput& input, const wchar_t* format, Arguments& arguments,
+                                         void* target) {
+    const bool isFloat = format[1] == L'f';
+    const NumberStart start(input, isFloat);
+    if (isFloat ? start.convert(*static_cast<float*>(target))
+                : start.convert(*static_cast<std::int32_t*>(target))) {
+        input.ungetChar(start.ahead);
+        return 1;
+    }
+    return scanAny(Input(input, start), format, arguments);
 }
 
 }  // namespace
 
 int RnStream::formattedRead(const wchar_t* format, ...) {
-    if (pendingSeparator) skipPendingSeparator();
+    RnCharInput& chars = input();
+    void* single = nullptr;
     if (format[0] == L'%' && (format[1] == L'f' || format[1] == L'd') && format[2] == 0) {
-        std::va_list single;
-        va_start(single, format);
-        void* const target = va_arg(single, void*);
-        va_end(single);
-        if (readSingle(*_device, format[1], target)) return 1;
+        std::va_list argument;
+        va_start(argument, format);
+        single = va_arg(argument, void*);
+        va_end(argument);
+        if (readSingle(chars, format[1], single)) return 1;
     }
     Arguments arguments;
     va_start(arguments.list, format);
-    const int count = scanAny(*_device, format, arguments);
+    const int count =
+        single ? scanSingle(chars, format, arguments, single) : scanAny(Input(chars), format, arguments);
     va_end(arguments.list);
     return count;
 }

@@ -58,28 +58,18 @@ bool convert(From from, To& to) {
 // Binary form.
 
 void readRaw(RnStream& stream, void* data, int count) {
-    auto* bytes = static_cast<char*>(data);
-    while (count > 0) {
-        const int part = stream.device().readBytes(bytes, count);
-        if (part <= 0) failRead(__LINE__);
-        bytes += part;
-        count -= part;
-    }
-}
-
-void writeRaw(RnStream& stream, const void* data, int count) {
-    if (stream.device().writeBytes(data, count) != count) failWrite(__LINE__);
+    if (rnReadBytes(stream.device(), data, count) < count) failRead(__LINE__);
 }
 
 template <class B>
 void writeLittle(RnStream& stream, B value) {
-    std::array<unsigned char, sizeof(B)> bytes;
+    std::array<char, sizeof(B)> bytes;
     auto bits = static_cast<std::uint64_t>(std::bit_cast<Bits<sizeof(B)>>(value));
-    for (unsigned char& byte : bytes) {
-        byte = static_cast<unsigned char>(bits);
+    for (char& byte : bytes) {
+        byte = static_cast<char>(bits);
         bits >>= 8;
     }
-    writeRaw(stream, bytes.data(), static_cast<int>(bytes.size()));
+    stream.writeBytes({bytes.data(), bytes.size()});
 }
 
 template <class B>
@@ -165,7 +155,7 @@ void writeBinaryText(RnStream& stream, const std::wstring& value) {
     });
     if (!std::in_range<int>(bytes.size())) failWrite(__LINE__);
     writeLittle(stream, static_cast<std::uint32_t>(bytes.size() / 2));
-    writeRaw(stream, bytes.data(), static_cast<int>(bytes.size()));
+    stream.writeBytes(bytes);
 }
 
 /// Reads block by block: the length is taken for true only as far as units arrive.

@@ -201,6 +201,8 @@ TEST_F(ComponentManager, NamesWhatCannotBeOpenedOrLoaded) {
                 AllOf(HasSubstr("\u00E9.so: "), Not(HasSubstr("no such file"))));
     EXPECT_THAT(failureOf<ExModule>([&] { manager->loadModule(host.c_str()); }),
                 HasSubstr("RnGetComponentDescription"));
+    EXPECT_THROW(manager->loadModule(nullptr), ExModule);
+    manager->unloadModule(nullptr);
     EXPECT_EQ(manager->builders().size(), 5U);
 }
 

@@ -45,6 +45,7 @@ void expectRows(const wchar_t* format, std::initializer_list<const char*> rows) 
             const std::string expected = outcome(!row3[1].empty(), value, row3[2] + more);
             EXPECT_EQ(readFrom<T>(rnCreate<RnMemoryBuffer>(input), format), expected) << row;
             EXPECT_EQ(readFrom<T>(rnCreate<DripDevice>(input), format), expected) << row;
+            EXPECT_EQ(readFrom<T>(rnCreate<PlainDevice>(input), format), expected) << row;
         }
     }
 }
@@ -77,7 +78,7 @@ void expectAsTheLibraryReads(const std::string& text) {
     const float single = std::strtof(text.c_str(), nullptr);
     const auto expected = std::isfinite(single) ? outcome(1, single, " .") : outcome(0, 77, " .");
     EXPECT_EQ(readFrom<float>(rnCreate<RnMemoryBuffer>(text + " ."), L"%f"), expected) << text;
-    EXPECT_EQ(readFrom<float>(rnCreate<DripDevice>(text + " ."), L"%f"), expected) << text;
+    EXPECT_EQ(readFrom<float>(rnCreate<PlainDevice>(text + " ."), L"%f"), expected) << text;
     EXPECT_EQ(readFrom<double>(rnCreate<RnMemoryBuffer>(text + " ."), L"%lf"),
               outcome(1, std::strtod(text.c_str(), nullptr), " ."));
 }
@@ -111,8 +112,9 @@ TEST(FormattedRead, Texts) {
           "%*s %s|one two|1|two|", "%*2d%s|12345|1|345|", "In: %s\n|In:Out \n\n x|1|Out|x",
           "  50%% %s|50 \t% y|1|y|", "In: %s|Im: y|0|?|m: y", "In: %s|In|-1|?|"}) {
         const auto c = cells(row);
-        const RnRef<RnBufferedIO> whole = rnCreate<RnMemoryBuffer>(c[1]), drip = rnCreate<DripDevice>(c[1]);
-        for (const auto& device : {whole, drip}) {
+        for (const RnRef<RnBufferedIO>& device :
+             {RnRef<RnBufferedIO>(rnCreate<RnMemoryBuffer>(c[1])), RnRef<RnBufferedIO>(rnCreate<DripDevice>(c[1])),
+              RnRef<RnBufferedIO>(rnCreate<PlainDevice>(c[1]))}) {
             wchar_t text[90] = L"?";
             RnStream stream(device.get(), RnStream::Form::binary);
             const std::string count = std::to_string(stream.formattedRead(fromUtf8(c[0]).c_str(), text));

@@ -10,6 +10,7 @@
 #include "host/componentManager/stream.h"
 #include "host/platform/path.h"
 #include "support/dripDevice.h"
+#include "support/plainDevice.h"
 
 // Made-up objects, builders and a device for the tests of the host, and how their tables are written.
 
@@ -22,9 +23,11 @@ inline std::vector<std::string> cells(const std::string& row) {
     return all;
 }
 
+inline int readChar(RnBufferedIO& device) { return RnCharInput(device).getChar(); }
+
 inline std::string readRest(RnBufferedIO& device) {
     std::string rest;
-    for (int c = device.getChar(); c >= 0; c = device.getChar()) rest += static_cast<char>(c);
+    for (int c = readChar(device); c >= 0; c = readChar(device)) rest += static_cast<char>(c);
     return rest;
 }
 

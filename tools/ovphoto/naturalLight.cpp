@@ -19,9 +19,9 @@ namespace {
 /// The first bytes of the input: in the binary form, version and release.
 std::string peek(RnBufferedIO& io) {
     char bytes[4];
-    const int count = io.readBytes(bytes, sizeof bytes);
+    const int count = rnReadBytes(io, bytes, sizeof bytes);
     io.seek(0, 0);
-    return std::string(bytes, static_cast<std::size_t>(std::max(count, 0)));
+    return std::string(bytes, static_cast<std::size_t>(count));
 }
 
 /// The saved forms, told by content: version and release are small numbers of two bytes, so that NUL is among

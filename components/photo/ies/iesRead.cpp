@@ -154,11 +154,12 @@ bool iesReadRecord(IesFileRecord& rec, Ov::RnStream& in, const wchar_t* basePath
 bool iesCanRead(Ov::RnBufferedIO& io) {
     if (matchesAt(io, L"IESNA91")) return true;
     const long start = io.seek(0, 1);
+    Ov::RnCharInput in(io);
     bool found = false;
     for (int c = 0; c >= 0 && !found;) {
         found = matchesAt(io, tiltKey.data());
-        do c = io.getChar();
-        while (c >= 0 && c != '\n');
+        in.takeWhile([](int character) { return character != '\n'; });
+        c = in.getChar();
     }
     io.seek(start, 0);
     return found;

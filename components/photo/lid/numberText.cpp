@@ -31,7 +31,8 @@ bool readTextLine(Ov::RnStream& in, const wchar_t* format, std::wstring& line) {
 
 bool matchesAt(Ov::RnBufferedIO& io, const wchar_t* text) {
     const long start = io.seek(0, 1);
-    while (*text && io.getChar() == static_cast<int>(*text)) ++text;
+    Ov::RnCharInput in(io);
+    while (*text && in.getChar() == static_cast<int>(*text)) ++text;
     io.seek(start, 0);
     return *text == 0;
 }
@@ -46,14 +47,7 @@ bool NumberText::fail(unsigned id, Arguments... arguments) {
 
 /// Goes to the start of the next number. Without one that is reported, and `instead` is what the number gives.
 bool NumberText::findNumber(unsigned unexpected, std::int32_t& instead) {
-    Ov::RnBufferedIO& device = _in.device();
-    int c = _in.peekChar();
-    while (isBetween(c)) {
-        const char* p = device.next();
-        while (p != device.limit() && isBetween(*p)) ++p;
-        device.advanceTo(p);
-        c = _in.peekChar();
-    }
+    const int c = _in.input().takeWhile(isBetween);
     if (startsNumber(c)) return true;
     instead = 0;
     if (c >= 0) {
@@ -107,16 +101,19 @@ bool NumberText::readFloat(float& value) {
 
 bool NumberText::readFloats(std::size_t count, std::vector<float>& values) {
     // The next values are no more than every second byte that is at hand.
-    const Ov::RnBufferedIO& device = _in.device();
+    const Ov::RnCharInput& ready = _in.input();
     values.clear();
-    values.reserve(std::min(count, static_cast<std::size_t>(device.limit() - device.next()) / 2 + 1));
+    values.reserve(std::min(count, static_cast<std::size_t>(ready.limit() - ready.next()) / 2 + 1));
     for (std::size_t i = 0; i < count && !_ended; ++i) readFloat(values.emplace_back());
     return !_failed;
 }
 
 void writeText(std::string_view bytes, Ov::RnStream& out) {
-    const int count = std::in_range<int>(bytes.size()) ? static_cast<int>(bytes.size()) : -1;
-    if (count < 0 || out.device().writeBytes(bytes.data(), count) != count)
+    std::wstring text(bytes.size(), L'\0');
+    std::transform(bytes.begin(), bytes.end(), text.begin(),
+                   [](char c) { return static_cast<wchar_t>(static_cast<unsigned char>(c)); });
+    const int count = std::in_range<int>(text.size()) ? static_cast<int>(text.size()) : -1;
+    if (count < 0 || out.device().writeChars(text.data(), count) != count)
         throw Ov::RnStreamEx::ExWriteError("components/photo/lid/numberText", __LINE__, "file");
     out.column = 0;
     out.pendingSeparator = false;

@@ -70,7 +70,7 @@ void writeLine(Ov::RnStream& out, const wchar_t* format, Args... args) {
 }
 
 /// Writes a text that ends its last line, all of it at once. Raises RnStreamEx::ExWriteError where the device does
-/// not take it.
+/// not take it; throws std::bad_alloc before.
 void writeText(std::string_view bytes, Ov::RnStream& out);
 
 /// Writes values with two decimals, each behind a blank, as lines of less than `limit` characters.

@@ -109,13 +109,7 @@ Settings BinaryForm::settings(int release) const {
 /// of the input from other failures.
 std::string nextBytes(RnStream& in, int count) {
     std::string bytes(static_cast<std::size_t>(count), '\0');
-    int taken = 0;
-    while (taken < count) {
-        const int part = in.device().readBytes(bytes.data() + taken, count - taken);
-        if (part <= 0) break;
-        taken += part;
-    }
-    bytes.resize(static_cast<std::size_t>(taken));
+    bytes.resize(static_cast<std::size_t>(Ov::rnReadBytes(in.device(), bytes.data(), count)));
     return bytes;
 }
 

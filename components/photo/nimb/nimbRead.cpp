@@ -129,29 +129,25 @@ bool readValues(NimbRecord& rec, Lines& lines) {
 bool nimbCanRead(Ov::RnBufferedIO& io) {
     const long start = io.seek(0, 1);
     char bytes[nimbLineLength];
-    const bool enough = io.readBytes(bytes, sizeof bytes) == static_cast<int>(sizeof bytes);
+    const bool enough = Ov::rnReadBytes(io, bytes, sizeof bytes) == static_cast<int>(sizeof bytes);
     io.seek(start, 0);
     return enough && std::memcmp(bytes + magicPlace, "NIMB", 4) == 0;
 }
 
 int nimbReadLine(wchar_t* buffer73, Ov::RnStream& s) {
-    int c = s.getChar();
-    if (c < 0) return -1;
     int length = 0;
-    const auto ends = [](int character) { return character < 0 || character == '\n' || character == '\r'; };
-    Ov::RnBufferedIO& device = s.device();
-    while (!ends(c)) {
-        if (length < nimbLineLength) buffer73[length++] = static_cast<wchar_t>(c);
-        // What the device holds ready of the line.
-        const char* p = device.next();
-        for (; p != device.limit() && length < nimbLineLength && *p != '\n' && *p != '\r'; ++p)
-            buffer73[length++] = static_cast<unsigned char>(*p);
-        device.advanceTo(p);
-        c = s.getChar();
-    }
-    if (c == '\r') {
-        const int after = s.getChar();
-        if (after != '\n') s.ungetChar(after);
+    bool isThere = false;
+    Ov::RnCharInput& in = s.input();
+    in.takeWhile([&](int c) {
+        isThere = true;
+        const bool ends = c == '\n' || c == '\r';
+        if (!ends && length < nimbLineLength) buffer73[length++] = static_cast<wchar_t>(c);
+        return !ends;
+    });
+    if (!isThere) return -1;
+    if (in.getChar() == '\r') {
+        const int after = in.getChar();
+        if (after != '\n') in.ungetChar(after);
     }
     buffer73[length] = 0;
     return length;

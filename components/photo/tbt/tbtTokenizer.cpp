@@ -27,10 +27,9 @@ std::wstring TbtTokenizer::readTitle() {
 }
 
 TbtToken TbtTokenizer::next() {
-    skipBlank();
+    const int c = skipBlank();
     _text.clear();
     _tooLong = false;
-    const int c = _in.peekChar();
     _kind = c < 0 ? TbtToken::endOfFile : Ov::isDigit(c) || c == '.' ? takeNumber() : takeMark();
     return _kind;
 }
@@ -69,8 +68,9 @@ int TbtTokenizer::take() {
     return c;
 }
 
-void TbtTokenizer::takeToken() {
-    const int c = take();
+void TbtTokenizer::takeToken() { add(take()); }
+
+void TbtTokenizer::add(int c) {
     _tooLong = _text.size() == longestToken;
     if (!_tooLong) _text.push_back(static_cast<char>(c));
 }
@@ -81,34 +81,38 @@ bool TbtTokenizer::takeIf(char c) {
     return true;
 }
 
-void TbtTokenizer::takeDigits() {
-    while (Ov::isDigit(_in.peekChar())) takeToken();
-}
-
 /// Takes a number without an exponent at once where the device holds it and what follows ready. False, and nothing
 /// is consumed, where it does not.
 bool TbtTokenizer::takeReadyNumber() {
-    Ov::RnBufferedIO& device = _in.device();
-    const char* const limit = device.limit();
-    const char* end = device.next();
+    Ov::RnCharInput& in = _in.input();
+    const char* const limit = in.limit();
+    const char* end = in.next();
     while (end != limit && Ov::isDigit(*end)) ++end;
     if (end != limit && *end == '.') ++end;
     while (end != limit && Ov::isDigit(*end)) ++end;
-    const auto length = static_cast<std::size_t>(end - device.next());
+    const auto length = static_cast<std::size_t>(end - in.next());
     if (end == limit || *end == 'e' || *end == 'E' || length > longestToken) return false;
-    _text.assign(device.next(), length);
-    device.advanceTo(end);
+    _text.assign(in.next(), length);
+    in.advanceTo(end);
     return true;
 }
 
 TbtToken TbtTokenizer::takeNumber() {
     if (takeReadyNumber()) return TbtToken::number;
-    takeDigits();
-    if (takeIf('.')) takeDigits();
-    if (takeIf('e') || takeIf('E')) {
-        if (!takeIf('+')) takeIf('-');
-        takeDigits();
-    }
+    enum { digits, fraction, sign, exponent } part = digits;
+    _in.input().takeWhile([&](int c) {
+        if (c == '.' && part == digits) {
+            part = fraction;
+        } else if ((c == 'e' || c == 'E') && part <= fraction) {
+            part = sign;
+        } else if (part == sign && (c == '+' || c == '-' || Ov::isDigit(c))) {
+            part = exponent;
+        } else if (!Ov::isDigit(c)) {
+            return false;
+        }
+        add(c);
+        return true;
+    });
     return _tooLong ? TbtToken::other : TbtToken::number;
 }
 
@@ -120,9 +124,16 @@ TbtToken TbtTokenizer::takeMark() {
     return TbtToken::other;
 }
 
-void TbtTokenizer::skipBlank() {
-    for (int c = _in.peekChar(); c == '/' ? skipComment() : Ov::isWhiteSpace(c); c = _in.peekChar())
-        if (c != '/') take();
+/// Skips white space and comments; the character that is ahead.
+int TbtTokenizer::skipBlank() {
+    const auto takeWhiteSpace = [&](int c) {
+        if (c == '\n') ++_lineFeeds;
+        return Ov::isWhiteSpace(c);
+    };
+    for (;;) {
+        const int c = _in.input().takeWhile(takeWhiteSpace);
+        if (c != '/' || !skipComment()) return c;
+    }
 }
 
 /// Skips the comment that starts with the slash ahead; false, and nothing is consumed, when none does.

@@ -42,12 +42,12 @@ public:
 private:
     int take();
     void takeToken();
+    void add(int c);
     bool takeIf(char c);
-    void takeDigits();
     bool takeReadyNumber();
     TbtToken takeNumber();
     TbtToken takeMark();
-    void skipBlank();
+    int skipBlank();
     bool skipComment();
 
     Ov::RnStream& _in;

@@ -294,6 +294,21 @@ TEST_F(Distributions, WhatCannotBeAnsweredIsRefused) {
     }
 }
 
+TEST_F(Distributions, OnlyAWebIsLoadedAsTheWebOfOne) {
+    for (const Form form : {Form::text, Form::binary}) {
+        const auto device = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(device.get(), form);
+        for (int level = 0; level < 40000; ++level) {
+            stream << Web::classId.w0 << Web::classId.w1 << Web::classId.w2 << Web::classId.w3 << 1;
+            if (form == Form::binary) stream << 1000U;
+            stream << 1.0f;
+        }
+        device->seek(0, 0);
+        EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
+        EXPECT_LT(device->seek(0, 1), 200);
+    }
+}
+
 TEST_F(Distributions, LoadingBringsDerivedValuesUpToDate) {
     const auto light = makeWebDistribution(*import(IesText{.horizontal = {90, 180, 270}}.text()));
     light->setPeakIntensity(7);

@@ -1,0 +1,174 @@
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+#include "components/module/fileExports.h"
+#include "components/photo/cibse/photoWebCIBSE.h"
+#include "components/photo/distributions/diffuse.h"
+#include "components/photo/distributions/isotropic.h"
+#include "components/photo/distributions/spotlight.h"
+#include "components/photo/naturallight/daylightData.h"
+#include "components/photo/nimb/photoWebNIMB.h"
+#include "components/photo/tbt/photoWebTBT.h"
+#include "tests/photo/photoFixture.h"
+#include "tests/support/dripDevice.h"
+#include "tests/support/plainDevice.h"
+
+// What devices of hosts are read and written as memory is: all forms of files and streams, with the same objects,
+// messages and positions.
+
+namespace OvPhotometrics {
+namespace {
+
+using Device = RnRef<Ov::RnBufferedIO>;
+
+struct DeviceKind {
+    const char* name;
+    Device (*make)(std::string_view bytes);
+};
+
+Device memory(std::string_view bytes) { return Ov::rnCreate<Ov::RnMemoryBuffer>(bytes); }
+
+class Devices : public Photo, public testing::WithParamInterface<DeviceKind> {
+protected:
+    using MakeDevice = Device (*)(std::string_view bytes);
+
+    Devices() {
+        const auto web = import(IesText{.horizontal = {0, 45, 90, 135, 180}}.text());
+        sources = {web,
+                   distributionOf(*web),
+                   Ov::rnCreate<Isotropic>(),
+                   Ov::rnCreate<Diffuse>(),
+                   Ov::rnCreate<Spotlight>(),
+                   Ov::rnCreate<DaylightData>()};
+        for (const Ov::RnUid& id :
+             {CibseFormat::facts.classId, NimbFormat::facts.classId, TbtFormat::facts.classId})
+            sources.push_back(reread(id, *distributionOf(*web)));
+    }
+
+    RnRef<Ov::RnCastable> reread(const Ov::RnUid& format, Ov::RnIntensityDist& light) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Form::text);
+        EXPECT_TRUE(writeFile(format, light, stream, FileForm::faithful, nullptr, 0)) << log.take();
+        io->seek(0, 0);
+        auto visitor = Ov::rnVisitor<const FileFact&>([](const FileFact&) {});
+        return importWithFacts(*io, format, L"", nullptr, visitor);
+    }
+
+    /// Everything that a device holds.
+    static std::string all(const Device& device) {
+        device->seek(0, 0);
+        std::string bytes;
+        Ov::RnCharInput(*device).takeWhile([&](int c) { return bytes += static_cast<char>(c), true; });
+        return bytes;
+    }
+
+    /// What `read` answers over a device with these bytes, the messages, where it stops, and the characters there.
+    template <class Read>
+    std::string outcome(MakeDevice make, const std::string& bytes, const Read& read) {
+        const Device device = make(bytes);
+        std::string result;
+        try {
+            result = read(*device);
+        } catch (const Ov::ExBase& failure) {
+            result = failure.getDetailedReason();
+        }
+        Ov::RnCharInput rest(*device);
+        result += "\n" + log.take() + " at " + std::to_string(device->seek(0, 1)) + " before";
+        for (int k = 0; k < 3; ++k) result += " " + std::to_string(rest.getChar());
+        return result;
+    }
+
+    /// An object saved over a device in both forms.
+    std::string savedIn(MakeDevice make, Ov::RnCastable& object) {
+        std::string both;
+        for (const Form form : {Form::text, Form::binary}) {
+            const Device device = make({});
+            Ov::RnStream(device.get(), form) << 7 << &object << std::wstring(L"end");
+            both += all(device);
+        }
+        return both;
+    }
+
+    /// Each way to read these bytes gives over the device what it gives over memory.
+    void readsAsMemory(const std::string& bytes) {
+        const auto same = [&](const char* what, const auto& read) {
+            const std::string expected = outcome(memory, bytes, [&](auto& io) { return read(io, memory); });
+            const auto actual = [&](auto& io) { return read(io, GetParam().make); };
+            EXPECT_EQ(outcome(GetParam().make, bytes, actual), expected) << what << ": " << bytes.substr(0, 200);
+        };
+        for (const auto& [id, builder] : builderTable()) {
+            const auto importer = Ov::rnQuery<Ov::RnImportBuilder>(builder);
+            if (!importer) continue;
+            same("recognised", [&](auto& io, auto) { return importer->canImport(&io) ? "yes" : "no"; });
+            same("imported", [&](auto& io, MakeDevice make) {
+                return savedIn(make, *importer->import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"web", L""));
+            });
+        }
+        same("facts", [&](auto& io, auto) {
+            std::wstring all;
+            auto visitor = Ov::rnVisitor<const FileFact&>(
+                [&](const FileFact& fact) { all += fact.key + std::wstring(fact.text); });
+            readFileFacts(io, nullptr, L"", visitor);
+            return Ov::toUtf8(all);
+        });
+        for (const Form form : {Form::text, Form::binary}) {
+            same("natural light", [&](auto& io, MakeDevice make) {
+                const auto light = Ov::rnCreate<DaylightData>();
+                Ov::RnStream stream(&io, form);
+                const bool loaded = Ov::rnCast<Ov::RnPersistant>(light.get())->load(stream, 0, nullptr, nullptr);
+                return (loaded ? "loaded " : "refused ") + savedIn(make, *light);
+            });
+            same("object", [&](auto& io, MakeDevice make) {
+                Ov::RnStream stream(&io, form);
+                int before = 0;
+                std::wstring after;
+                stream >> before;
+                const auto object = stream.readObject(nullptr);
+                stream >> after;
+                return savedIn(make, *object) + Ov::toUtf8(after);
+            });
+        }
+    }
+
+    std::vector<RnRef<Ov::RnCastable>> sources;
+};
+
+TEST_P(Devices, AreReadAndWrittenAsMemoryIs) {
+    for (const auto& object : sources) {
+        const std::string saved = savedIn(memory, *object);
+        EXPECT_EQ(savedIn(GetParam().make, *object), saved);
+        for (const Form form : {Form::text, Form::binary}) {
+            const Device device = memory({});
+            Ov::RnStream(device.get(), form) << 7 << object.get() << std::wstring(L"end");
+            const std::string bytes = all(device);
+            for (std::size_t size = bytes.size(); size > 0; size -= 1 + size / 20)
+                readsAsMemory(bytes.substr(0, size));
+        }
+    }
+    for (const char* folder : {OVPHOTO_SOURCE_DIR "/tests/data", OVPHOTO_SOURCE_DIR "/examples"})
+        for (const auto& entry : std::filesystem::recursive_directory_iterator(folder)) {
+            if (!entry.is_regular_file()) continue;
+            std::ifstream file(entry.path(), std::ios::binary);
+            const std::string bytes{std::istreambuf_iterator<char>(file), {}};
+            readsAsMemory(bytes);
+            readsAsMemory(withLineEnds(bytes, "\r"));
+            readsAsMemory(withLineEnds(bytes, "\r\n"));
+            readsAsMemory(bytes.substr(0, bytes.size() / 2));
+        }
+}
+
+INSTANTIATE_TEST_SUITE_P(Kinds, Devices,
+                         testing::Values(DeviceKind{"plain",
+                                                    [](std::string_view bytes) -> Device {
+                                                        return Ov::rnCreate<PlainDevice>(bytes);
+                                                    }},
+                                         DeviceKind{"drip",
+                                                    [](std::string_view bytes) -> Device {
+                                                        return Ov::rnCreate<DripDevice>(std::string(bytes));
+                                                    }}),
+                         [](const auto& each) { return each.param.name; });
+
+}  // namespace
+}  // namespace OvPhotometrics
