@@ -70,7 +70,8 @@ public:
     virtual float getCandela(int psiIndex, int thetaIndex) const = 0;
     /// Writes the relative values of a block of indices to `out`, one row of vertical indices after another; the
     /// caller gives the space. `psis.first` lies in -1 .. count - 1 (else the assertion "h >= -1 && h < _npsis");
-    /// the rows behind it wrap (Full) or reflect (Half, Quarter), vertical indices are clamped.
+    /// the rows behind it wrap (Full) or reflect (Half, Quarter), vertical indices are clamped. A range whose last
+    /// index lies before its first has no values.
     virtual void getCandelaBlock(IndexRange psis, IndexRange thetas, float* out) const = 0;
     /// Visits the paths of the files that the web depends on, such as a tilt file.
     virtual RnEnum::Action enumerateFiles(RnEnumerator<const wchar_t*>& visitor) const = 0;

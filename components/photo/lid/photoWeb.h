@@ -175,23 +175,24 @@ protected:
 
 inline float* RnBasePhotoWebData::copyRow(int j, IndexRange thetas, float* out) const {
     const float* values = row(j);
-    if (thetas.first >= 0 && thetas.last < _nthetas) {
+    if (thetas.first >= 0 && thetas.last < _nthetas && thetas.first <= thetas.last) {
         // Nearly every block is 4 wide: a copy of known size is one instruction, others are a call.
         if (thetas.last - thetas.first == 3) return std::copy_n(values + thetas.first, 4, out);
         return std::copy(values + thetas.first, values + thetas.last + 1, out);
     }
-    for (int i = thetas.first; i <= thetas.last; ++i) *out++ = values[clampTheta(i)];
+    // Wider than an index, which ends at its largest value.
+    for (std::int64_t i = thetas.first; i <= thetas.last; ++i) *out++ = values[clampTheta(static_cast<int>(i))];
     return out;
 }
 
 inline void RnBasePhotoWebData::getCandelaBlock(IndexRange psis, IndexRange thetas, float* out) const {
     if (empty()) {
-        for (int h = psis.first; h <= psis.last; ++h)
-            for (int i = thetas.first; i <= thetas.last; ++i) *out++ = 0;
+        for (std::int64_t h = psis.first; h <= psis.last; ++h)
+            for (std::int64_t i = thetas.first; i <= thetas.last; ++i) *out++ = 0;
         return;
     }
     if (_symmetry == PhotoWebSymmetry::Axial) {
-        for (int h = psis.first; h <= psis.last; ++h) out = copyRow(0, thetas, out);
+        for (std::int64_t h = psis.first; h <= psis.last; ++h) out = copyRow(0, thetas, out);
         return;
     }
     const bool full = _symmetry == PhotoWebSymmetry::Full;
@@ -206,7 +207,7 @@ inline void RnBasePhotoWebData::getCandelaBlock(IndexRange psis, IndexRange thet
         j = full ? _npsis - 1 : _npsis > 1 ? 1 : 0;
         step = full ? 1 : -1;
     }
-    for (int h = psis.first; h <= psis.last; ++h) {
+    for (std::int64_t h = psis.first; h <= psis.last; ++h) {
         out = copyRow(j, thetas, out);
         if (_npsis == 1) continue;
         j += step;

@@ -148,6 +148,29 @@ TEST_F(PhotoWeb, BlocksWrapReflectAndClamp) {
     EXPECT_THROW(rows(Half, 4), Ov::ExAssertion);
 }
 
+TEST_F(PhotoWeb, BlocksOfAnyRangesHaveAsManyValuesAsTheseSay) {
+    constexpr int most = std::numeric_limits<int>::max(), least = std::numeric_limits<int>::min();
+    const auto valuesOf = [](const Ov::RnPhotoWebData& web, IndexRange psis, IndexRange thetas) {
+        std::array<float, 8> block;
+        block.fill(-1);
+        web.getCandelaBlock(psis, thetas, block.data());
+        return std::ranges::find(block, -1) - block.begin();
+    };
+    const auto axial = webOf({.nthetas = 3, .npsis = 1, .symmetry = Axial}, one);
+    const auto half = webOf({.nthetas = 3, .npsis = 4}, one), empty = Ov::rnCreate<PhotoWebIES>();
+    for (const auto& web : {axial, half, empty}) {
+        for (const IndexRange alone : {IndexRange{most, most}, IndexRange{least, least}, IndexRange{1, 1}}) {
+            EXPECT_EQ(valuesOf(*web, {0, 1}, alone), 2);
+            EXPECT_EQ(valuesOf(*web, web.get() == half.get() ? IndexRange{1, 1} : alone, {0, 1}), 2);
+        }
+        for (const IndexRange none : {IndexRange{2, 0}, IndexRange{1, 0}, IndexRange{1, least}}) {
+            EXPECT_EQ(valuesOf(*web, {0, 1}, none), 0);
+            EXPECT_EQ(valuesOf(*web, none, {0, 1}), 0);
+        }
+    }
+    EXPECT_THROW(valuesOf(*half, {most, most}, {0, 1}), Ov::ExAssertion);
+}
+
 TEST_F(PhotoWeb, ANodeIsItsSampleAndMirrorsAgree) {
     for (const Grid& grid : {Grid{.npsis = 8, .symmetry = Full, .lastPsi = 315}, Grid{}, Grid{.nthetas = 40},
                              Grid{.symmetry = Quarter, .lastPsi = 90}, Grid{.npsis = 1, .symmetry = Axial}}) {
