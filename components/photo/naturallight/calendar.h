@@ -18,6 +18,7 @@ bool monthAndDay(int yearDay, int* month, int* day);
 
 /// The month's name from the message catalogue; empty outside 1..12. The text stays valid as long as the module is
 /// loaded.
+///
 /// Errors:   RnMessageFileEx when there is no catalogue.
 /// Threads:  any number.
 const wchar_t* getMonthName(int month);

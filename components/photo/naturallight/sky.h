@@ -9,9 +9,9 @@
 //
 // Units:    radians; lux; candela per square metre.
 // Accuracy: the luminance of a sky, summed over a hemisphere, gives its horizontal illuminance within 0.2 % at
-// solar
-//           altitudes that are multiples of 5 degrees, where the zenith luminance is tabulated, and within 0.9 %
-//           (clear) and 0.3 % (partly cloudy) between; the overcast sky gives 1.049 of it. sky_test measures it.
+//           solar altitudes that are multiples of 5 degrees, where the zenith luminance is tabulated, and within
+//           0.9 % (clear) and 0.3 % (partly cloudy) between; the overcast sky gives 1.049 of it. sky_test measures
+//           it.
 
 namespace OvPhotometrics {
 
