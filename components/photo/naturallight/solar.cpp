@@ -16,7 +16,10 @@ double equationOfTime(int day) {
     return 0.17 * std::sin(4 * pi * (day - 80) / 373) - 0.129 * std::sin(2 * pi * (day - 8) / 355);
 }
 
-double solarDeclination(int day) { return 0.4093 * std::sin(2 * pi * (day - 81) / 368); }
+double solarDeclination(int day) {
+    // The sine of whole half turns of a rounded pi is not quite 0.
+    return (day - 81) % 184 == 0 ? 0 : 0.4093 * std::sin(2 * pi * (day - 81) / 368);
+}
 
 LatitudeTerms::LatitudeTerms(double latitude) {
     const bool isPole = 2 * std::abs(latitude) >= pi;

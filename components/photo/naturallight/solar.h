@@ -6,15 +6,14 @@
 // Units:    radians; decimal hours. Solar time runs from midnight, at 12 the sun is due south.
 // Signs:    latitude and declination north positive; azimuth 0 = south, positive towards west.
 // Accuracy: altitude within 1.2 degrees and equation of time within 1.2 minutes of the true ones, in any year;
-// most
-//           of it because the leap days are left out. solar_test measures it.
+//           most of it because the leap days are left out. solar_test measures it.
 
 namespace OvPhotometrics {
 
 /// Solar less mean time in hours, for a day of the year 1..365.
 double equationOfTime(int day);
 
-/// The sun's declination for a day of the year 1..365.
+/// The sun's declination for a day of the year 1..365; exactly 0 on the days 81 and 265.
 double solarDeclination(int day);
 
 /// Sine and cosine of a latitude. From the poles on they are those of the pole, exactly, so that nothing rises or
