@@ -46,7 +46,8 @@
     message(lightSkyCastsShadows,          12921, "") \
     message(lightSunFlags,                 12922, "") \
     message(lightSkyFlags,                 12923, "") \
-    message(lightSkyShadowsAccuracy,       12924, "")
+    message(lightSkyShadowsAccuracy,       12924, "") \
+    message(lightNotFinite,                13081, "s")  /* line; this one stands alone */
 
 // Installing a web.
 #define OVPHOTO_MESSAGES_WEB(message) \

@@ -48,13 +48,14 @@ struct NaturalLightSettings {
 ///
 /// Units:    degrees, except the solar angles (`setSolarPosition`, `getSolarAltitude`, `getSolarAzimuth`,
 ///           `getSolarZenith`), which are radians; decimal hours; lux; candela per square metre.
-/// Signs:    latitude north positive; longitude and time zone WEST positive (New York: longitude 74, zone 5
-/// hours). Azimuth:  0 = south, positive towards west, before `north` is added. Scene:    with `north` 0, +X
-/// points east, +Y north, +Z up. Directions are scene directions, towards the light. Range:    setters take any
-/// value and getters give it back; only the computation limits it (day 1 to 365, latitude
-///           to the poles, a longitude or meridian from 180 degrees on counts as -180, sky cover 0 to 1).
-/// Lazy:     the values below "derived" are computed together by the first of them that is asked for after
-///           a change, which is why those operations are not const. Getters of settings never compute: after `setSolarTime`
+/// Signs:    latitude north positive; longitude and time zone WEST positive (New York: longitude 74, zone 5 hours).
+/// Azimuth:  0 = south, positive towards west, before `north` is added.
+/// Scene:    with `north` 0, +X points east, +Y north, +Z up. Directions are scene directions, towards the light.
+/// Range:    setters take any value and getters give it back; only the computation limits it (day 1 to 365,
+///           latitude to the poles, a longitude or meridian from 180 degrees on counts as -180, sky cover 0 to 1).
+///           Numbers that are not finite cannot be saved as text: ExWriteError, after message 13081.
+/// Lazy:     the values below "derived" are computed together by the first of them that is asked for after a change,
+///           which is why those operations are not const. Getters of settings never compute: after `setSolarTime`
 ///           the local time follows when a derived value is next asked for.
 /// Threads:  one at a time for an object, as getters compute; any number with objects of their own.
 class RnNaturalLight : public RnCastable {

@@ -95,7 +95,10 @@ const Daylight& DaylightData::derived() {
 void DaylightDataPersistant::save(Ov::RnStream& stream) {
     Ov::NaturalLightSettings settings;
     data().getSettings(settings);
-    stream.isTextStream() ? writeDaylightText(stream, settings) : writeDaylightBinary(stream, settings);
+    if (!stream.isTextStream()) return writeDaylightBinary(stream, settings);
+    if (!writeDaylightText(stream, settings))
+        throw Ov::RnStreamEx::ExWriteError("components/photo/naturallight/daylightData", __LINE__,
+                                           "natural light stream");
 }
 
 bool DaylightDataPersistant::load(Ov::RnStream& stream, int, const wchar_t*, const wchar_t*) {

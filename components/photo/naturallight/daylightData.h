@@ -124,6 +124,7 @@ private:
 class DaylightDataPersistant final : public Ov::RnTempObject<DaylightData> {
 public:
     using RnTempObject::RnTempObject;
+    /// Raises ExWriteError, after a reported message, where the text form cannot hold a number.
     void save(Ov::RnStream& stream) override;
     /// False after a reported message when the input is refused.
     bool load(Ov::RnStream& stream, int context, const wchar_t* name, const wchar_t* basePath) override;

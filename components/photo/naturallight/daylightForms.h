@@ -14,14 +14,15 @@
 // Units:    radians, but degrees for north, latitude and longitude in text; hours; lux.
 // Binary:   little-endian, no field's size or order depends on the machine.
 // Flags:    0x100 set: flag 3; 0x200 clear: flag 1 (casts shadows); 0x400 clear: flag 2.
-// Errors:   nothing, after message 12896 around one of 12898 to 12924 and the line where reading stopped; for a
-// binary
-//           form that ends early around 12898, with line 0. What the stream's device throws passes through.
+// Errors:   reading answers nothing, after message 12896 around one of 12898 to 12924 and the line where it stopped;
+//           for a binary form that ends early around 12898, with line 0. Writing text answers false, after message
+//           13081 with the line's name, where a number is not finite; nothing is written then. What the stream's
+//           device throws passes through.
 // More:     docs/formats/naturalLight.md
 
 namespace OvPhotometrics {
 
-void writeDaylightText(Ov::RnStream& out, const Ov::NaturalLightSettings& settings);
+bool writeDaylightText(Ov::RnStream& out, const Ov::NaturalLightSettings& settings);
 void writeDaylightBinary(Ov::RnStream& out, const Ov::NaturalLightSettings& settings);
 
 /// Settings that the form's release does not have take their defaults. The version is not looked at.

@@ -2,9 +2,11 @@
 
 #include <cmath>
 #include <cwchar>
+#include <string>
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/reportMessage.h"
 #include "components/photo/naturallight/formParts.h"
 
 namespace OvPhotometrics {
@@ -15,23 +17,40 @@ using Settings = Ov::NaturalLightSettings;
 using Ov::RnStream;
 namespace m = messages;
 
+/// Writes line after line; without a stream it only looks for what could not be read back.
 class TextWriter {
 public:
-    explicit TextWriter(RnStream& out) : _out(out) {}
+    explicit TextWriter(RnStream* out) : _out(out) {}
 
-    void number(const wchar_t* format, float value) { _out.formattedWrite(format, static_cast<double>(value)); }
+    template <class... Values>
+    void line(const wchar_t* format, Values... values) {
+        if (_out) _out->formattedWrite(format, values...);
+    }
+    void number(const wchar_t* format, float value) {
+        check(format, value);
+        line(format, static_cast<double>(value));
+    }
     void degrees(const wchar_t* format, float radians) { number(format, static_cast<float>(inDegrees(radians))); }
     void word(const wchar_t* format, bool value, const wchar_t* whenFalse, const wchar_t* whenTrue) {
-        _out.formattedWrite(format, value ? whenTrue : whenFalse);
+        line(format, value ? whenTrue : whenFalse);
     }
     void color(const wchar_t* format, const std::array<float, 3>& c) {
-        _out.formattedWrite(format, static_cast<double>(c[0]), static_cast<double>(c[1]),
-                            static_cast<double>(c[2]));
+        for (const float value : c) check(format, value);
+        line(format, static_cast<double>(c[0]), static_cast<double>(c[1]), static_cast<double>(c[2]));
     }
-    void integer(const wchar_t* format, int value) { _out.formattedWrite(format, value); }
+
+    /// The name of the first line with a number that is not finite, or empty.
+    const std::wstring& notFinite() const { return _notFinite; }
 
 private:
-    RnStream& _out;
+    void check(std::wstring_view format, float value) {
+        if (std::isfinite(value) || !_notFinite.empty()) return;
+        if (format.starts_with(L'\n')) format.remove_prefix(1);
+        _notFinite = format.substr(0, format.find(L':'));
+    }
+
+    RnStream* _out;
+    std::wstring _notFinite;
 };
 
 void writeOverrides(TextWriter& text, const Settings& s) {
@@ -153,17 +172,14 @@ bool readFlags(TextReader& text, Settings& s) {
            text.flags(m::lightSkyFlags, L"Sky Flags: 0x%hx\n", setSkyFlags, s);
 }
 
-}  // namespace
-
-void writeDaylightText(RnStream& out, const Settings& s) {
-    TextWriter text(out);
-    out.formattedWrite(L"Marovendel Natural Light Version %d, Release %d\n\n", formVersion, formRelease);
+void writeLines(TextWriter& text, const Settings& s) {
+    text.line(L"Marovendel Natural Light Version %d, Release %d\n\n", formVersion, formRelease);
     text.word(L"Natural light is: %s\n", s.enabled, L"Off", L"On");
     text.word(L"In/Out: %s\n", s.outside, L"In", L"Out");
     text.degrees(L"North: %.16g\n", s.north);
     text.degrees(L"Latitude: %.16g\n", s.latitude);
     text.degrees(L"Longitude: %.16g\n", s.longitude);
-    text.integer(L"Day: %d\n", s.day);
+    text.line(L"Day: %d\n", static_cast<int>(s.day));
     text.word(L"Daylight Savings Time: %s\n", s.daylightSaving, L"No", L"Yes");
     text.number(L"Local Time: %.16g\n", s.localTime);
     text.number(L"Time Zone: %.16g\n", s.timeZone);
@@ -171,10 +187,24 @@ void writeDaylightText(RnStream& out, const Settings& s) {
     text.color(L"Sun Color: %.16g %.16g %.16g\n", s.sunColor);
     text.color(L"\nSky Color: %.16g %.16g %.16g\n", s.skyColor);
     writeOverrides(text, s);
-    text.integer(L"Sun Flags: 0x%x\n", sunFlagWord(s));
-    text.integer(L"Sky Flags: 0x%x\n", skyFlagWord(s));
+    text.line(L"Sun Flags: 0x%x\n", static_cast<int>(sunFlagWord(s)));
+    text.line(L"Sky Flags: 0x%x\n", static_cast<int>(skyFlagWord(s)));
     text.number(L"Sky Shadows Accuracy: %.3g\n", s.skyShadowAccuracy);
-    out.formattedWrite(L"\n");
+    text.line(L"\n");
+}
+
+}  // namespace
+
+bool writeDaylightText(RnStream& out, const Settings& s) {
+    TextWriter trial(nullptr);
+    writeLines(trial, s);
+    if (!trial.notFinite().empty()) {
+        reportMessage(m::lightNotFinite, trial.notFinite().c_str());
+        return false;
+    }
+    TextWriter text(&out);
+    writeLines(text, s);
+    return true;
 }
 
 std::optional<Settings> readDaylightText(RnStream& in) {

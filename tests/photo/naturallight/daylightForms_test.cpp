@@ -1,4 +1,5 @@
 #include <cstring>
+#include <functional>
 #include <random>
 
 #include "components/photo/naturallight/daylightData.h"
@@ -70,6 +71,50 @@ TEST_F(LightForms, ReadBackTheSame) {
         }
     }
     EXPECT_EQ(log.take(), "");
+}
+
+TEST_F(LightForms, WhatIsNotFiniteIsSavedWholeOrRefused) {
+    const std::pair<const char*, std::function<void(Settings&, float)>> cases[] = {
+        {"North", [](Settings& s, float bad) { s.north = bad; }},
+        {"Latitude", [](Settings& s, float bad) { s.latitude = bad; }},
+        {"Longitude", [](Settings& s, float bad) { s.longitude = bad; }},
+        {"Local Time", [](Settings& s, float bad) { s.localTime = bad; }},
+        {"Time Zone", [](Settings& s, float bad) { s.timeZone = bad; }},
+        {"Sky Cover", [](Settings& s, float bad) { s.skyCover = bad; }},
+        {"Sun Color", [](Settings& s, float bad) { s.sunColor[2] = bad; }},
+        {"Sky Color", [](Settings& s, float bad) { s.skyColor[0] = bad; }},
+        {"Solar Altitude", [](Settings& s, float bad) { s.solarAltitude = bad; }},
+        {"Solar Azimuth", [](Settings& s, float bad) { s.solarAzimuth = bad; }},
+        {"Direct Normal Solar Illuminance", [](Settings& s, float bad) { s.directNormalIlluminance = bad; }},
+        {"Sky Shadows Accuracy", [](Settings& s, float bad) { s.skyShadowAccuracy = bad; }}};
+    constexpr float infinite = std::numeric_limits<float>::infinity();
+    const auto refused = [&](const Settings& s, const std::string& line) {
+        SCOPED_TRACE(line);
+        light->setSettings(s);
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Form::text);
+        EXPECT_THROW(Ov::rnCast<Ov::RnPersistant>(light.get())->save(stream), Ov::RnStreamEx::ExWriteError);
+        EXPECT_EQ(log.take(), "13081 " + line);
+        EXPECT_EQ(io->bytes(), "");
+    };
+    for (const auto& [line, set] : cases)
+        for (const float bad : {infinite, -infinite, std::nanf("")}) {
+            Settings s;
+            s.overrideSolarPosition = s.overrideSolarIlluminance = true;
+            set(s, bad);
+            refused(s, line);
+            const std::string bytes = save(Form::binary);
+            light->reset();
+            EXPECT_TRUE(load(bytes, Form::binary));
+            EXPECT_EQ(save(Form::binary), bytes);
+        }
+    refused({.latitude = 3e38f}, "Latitude");                                              // too many degrees
+    light->setSettings({.solarAltitude = infinite, .directNormalIlluminance = infinite});  // not overridden
+    const std::string text = save(Form::text);
+    EXPECT_TRUE(load(text, Form::text));
+    std::string color = text;
+    color.replace(color.find("Sun Color: 1 "), 13, "Sun Color: 1e39 ");
+    EXPECT_EQ(refusal(color, Form::text).substr(0, 11), "12896 12912");
 }
 
 /// The lines of a text form that has all sections of release 3, and what is reported without them.
