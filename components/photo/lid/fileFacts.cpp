@@ -88,7 +88,7 @@ std::vector<std::wstring> FileFacts::textLines() const {
 std::wstring labelText(std::wstring_view text, std::size_t limit) {
     std::wstring label(text.substr(0, limit));
     std::replace_if(
-        label.begin(), label.end(), [](wchar_t c) { return c < L' ' || c == 127; }, L' ');
+        label.begin(), label.end(), [](wchar_t c) { return c <= 0x1F || c == 0x7F; }, L' ');
     return label;
 }
 

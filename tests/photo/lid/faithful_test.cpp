@@ -218,6 +218,10 @@ TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
     EXPECT_EQ(*nimb.find(L"line 2"), L"Alder");
     EXPECT_EQ(*nimb.find(L"line 3"), L"lantern");
     EXPECT_TRUE(written<TbtFormat>(*dist, facts).starts_with("lantern\n3\n"));
+    FileFacts other;  // what fills its line is not continued, and every control character is a blank
+    other.add(L"LAMP", std::wstring(73, L'y'));
+    other.add(L"line", L"a\x1f\x20\x21\x7fz");
+    EXPECT_NE(written<IesFormat>(*dist, other).find("y\n[OTHER] a  ! z\n[LUMINAIRE]"), std::string::npos);
     // And back: the keywords are known again.
     EXPECT_NE(written<IesFormat>(*dist, cibse).find("\n[MANUFAC] Alder\n"), std::string::npos);
 }

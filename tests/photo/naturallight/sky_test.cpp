@@ -108,10 +108,19 @@ TEST(Sky, NightIsDark) {
             EXPECT_EQ(sky.skyCoefficients, (std::array<float, 6>{}));
             EXPECT_EQ(skyIlluminance(sky, up, 0) + skyLuminance(sky, up), 0);
         }
-    EXPECT_EQ(skyWith(0, 0).skyHorizontalIlluminance, 800);
     EXPECT_EQ(skyWith(0, -0.1).skyHorizontalIlluminance, 0);
     EXPECT_NEAR(skyWith(0.5f, -0.1).skyHorizontalIlluminance, 300 - 45000 * std::sin(inRadians(0.1)), 1e-3);
     EXPECT_EQ(skyWith(1, -5).skyHorizontalIlluminance, 0);
+}
+
+TEST(Sky, HorizontalIlluminanceFollowsTheAltitude) {
+    const struct {
+        double altitude;
+        float lux[3];  // clear, partly cloudy, overcast
+    } cases[] = {{0, {800, 300, 300}}, {30, {11760.155f, 22800, 10800}}, {90, {16300, 45300, 21300}}};
+    for (const auto& c : cases)
+        for (int i = 0; i < 3; ++i)
+            EXPECT_FLOAT_EQ(skyWith(covers[i], c.altitude).skyHorizontalIlluminance, c.lux[i]) << c.altitude;
 }
 
 TEST(Sky, CoverChoosesTheKind) {
