@@ -80,7 +80,7 @@ std::optional<Placement> polarPlacement(const Ov::RnPhotoWebData& web, const Wri
 }
 
 /// The multiple of 0.01 degree that an orientation turns by: from the sine and cosine of the angle.
-float turnOf(float sine, float cosine) {
+float turnOf(double sine, double cosine) {
     return static_cast<float>(std::round(inDegrees(std::atan2(sine, cosine)) * 100) / 100);
 }
 

@@ -128,7 +128,7 @@ HostView::HostView(const Ov::RnIntensityDist& dist) : _dist(dist), _symmetry(Pho
     const auto orientation = dist.getOrientation();
     _axisKept = std::fabs(orientation[8] - 1) < 1e-6f;
     if (!_axisKept) return;
-    _turn = std::round(inDegrees(std::atan2(orientation[1], orientation[0])) * 100) / 100;
+    _turn = std::round(inDegrees(std::atan2(double{orientation[1]}, double{orientation[0]})) * 100) / 100;
     _symmetry = turned(dist.getSymmetry(), _turn);
     _thetas = dist.getThetaRange();
     if (compareAngles(_thetas.last, halfPi) <= 0)
