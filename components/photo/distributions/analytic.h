@@ -1,7 +1,6 @@
 #pragma once
 
-#include <cmath>
-
+#include "components/photo/distributions/singlePrecision.h"
 #include "host/componentManager/castImpl.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
@@ -51,11 +50,10 @@ public:
 template <class Self, class Adapter, class Interface>
 class CosineDist : public AnalyticDist<Self, Adapter, Interface> {
 public:
-    float intensity(float theta, float) const override {
-        return self().law(static_cast<float>(std::cos(static_cast<double>(theta))));
-    }
+    float intensity(float theta, float) const override { return self().law(single::cosine(theta)); }
     float intensityAt(const GeVector3<float>& direction) const override {
-        return self().law(direction.z / direction.length());
+        const GeVector3<float> v = direction.measurable();
+        return self().law(v.z / v.length());
     }
     float intensityAtUnit(const GeVector3<float>& direction) const override { return self().law(direction.z); }
 

@@ -16,8 +16,8 @@ public:
                                         L"Diffuse Light Intensity Distribution"};
     static constexpr Ov::RnUid classId = facts.classId;
 
-    float law(float cosine) const { return cosine > 0 ? cosine * candela : 0; }
-    float getFlux() const override { return candela * pi; }
+    float law(float cosine) const { return cosine > 0 ? orDark(cosine * candela) : 0; }
+    float getFlux() const override { return orDark(candela * pi); }
     void setFlux(float lumens) override { candela = lumens / pi; }
     AngleRange getThetaRange() const override { return {0, 1.5707964f}; }
 

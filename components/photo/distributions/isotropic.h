@@ -16,10 +16,10 @@ public:
                                         L"Isotropic Light Intensity Distribution"};
     static constexpr Ov::RnUid classId = facts.classId;
 
-    float intensity(float, float) const override { return candela; }
-    float intensityAt(const GeVector3<float>&) const override { return candela; }
-    float intensityAtUnit(const GeVector3<float>&) const override { return candela; }
-    float getFlux() const override { return candela * fourPi; }
+    float intensity(float, float) const override { return orDark(candela); }
+    float intensityAt(const GeVector3<float>&) const override { return orDark(candela); }
+    float intensityAtUnit(const GeVector3<float>&) const override { return orDark(candela); }
+    float getFlux() const override { return orDark(candela * fourPi); }
     void setFlux(float lumens) override { candela = lumens / fourPi; }
     AngleRange getThetaRange() const override { return {0, 3.1415927f}; }
 

@@ -9,7 +9,7 @@ namespace {
 /// The integral of cosine^exponent over the cone; over the whole hemisphere where `cosFalloff` is not above 0.
 float coneFlux(float exponent, float cosFalloff) {
     float flux = static_cast<float>(6.283185307179586 / (static_cast<double>(exponent) + 1));
-    if (cosFalloff > 0) flux *= 1 - std::pow(cosFalloff, exponent + 1);
+    if (cosFalloff > 0) flux *= 1 - single::power(cosFalloff, exponent + 1);
     return flux;
 }
 
@@ -18,8 +18,8 @@ float coneFlux(float exponent, float cosFalloff) {
 void Spotlight::setCosines(float hotspot, float falloff) {
     _cosHotspot = hotspot;
     _cosFalloff = falloff;
-    _falloffAngle = std::acos(std::min(hotspot, falloff));
-    _exponent = std::log(0.5f) / std::log(hotspot);
+    _falloffAngle = single::arcCosine(std::min(hotspot, falloff));
+    _exponent = single::logarithm(0.5) / single::logarithm(hotspot);
     _fluxFactor = hotspot <= narrowest ? coneFlux(_exponent, falloff) : 0;
 }
 

@@ -29,11 +29,11 @@ public:
 
     float law(float cosine) const {
         const bool lit = cosine >= _cosFalloff && _cosHotspot <= narrowest;
-        return lit ? std::pow(cosine, _exponent) * candela : 0;
+        return lit ? orDark(single::power(cosine, _exponent) * candela) : 0;
     }
-    float getFlux() const override { return candela * _fluxFactor; }
+    float getFlux() const override { return orDark(candela * _fluxFactor); }
     /// A spotlight that gives no light has no candela for any flux: 0.
-    void setFlux(float lumens) override { candela = _fluxFactor != 0 ? lumens / _fluxFactor : 0; }
+    void setFlux(float lumens) override { candela = _fluxFactor > 0 ? lumens / _fluxFactor : 0; }
     /// Reaches to the wider of both angles.
     AngleRange getThetaRange() const override { return {0, _falloffAngle}; }
     float getHotspotCosine() const override { return _cosHotspot; }

@@ -1,22 +1,18 @@
 #include "components/photo/distributions/web.h"
 
 #include <algorithm>
-#include <cmath>
 #include <limits>
 
+#include "components/photo/distributions/singlePrecision.h"
 #include "host/componentManager/stream.h"
 
 namespace OvPhotometrics {
 
 namespace {
 
-// Single-precision functions are the double ones, rounded once: platforms' own differ in the last digit.
-float sine(float a) { return static_cast<float>(std::sin(static_cast<double>(a))); }
-float cosine(float a) { return static_cast<float>(std::cos(static_cast<double>(a))); }
-
 GeVector3<float> unitVector(float theta, float psi) {
-    const float s = sine(theta);
-    GeVector3<float> direction{s * cosine(psi), s * sine(psi), cosine(theta)};
+    const float s = single::sine(theta);
+    GeVector3<float> direction{s * single::cosine(psi), s * single::sine(psi), single::cosine(theta)};
     return direction.normalize();
 }
 
@@ -92,7 +88,7 @@ void Web::intensitiesOfVectors(const RnBasePhotoWebData& web, const float* direc
 }
 
 float Web::candelaOf(float relative) const {
-    return std::min(_multiplier * relative, std::numeric_limits<float>::max());
+    return orDark(std::min(_multiplier * relative, std::numeric_limits<float>::max()));
 }
 
 GeVector3<float> Web::fromHost(const Vector& direction) const {
@@ -109,9 +105,9 @@ GeVector3<float> Web::fromHostUnit(const Vector& direction) const {
 bool Web::anglesOf(const Vector& local, float& theta, float& psi) const {
     const float z = std::clamp(local.z, -1.0f, 1.0f);
     if (_cosLast > z || z > _cosFirst) return false;
-    theta = static_cast<float>(std::acos(static_cast<double>(z)));
+    theta = single::arcCosine(z);
     const bool onAxis = local.x == 0 && local.y == 0;
-    psi = onAxis ? 0 : static_cast<float>(std::atan2(static_cast<double>(local.y), static_cast<double>(local.x)));
+    psi = onAxis ? 0 : single::arcTangent(local.y, local.x);
     return true;
 }
 
@@ -150,12 +146,12 @@ void Web::setWeb(Ov::RnCastable* web) { hold(Ov::rnQuery<Ov::RnPhotoWebData>(web
 void Web::hold(RnRef<Ov::RnPhotoWebData> web) {
     _web = std::move(web);
     _maxCandela = _web ? _web->getMaxCandela() : 0;
-    _fluxFactor = _maxCandela > 0 ? _web->getLumens() / _maxCandela : 0;
+    _fluxFactor = _web ? lumensPerCandela(_web->getLumens(), _maxCandela) : 0;
     _identityOrientation = _web ? _web->hasIdentityOrientation() : true;
     if (!_web) return;
     const AngleRange thetas = _web->getThetaRange();
-    _cosLast = cosine(thetas.last);
-    _cosFirst = cosine(thetas.first);
+    _cosLast = single::cosine(thetas.last);
+    _cosFirst = single::cosine(thetas.first);
 }
 
 void WebPersistant::save(Ov::RnStream& stream) {

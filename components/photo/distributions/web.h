@@ -1,6 +1,7 @@
 #pragma once
 
 #include "components/photo/distributions/manyIntensities.h"
+#include "components/photo/distributions/singlePrecision.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/photoWeb.h"
 #include "host/componentManager/castImpl.h"
@@ -41,7 +42,7 @@ public:
     PhotoWebSymmetry getSymmetry() const override { return _web ? _web->getSymmetry() : PhotoWebSymmetry::Axial; }
     float getPeakIntensity() const override { return _multiplier; }
     void setPeakIntensity(float candela) override { _multiplier = candela; }
-    float getFlux() const override { return _multiplier * _fluxFactor; }
+    float getFlux() const override { return orDark(_multiplier * _fluxFactor); }
     void setFlux(float lumens) override { _multiplier = _fluxFactor > 0 ? lumens / _fluxFactor : 0; }
     bool hasIdentityOrientation() const override { return _identityOrientation; }
     GeLinearMatrix3<float> getOrientation() const override;
@@ -59,7 +60,7 @@ private:
 
     using Vector = GeVector3<float>;
 
-    /// At most the largest number.
+    /// A number, and at most the largest.
     float candelaOf(float relative) const;
     // Directions in the web's frame.
     Vector fromHost(const Vector& direction) const;

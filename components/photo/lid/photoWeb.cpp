@@ -147,6 +147,13 @@ float integrateFlux(const PhotoWebRecord& rec, const float* values, float maxCan
     return sum * 0.5f * maxCandela;
 }
 
+/// Whether a distribution can hold the flux: whether candela and lumens that it works out of both are finite.
+bool canBeHeld(float lumens, float maxCandela) {
+    const float factor = lumensPerCandela(lumens, maxCandela);
+    const float candela = lumens > 0 ? lumens / factor : 0;
+    return std::isfinite(factor) && std::isfinite(candela) && std::isfinite(candela * factor);
+}
+
 /// The message that refuses the last psi for the symmetry, or 0.
 unsigned refusedPsiRange(const PhotoWebRecord& rec) {
     const auto outside = [&](float limit) {
@@ -265,7 +272,8 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     } else {
         std::copy_n(rec.candelas.get(), values, candelas.get());
     }
-    if (!std::isfinite(rec.maxCandela) || !std::isfinite(lumens) || !allFinite(candelas.get(), values))
+    if (!std::isfinite(rec.maxCandela) || !std::isfinite(rec.lumens) || !std::isfinite(lumens) ||
+        !canBeHeld(lumens, rec.maxCandela) || !allFinite(candelas.get(), values))
         return false;
 
     web._name = std::move(name);
@@ -311,7 +319,7 @@ GeVector3<float>& RnBasePhotoWebData::toWebFrame(GeVector3<float>& out, const Ge
 
 GeVector3<float>& RnBasePhotoWebData::toWebFrameUnit(GeVector3<float>& out,
                                                      const GeVector3<float>& direction) const {
-    out = (_identityOrientation ? direction : _orientation * direction).normalized();
+    out = (_identityOrientation ? direction : _orientation * direction.measurable()).normalized();
     return out;
 }
 

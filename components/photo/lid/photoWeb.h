@@ -91,10 +91,13 @@ float photoWebIntegrate(int n, const float* angles, const float* values);
 
 class RnBasePhotoWebData;
 
+/// The flux of a web over its peak: what a distribution multiplies its candela by to get lumens.
+inline float lumensPerCandela(float lumens, float maxCandela) { return maxCandela > 0 ? lumens / maxCandela : 0; }
+
 /// Checks a record and makes it the content of `web`: values relative to the peak, the flux integrated when the
 /// record has none, the orientation transposed (it then carries host directions into the web's frame).
 /// False, and nothing has changed, after a message about angles (12925 to 12931), or without one when the peak,
-/// the flux or a value is not finite. Throws std::bad_alloc with nothing changed.
+/// the flux, a value, or what a distribution works out of them is not finite. Throws std::bad_alloc with nothing changed.
 bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);
 
 /// The web behind RnPhotoWebData; each format derives its own. Queries work from the members alone and allocate

@@ -83,6 +83,24 @@ TEST_F(Distributions, FluxIsTheIntegralOfIntensity) {
     }
 }
 
+TEST_F(Distributions, ASpotlightUsesDoubleFunctionsRoundedOnce) {
+    std::mt19937 random(3);
+    const auto cosine = [&] { return std::uniform_real_distribution<float>(0.02f, 0.9999f)(random); };
+    const auto rounded = [](double value) { return static_cast<float>(value); };
+    for (int k = 0; k < 3000; ++k) {
+        const auto spot = Ov::rnCreate<Spotlight>();
+        const float hotspot = cosine(), falloff = cosine(), c = std::max(falloff, cosine());
+        spot->setHotspotCosine(hotspot);
+        spot->setFalloffCosine(falloff);
+        spot->setPeakIntensity(1);
+        const float exponent = rounded(std::log(0.5)) / rounded(std::log(double{hotspot}));
+        EXPECT_EQ(spot->intensityAtUnit({0, 0, c}), rounded(std::pow(double{c}, double{exponent}))) << c;
+        EXPECT_EQ(spot->getThetaRange().last, rounded(std::acos(double{std::min(hotspot, falloff)})));
+        EXPECT_EQ(spot->getFlux(), rounded(6.283185307179586 / (double{exponent} + 1)) *
+                                       (1 - rounded(std::pow(double{falloff}, double{exponent + 1}))));
+    }
+}
+
 TEST_F(Distributions, SpotlightCosinesStayInTheirLimits) {
     constexpr float nan = std::numeric_limits<float>::quiet_NaN();
     const struct {
@@ -183,6 +201,82 @@ TEST_F(Distributions, OneWebIsShared) {
         EXPECT_EQ(light->intensityAtUnit(host), light->localIntensityAtUnit(light->toLocal(host)));
     }
     EXPECT_EQ(holders(), alone);
+}
+
+TEST_F(Distributions, AnyLengthHasTheDirectionOfItsUnitVector) {
+    const auto lamp = Ov::rnCreate<Isotropic>();
+    const auto diffuse = Ov::rnCreate<Diffuse>();
+    const RnRef<Ov::RnIntensityDist> lights[] = {
+        lamp,
+        diffuse,
+        makeSpotlight(30, 60, 9),
+        Ov::rnCreate<Web>(),
+        makeWebDistribution(*import(IesText{.vertical = {0, 45, 90}}.text())),
+        makeWebDistribution(*import(IesText{.horizontal = {90, 150, 270}, .values = "1 2 3 4 5 6 7 8 9"}.text())),
+        makeWebDistribution(
+            *import(IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}}.text()))};
+    const GeVector3<float> directions[] = {{0, 0, 1}, {3, -2, 7}, {1, 1, 1}, {-7, 5, -3}, {0, 1, 0}};
+    for (const auto& light : lights) {
+        light->setFlux(1000);
+        for (const GeVector3<float>& d : directions)
+            for (int power = -149; power < 126; ++power) {
+                SCOPED_TRACE(testing::Message() << &light - lights << " 2^" << power);
+                const float scale = std::ldexp(1.0f, power);
+                const GeVector3<float> scaled{d.x * scale, d.y * scale, d.z * scale};
+                ASSERT_EQ(light->intensityAt(scaled), light->intensityAt(d));
+                ASSERT_EQ(light->localIntensityAt(scaled), light->localIntensityAt(d));
+                ASSERT_EQ(light->toLocalNormalized(scaled), light->toLocalNormalized(d));
+                float candela = -1;
+                getIntensities(light.get(), DirectionForm::vectors, &scaled.x, 1, &candela);
+                ASSERT_EQ(candela, light->intensityAt(d));
+            }
+    }
+}
+
+TEST_F(Distributions, LightIsFiniteAndNeverNegative) {
+    constexpr float inf = std::numeric_limits<float>::infinity(), nan = std::numeric_limits<float>::quiet_NaN();
+    const float numbers[] = {0, 1e-45f, 1e-38f, 1e-30f, 1e-6f, 1, 1e6f, 1e30f, 3e38f};
+    const float angles[] = {0, 0.3f, 1, 2, 2.5f, 3};
+    std::vector<RnRef<Ov::RnIntensityDist>> lights = {Ov::rnCreate<Isotropic>(), Ov::rnCreate<Diffuse>(),
+                                                      makeSpotlight(1, 80, 1), Ov::rnCreate<Web>()};
+    for (const float lumens : numbers)
+        for (const float peak : numbers)
+            for (const float valley : {0.0f, -peak, -3e38f}) {
+                PhotoWebRecord rec;
+                photoWebRecordInit(rec, 3, 1, PhotoWebSymmetry::Axial, false, true, nullptr);
+                photoWebRecordSetLumens(rec, lumens);
+                for (const int i : {0, 1, 2}) {
+                    rec.thetas[static_cast<std::size_t>(i)] = static_cast<float>(i);
+                    photoWebRecordSetCandela(rec, i, 0, i == 1 ? valley : peak);
+                }
+                const auto web = Ov::rnCreate<PhotoWebIES>();
+                if (!photoWebInstall(*web, rec)) continue;
+                lights.push_back(makeWebDistribution(*web));
+                const float flux = lights.back()->getFlux();
+                EXPECT_TRUE(std::isfinite(flux) && (flux > 0 || !(web->getLumens() > 0))) << lumens << " " << peak;
+                for (const float theta : angles) {
+                    const float candela = lights.back()->intensity(theta, 1);
+                    EXPECT_TRUE(candela >= 0 && std::isfinite(candela)) << lumens << " " << peak << " " << theta;
+                }
+            }
+    EXPECT_GT(lights.size(), 100U);
+    // Whatever a host sets, the answer is a number.
+    const auto isNumber = [&](Ov::RnIntensityDist& light) {
+        for (const float theta : angles) {
+            const float direction[] = {theta, 1};
+            float candela = nan;
+            getIntensities(&light, DirectionForm::angles, direction, 1, &candela);
+            if (std::isnan(candela) || std::isnan(light.intensity(theta, 1))) return false;
+        }
+        return !std::isnan(light.getFlux());
+    };
+    for (const auto& light : lights)
+        for (const float number : {0.0f, 1e-45f, 3e38f, inf, -inf, nan}) {
+            light->setFlux(number);
+            EXPECT_TRUE(isNumber(*light)) << number;
+            light->setPeakIntensity(number);
+            EXPECT_TRUE(isNumber(*light)) << number;
+        }
 }
 
 /// A web that the module does not know as one of its own.

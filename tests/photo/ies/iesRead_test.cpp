@@ -49,6 +49,8 @@ TEST_F(IesRead, EachFaultHasItsMessage) {
         {IesText{.horizontal = {0, 0.1, 360}}.text(), "12928; 12935", "the web refuses"},
         {numbers("1 1 1e30 2 1 1 2 0 0 0 1 1 60 0 90 0 1e30 1"), "12935", "product overflows"},
         {IesText{.lumens = -1, .values = "3e38 3e38 3e38"}.text(), "12935", "flux overflows"},
+        {numbers("3 3e38 1 2 1 1 2 0 0 0 1 1 60 0 90 0 0 0"), "12935", "lumens overflow in the dark"},
+        {numbers("1 3e38 1 2 1 1 2 0 0 0 1 1 60 0 90 0 0.01 0"), "12935", "lumens for a candela overflow"},
         {tilted("4 2 0 90 1 1"), "12945 12949 4", "tilt geometry"},
         {tilted("1 1"), "12945 12950 1", "tilt pairs"},
         {tilted("1 2 5 90 1 1"), "12945 12951 5", "tilt first angle"},

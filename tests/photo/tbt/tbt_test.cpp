@@ -78,6 +78,7 @@ TEST_F(Tbt, EachFaultHasItsMessage) {
          "the longest description"},
         {values("Z0 Z0 " + nines.substr(32)), "12998 5 13025 ", "a longer one"},
         {TbtText{.scalars = "0 1 1 1 1 1", .values = "3e38 3e38 3e38 Z0 Z0"}.text(), "12935", "flux overflows"},
+        {"t\n3\n1 1 1\n1e-6 1000 1 1 5 0\n1 2 1\n3e38 Z0\n-1", "12935", "the candela for its flux overflows"},
     };
     refuses(TbtText{}.text(), cases);
 }
