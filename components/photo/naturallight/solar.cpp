@@ -10,16 +10,20 @@ namespace {
 
 constexpr double pi = std::numbers::pi;
 
+/// The sine of a declination. On day 265, half a turn behind day 81, a rounded pi leaves it at 5e-17; at a pole, where
+/// its sign decides on day and night, that is 0.
+double sineOf(double declination, const LatitudeTerms& latitude) {
+    const double sine = std::sin(declination);
+    return latitude.cosine == 0 && std::abs(sine) < 1e-15 ? 0 : sine;
+}
+
 }  // namespace
 
 double equationOfTime(int day) {
     return 0.17 * std::sin(4 * pi * (day - 80) / 373) - 0.129 * std::sin(2 * pi * (day - 8) / 355);
 }
 
-double solarDeclination(int day) {
-    // The sine of whole half turns of a rounded pi is not quite 0.
-    return (day - 81) % 184 == 0 ? 0 : 0.4093 * std::sin(2 * pi * (day - 81) / 368);
-}
+double solarDeclination(int day) { return 0.4093 * std::sin(2 * pi * (day - 81) / 368); }
 
 LatitudeTerms::LatitudeTerms(double latitude) {
     const bool isPole = 2 * std::abs(latitude) >= pi;
@@ -29,7 +33,7 @@ LatitudeTerms::LatitudeTerms(double latitude) {
 
 SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, double solarTime) {
     const double hourAngle = solarTime * pi / 12;  // from midnight
-    const double sineOfDeclination = std::sin(declination);
+    const double sineOfDeclination = sineOf(declination, latitude);
     const double cosineOfDeclination = std::cos(declination);
     const double cosineOfHour = std::cos(hourAngle);
     const double sineOfAltitude =
@@ -41,7 +45,7 @@ SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, d
 }
 
 double sunriseSolarTime(const LatitudeTerms& latitude, double declination) {
-    const double above = std::sin(declination) * latitude.sine;
+    const double above = sineOf(declination, latitude) * latitude.sine;
     const double swing = std::cos(declination) * latitude.cosine;
     // At a pole the swing is 0 and the quotient infinite, unless the sun goes around on the horizon.
     if (std::abs(above) >= swing && above != 0) return above > 0 ? 0 : 12;

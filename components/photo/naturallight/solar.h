@@ -13,7 +13,7 @@ namespace OvPhotometrics {
 /// Solar less mean time in hours, for a day of the year 1..365.
 double equationOfTime(int day);
 
-/// The sun's declination for a day of the year 1..365; exactly 0 on the days 81 and 265.
+/// The sun's declination for a day of the year 1..365.
 double solarDeclination(int day);
 
 /// Sine and cosine of a latitude. From the poles on they are those of the pole, exactly, so that nothing rises or
@@ -32,7 +32,7 @@ struct SolarPosition {
 SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, double solarTime);
 
 /// Solar time of sunrise, 0..12; the sun sets at 24 less it. A sun that stays up rises at 0, one that stays down
-/// at 12. At a pole with the declination 0 it is 6.
+/// at 12. At a pole with the declination 0, on the days 81 and 265, it is 6.
 double sunriseSolarTime(const LatitudeTerms& latitude, double declination);
 
 }  // namespace OvPhotometrics
