@@ -3,6 +3,8 @@
 #include <cmath>
 #include <numbers>
 
+#include "tools/ovphoto/fileAngles.h"
+
 namespace OvTool {
 
 using namespace Ov;
@@ -72,20 +74,6 @@ private:
     Vector _side;
 };
 
-Vector turned(const GeLinearMatrix3<float>& matrix, double x, double y, double z) {
-    return {matrix[0] * x + matrix[3] * y + matrix[6] * z, matrix[1] * x + matrix[4] * y + matrix[7] * z,
-            matrix[2] * x + matrix[5] * y + matrix[8] * z};
-}
-
-/// The photometric axis of a type A or B web in its own frame: what lies at the host's +X, or, where the poles are
-/// turned into the horizontal (type B), at its -Y.
-Vector photometricAxis(const RnPhotoWebData& web) {
-    if (web.hasIdentityOrientation()) return {1, 0, 0};
-    const GeLinearMatrix3<float> matrix = web.getOrientation();
-    const Vector axis = std::abs(matrix[8]) > 0.5 ? turned(matrix, 1, 0, 0) : turned(matrix, 0, -1, 0);
-    return {axis.x, axis.y, 0};
-}
-
 BeamAngles anglesIn(const char* plane, const Curve& curve) {
     const double start = curve.peak();
     const float peak = curve(start);
@@ -95,14 +83,13 @@ BeamAngles anglesIn(const char* plane, const Curve& curve) {
 
 }  // namespace
 
-OvPlot::LightFrame mainFrame(const RnPhotoWebData& web) {
-    if (web.isPsiTruncated()) {
-        const Vector axis = photometricAxis(web);
-        return {axis, {-axis.y, axis.x, 0}, {0, 0, -1}, true};
-    }
-    const GeLinearMatrix3<float> matrix =
-        web.hasIdentityOrientation() ? GeLinearMatrix3<float>() : web.getOrientation();
-    return {turned(matrix, 0, 0, 1), turned(matrix, 1, 0, 0), turned(matrix, 0, 1, 0), false};
+OvPlot::LightFrame mainFrame(RnPhotoWebData& web) {
+    const PhotoFileInfo file = fileInfoOf(web);
+    const double psi = file.psi(0);
+    const Vector towards0{std::cos(psi), std::sin(psi), 0};
+    const Vector towards90{-towards0.y, towards0.x, 0};
+    if (file.lateral) return {towards0, towards90, {0, 0, -1}, true};
+    return {{0, 0, 1}, towards0, towards90, false};
 }
 
 std::vector<BeamAngles> beamAngles(const RnWebIntensityDist& light) {

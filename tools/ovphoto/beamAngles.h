@@ -17,10 +17,10 @@ struct BeamAngles {
     std::optional<OvPlot::AngleSpan> field;
 };
 
-/// Where the light's axis and its two main planes lie in the frame of its web: C0-C180 and C90-C270 of the host
-/// frame, which are those of the file; for a web that ends at its last horizontal angle (types A and B) the
-/// horizontal and the vertical plane through the photometric axis.
-OvPlot::LightFrame mainFrame(const Ov::RnPhotoWebData& web);
+/// Where the light's axis and its two main planes lie in the frame of its web, by the angles of its file: C0-C180 and
+/// C90-C270 are the planes of horizontal 0 and 90 degrees; where planes go through a horizontal axis (types A and B)
+/// they are those of vertical 0 and of horizontal 0 through the axis of the light.
+OvPlot::LightFrame mainFrame(Ov::RnPhotoWebData& web);
 
 /// The angles of the light's two main planes, from its interpolated intensities.
 std::vector<BeamAngles> beamAngles(const Ov::RnWebIntensityDist& light);

@@ -4,10 +4,12 @@
 #include <cmath>
 #include <iostream>
 
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/lightFile.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
+#include "tools/ovphoto/webWarnings.h"
 
 namespace OvTool {
 
@@ -38,17 +40,27 @@ void reportLoss(Json& report, const Conversion& conversion, RnWebIntensityDist& 
     append(report["warnings"], lossWarnings(loss, *conversion.target, light, made));
 }
 
+/// What the output does not hold of the source, the flux of its lamps included.
+Json droppedOf(const ReadResult& source, const LightFile& made) {
+    Json dropped = factsToJson(droppedFacts(source.facts, made.facts));
+    const float lamps = fileInfoOf(*source.web).lampLumens;
+    if (lamps > 0 && !made.traits.holdsLampLumens && made.lampLumens != lamps)
+        dropped.push_back({{"key", "lampLumens"}, {"value", exactNumber(lamps)}});
+    return dropped;
+}
+
 Json convert(const Conversion& conversion, const HostSession& session, const ReadResult& source) {
     Json report = unconverted(conversion, source.reasons());
     if (!source.format.empty()) report["format"] = source.format;
     if (!source.web) return report;
 
     const std::vector<Fact>& facts = source.facts;
-    const WebLight light = lightOf(session, source);
+    const WebLight light = session.lightOf(*source.web);
+    if (const auto warning = negativeFlux(*source.web)) append(report["warnings"], {*warning});
     std::vector<std::string> messages;
     const auto made = writeAnew(conversion, session, source, facts, light, messages);
     if (made && made->light) {
-        report["dropped"] = factsToJson(droppedFacts(facts, made->facts));
+        report["dropped"] = droppedOf(source, *made);
         reportLoss(report, conversion, *light, *made);
     } else if (made) {
         // A save is what it is, readable or not.

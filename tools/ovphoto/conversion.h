@@ -23,7 +23,7 @@ struct Conversion {
 ///     format, target     names of the formats; `format` is null where none was found
 ///     maxCandelaDifference, maxCandelaDifferencePercent, fluxDifferencePercent
 ///                        what was lost, see ConversionLoss; null where nothing was written or it cannot be read
-///     dropped            array of {"key", "value"}: facts that the output does not hold
+///     dropped            array of {"key", "value"}: facts that the output does not hold, and "lampLumens"
 ///     warnings           array of texts
 ///     ok                 whether the output was written
 ///     messages           array of texts: what the reader and the writer reported, and why nothing was written

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <numbers>
+#include <vector>
 
 #include "host/componentManager/castImpl.h"
 #include "tools/ovphoto/numbers.h"
@@ -16,10 +17,10 @@ namespace {
 /// Far enough from the rim of a dark range that rounding does not lead into it: 0.01 degree.
 constexpr float inward = static_cast<float>(std::numbers::pi / 18000);
 
-/// Differences of two lights towards angles in the frame of the first.
-class Difference {
+/// Two lights towards angles in the frame of the first.
+class Pair {
 public:
-    Difference(const RnIntensityDist& source, const RnIntensityDist& output)
+    Pair(const RnIntensityDist& source, const RnIntensityDist& output)
         : _source(source), _output(output), _toHost(source.getOrientation().computeTranspose()) {
         const auto a = source.getOrientation().values();
         const auto b = output.getOrientation().values();
@@ -27,19 +28,27 @@ public:
             std::equal(a.begin(), a.end(), b.begin(), [](float x, float y) { return std::abs(x - y) < 1e-5F; });
     }
 
-    double operator()(float theta, float psi) const {
-        if (_sameFrame) return apart(_source.localIntensity(theta, psi), _output.localIntensity(theta, psi));
+    struct Candela {
+        double source, output;
+        double apart() const { return std::abs(source - output); }
+    };
+    Candela at(float theta, float psi) const {
+        if (_sameFrame) return {_source.localIntensity(theta, psi), _output.localIntensity(theta, psi)};
         const double across = std::sin(double(theta));
         const GeVector3<float> local{static_cast<float>(across * std::cos(double(psi))),
                                      static_cast<float>(across * std::sin(double(psi))),
                                      static_cast<float>(std::cos(double(theta)))};
         const GeVector3<float> host = _toHost * local;
-        return apart(_source.intensityAt(host), _output.intensityAt(host));
+        return {_source.intensityAt(host), _output.intensityAt(host)};
+    }
+    double source(float theta, float psi) const { return _source.localIntensity(theta, psi); }
+    /// Whether both are the same all around one axis.
+    bool axial() const {
+        return _sameFrame && _source.getSymmetry() == PhotoWebSymmetry::Axial &&
+               _output.getSymmetry() == PhotoWebSymmetry::Axial;
     }
 
 private:
-    static double apart(float a, float b) { return std::abs(double(a) - b); }
-
     const RnIntensityDist& _source;
     const RnIntensityDist& _output;
     GeLinearMatrix3<float> _toHost;
@@ -69,31 +78,117 @@ LitRange psisOf(const RnPhotoWebData& web) {
     return {web.getPsiRange(), dark && web.getSymmetry() == PhotoWebSymmetry::Full, dark};
 }
 
-double overGrid(const RnPhotoWebData& web, const Difference& difference) {
+/// Where the horizontal range of a web ends that goes on behind its last plane; else its last plane.
+float endOfPsis(const RnPhotoWebData& web) {
+    const float last = web.getPsiRange().last;
+    const auto end = [&](double turns) {
+        return std::max(last, static_cast<float>(turns * 2 * std::numbers::pi));
+    };
+    if (web.isPsiTruncated()) return last;
+    switch (web.getSymmetry()) {
+        case PhotoWebSymmetry::Full:
+            return end(1);
+        case PhotoWebSymmetry::Half:
+            return end(0.5);
+        case PhotoWebSymmetry::Quarter:
+            return end(0.25);
+        case PhotoWebSymmetry::Axial:
+            break;
+    }
+    return last;
+}
+
+/// The angles and what lies midway between them.
+std::vector<float> withMidpoints(const std::vector<float>& angles) {
+    std::vector<float> all;
+    for (const float angle : angles) {
+        if (!all.empty() && angle > all.back()) all.push_back((all.back() + angle) / 2);
+        all.push_back(angle);
+    }
+    return all;
+}
+
+std::vector<float> thetaList(const RnPhotoWebData& web) {
+    std::vector<float> thetas;
+    for (int i = 0; i < web.getThetaCount(); ++i) thetas.push_back(web.getTheta(i));
+    return thetas;
+}
+
+std::vector<float> psiList(const RnPhotoWebData& web) {
+    std::vector<float> psis;
+    for (int j = 0; j < web.getPsiCount(); ++j) psis.push_back(web.getPsi(j));
+    if (const float end = endOfPsis(web); end > psis.back()) psis.push_back(end);
+    return psis;
+}
+
+bool isPole(float theta) { return std::abs(std::sin(double(theta))) < 1e-6; }
+
+/// At a pole a web may hold another value in each plane, and darkness between them: what another light gives there
+/// is as good as any value in that range.
+double apartAtPole(const RnPhotoWebData& web, const Pair& lights, int thetaIndex) {
+    const float theta = web.getTheta(thetaIndex);
+    std::vector<double> candela;
+    for (int j = 0; j < web.getPsiCount(); ++j) candela.push_back(lights.source(theta, web.getPsi(j)));
+    if (web.isPsiTruncated()) candela.push_back(0);
+    const auto [least, most] = std::minmax_element(candela.begin(), candela.end());
+    const double output = lights.at(theta, 0).output;
+    return std::max({0.0, *least - output, output - *most});
+}
+
+double overGrid(const RnPhotoWebData& web, const Pair& lights) {
     const LitRange thetas = thetasOf(web);
     const LitRange psis = psisOf(web);
+    const std::vector<float> allThetas = withMidpoints(thetaList(web));
     double largest = 0;
-    for (int j = 0; j < web.getPsiCount(); ++j) {
-        const float psi = web.getPsi(j);
+    for (const float psi : withMidpoints(psiList(web))) {
         const float innerPsi = psis.movedIn(psi);
-        for (int i = 0; i < web.getThetaCount(); ++i) {
-            const float theta = web.getTheta(i);
+        for (const float theta : allThetas) {
+            if (isPole(theta)) continue;
             const float innerTheta = thetas.movedIn(theta);
-            double here = difference(theta, psi);
+            double here = lights.at(theta, psi).apart();
             const bool onRim = innerTheta != theta || innerPsi != psi;
-            if (onRim && here > largest) here = std::min(here, difference(innerTheta, innerPsi));
+            if (onRim && here > largest) here = std::min(here, lights.at(innerTheta, innerPsi).apart());
             largest = std::max(largest, here);
         }
     }
+    for (const int end : {0, web.getThetaCount() - 1})
+        if (isPole(web.getTheta(end))) largest = std::max(largest, apartAtPole(web, lights, end));
     return largest;
 }
 
 /// For lights that are the same all around their axis.
-double fromAxis(const Difference& difference) {
+double fromAxis(const Pair& lights) {
     double largest = 0;
     for (int step = 0; step <= 360; ++step)
-        largest = std::max(largest, difference(toRadians(static_cast<float>(step) / 2), 0));
+        largest = std::max(largest, lights.at(toRadians(static_cast<float>(step) / 2), 0).apart());
     return largest;
+}
+
+/// What both give off, up to a factor that is the same: sums over the middles of cells that no rim of the source
+/// cuts in theta.
+Pair::Candela gaveOff(const Pair& lights, std::vector<float> edges, int leastParts) {
+    constexpr double widest = std::numbers::pi / 180;
+    edges.push_back(0);
+    edges.push_back(static_cast<float>(std::numbers::pi));
+    std::sort(edges.begin(), edges.end());
+    const int planes = lights.axial() ? 1 : 180;
+    Pair::Candela sum{0, 0};
+    for (std::size_t k = 1; k < edges.size(); ++k) {
+        const double width = double(edges[k]) - edges[k - 1];
+        const int parts = std::max(leastParts, static_cast<int>(std::ceil(width / widest)));
+        for (int part = 0; part < parts && width > 0; ++part) {
+            const double theta = edges[k - 1] + width * (part + 0.5) / parts;
+            const double weight = std::sin(theta) * width / parts / planes;
+            for (int plane = 0; plane < planes; ++plane) {
+                const double psi =
+                    2 * std::numbers::pi * (plane + 0.37) / planes;  // off the rims of whole degrees
+                const auto here = lights.at(static_cast<float>(theta), static_cast<float>(psi));
+                sum.source += weight * here.source;
+                sum.output += weight * here.output;
+            }
+        }
+    }
+    return sum;
 }
 
 /// `part` in per cent of `whole`; where that is 0, all or nothing.
@@ -103,11 +198,15 @@ double percent(double part, double whole) { return whole > 0 ? part / whole * 10
 
 ConversionLoss measureLoss(RnIntensityDist& source, const RnIntensityDist& output) {
     const auto withWeb = rnQuery<RnWebIntensityDist>(&source);
-    const Difference difference(source, output);
+    const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
+    const Pair lights(source, output);
+    const AngleRange thetas = source.getThetaRange();
+    const Pair::Candela sums =
+        gaveOff(lights, web ? thetaList(*web) : std::vector{thetas.first, thetas.last}, web ? 2 : 64);
     ConversionLoss loss;
-    loss.candela = withWeb ? overGrid(*withWeb->getWeb(), difference) : fromAxis(difference);
+    loss.candela = web ? overGrid(*web, lights) : fromAxis(lights);
     loss.candelaPercent = percent(loss.candela, source.getPeakIntensity());
-    loss.fluxPercent = percent(double(output.getFlux()) - source.getFlux(), source.getFlux());
+    loss.fluxPercent = percent(sums.output - sums.source, sums.source);
     return loss;
 }
 

@@ -8,11 +8,11 @@ namespace OvTool {
 struct ConversionLoss {
     double candela = 0;         // the largest difference in the host frame
     double candelaPercent = 0;  // of the first light's peak
-    double fluxPercent = 0;     // of the first light's flux, positive where the other gives more
+    double fluxPercent = 0;     // of what the first light gives off, positive where the other gives more
 };
 
-/// Compares over the grid of the source's web or, without one, every half degree from the axis. Both give true
-/// candela and flux.
+/// Compares the candela of two lights, those of the source at the angles of its web and midway between them or,
+/// without a web, every half degree from the axis; and what both give off in all, integrated alike.
 ConversionLoss measureLoss(Ov::RnIntensityDist& source, const Ov::RnIntensityDist& output);
 
 }  // namespace OvTool

@@ -106,6 +106,7 @@ void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string
     }
     result.format = formatName(*builder);
     result.classId = builder->getClassId();
+    if (const auto format = rnQuery<RnPhotoFormat>(builder.get())) result.traits = format->getTraits();
     const std::wstring path = fromUtf8(isStandardStream(result.file) ? "stdin" : result.file);
     auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&result](const OvPhotometrics::FileFact& fact) {
         result.facts.push_back({fact.key, fact.text});
@@ -113,6 +114,14 @@ void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string
     const auto object =
         functions().importWithFacts(io, result.classId, pathStem(path).c_str(), pathFolder(path).c_str(), collect);
     result.web = rnCast<RnPhotoWebData>(object.get());
+}
+
+RnRef<RnWebIntensityDist> HostSession::lightOf(RnPhotoWebData& web) const {
+    const auto file = rnQuery<RnPhotoFileWeb>(&web);
+    const auto inCandela = file ? file->inCandela() : RnRef<RnPhotoWebData>::share(&web);
+    auto light = distribute(*inCandela, inCandela->getLumens());
+    light->setPeakIntensity(inCandela->getMaxCandela());
+    return light;
 }
 
 RnRef<RnWebIntensityDist> HostSession::distribute(RnPhotoWebData& web, float lumens) const {

@@ -7,6 +7,7 @@
 #include "host/platform/module.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
+#include "ovphoto/photoFile.h"
 
 namespace OvTool {
 
@@ -21,6 +22,7 @@ struct ReadResult {
     std::string file;                   // as the user gave it
     std::string format;                 // name of the reader's format ("IES"); empty when none was found
     Ov::RnUid classId{};                // of the format's webs
+    Ov::PhotoFormatTraits traits;       // of the format
     Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
     std::vector<Fact> facts;            // in the order of the file; none when it was refused
     std::vector<std::string> messages;  // texts that the reader reported, in order
@@ -53,7 +55,10 @@ public:
     /// The same of bytes that are, or are to be, those of the file.
     ReadResult readBytes(const std::string& bytes, const std::string& file, const std::string& as) const;
 
-    /// A web distribution of the web that gives off `lumens`.
+    /// The light of a web in candela, whatever the unit of its file; its flux is that of the lamps or, where the
+    /// file says nothing of them, the luminaire's. Everything that the tool shows, draws and writes is this light.
+    Ov::RnRef<Ov::RnWebIntensityDist> lightOf(Ov::RnPhotoWebData& web) const;
+    /// A web distribution as hosts save it: the web that gives off `lumens`.
     Ov::RnRef<Ov::RnWebIntensityDist> distribute(Ov::RnPhotoWebData& web, float lumens) const;
 
 private:

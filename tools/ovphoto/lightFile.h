@@ -9,19 +9,18 @@
 #include "tools/ovphoto/hostSession.h"
 #include "tools/ovphoto/targetFormat.h"
 
-// Between files and lights whose candela and flux are the true ones, whatever the unit of a format.
+// Between files and lights.
 
 namespace OvTool {
 
 using WebLight = Ov::RnRef<Ov::RnWebIntensityDist>;
 
-/// The light of a file that was read. TBT files hold candela for a reference flux.
-WebLight lightOf(const HostSession& session, const ReadResult& source);
-
 /// A light as a file that is not yet in its place.
 struct LightFile {
     std::string bytes;
-    WebLight light;           // as the format's reader reads it; null when it refuses to
+    WebLight light;        // as the format's reader reads it, in candela; null when it refuses to
+    float lampLumens = 0;  // that it stands for; 0: none
+    Ov::PhotoFormatTraits traits;
     std::string refusal;      // then why
     std::vector<Fact> facts;  // as they are read
 };
@@ -33,6 +32,6 @@ std::optional<LightFile> makeFile(const HostSession& session, const std::string&
 
 /// What a user should know of a file that differs from the light by `loss`.
 std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFormat& target,
-                                      const Ov::RnIntensityDist& light, const LightFile& file);
+                                      const Ov::RnIntensityDist& light, const LightFile& made);
 
 }  // namespace OvTool

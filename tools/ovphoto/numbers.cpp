@@ -47,6 +47,16 @@ double toDegrees(float radians) {
     return found.value_or(degrees);
 }
 
+double shortestNear(double value, const std::function<bool(float)>& fits) {
+    for (int decimals = 0; decimals <= 9; ++decimals) {
+        const std::string text = fixedNumber(value, decimals);
+        double candidate = 0;
+        std::from_chars(text.data(), text.data() + text.size(), candidate);
+        if (fits(static_cast<float>(candidate))) return candidate;
+    }
+    return value;
+}
+
 std::optional<float> parseFloat(std::string_view text) {
     float value;
     const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), value);

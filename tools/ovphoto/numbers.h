@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -13,6 +14,9 @@ float toRadians(float degrees);
 /// The degrees with the fewest digits, 9 at most, that give this angle back (30, not 30.000002): as a float, in
 /// double, or both where that can be.
 double toDegrees(float radians);
+
+/// The number nearest to `value` with the fewest decimals, 9 at most, whose float `fits`; `value` where none does.
+double shortestNear(double value, const std::function<bool(float)>& fits);
 
 /// A finite decimal number that fits a float and is the whole text.
 std::optional<float> parseFloat(std::string_view text);

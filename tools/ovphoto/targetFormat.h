@@ -12,7 +12,6 @@ struct TargetFormat {
     const char* name;       // "IES", as formatName gives it
     const char* extension;  // "ies"
     decltype(&OvPhotometrics::NumberedFunctions::writeIes) write;
-    bool holdsFlux;
 };
 
 std::span<const TargetFormat> targetFormats();

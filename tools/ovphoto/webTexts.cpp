@@ -1,9 +1,11 @@
 #include "tools/ovphoto/webTexts.h"
 
+#include <algorithm>
 #include <cmath>
-#include <numbers>
+#include <limits>
 
 #include "host/platform/path.h"
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
@@ -12,26 +14,24 @@ using namespace Ov;
 
 namespace {
 
-struct SymmetryText {
-    const char* name;
-    const char* meaning;
-};
+std::string degreesText(double degrees) { return shortNumber(degrees) + " deg"; }
 
-SymmetryText symmetryText(PhotoWebSymmetry symmetry) {
+std::string meaningOf(PhotoWebSymmetry symmetry, const PhotoFileInfo& file) {
+    const auto plane = [&](float psi) { return horizontalOf(file, toRadians(psi)); };
     switch (symmetry) {
         case PhotoWebSymmetry::Full:
-            return {"Full", "no symmetry"};
+            return "no symmetry";
         case PhotoWebSymmetry::Half:
-            return {"Half", "mirrored at the plane of psi 0 and 180 deg"};
+            return "mirrored at the plane of horizontal " + shortNumber(plane(0)) +
+                   (file.lateral ? "" : " and " + shortNumber(plane(180))) + " deg";
         case PhotoWebSymmetry::Quarter:
-            return {"Quarter", "mirrored at the planes of psi 0 and 90 deg"};
+            return "mirrored at the planes of horizontal " + shortNumber(plane(0)) + " and " +
+                   shortNumber(plane(90)) + " deg";
         case PhotoWebSymmetry::Axial:
-            return {"Axial", "the same all around the axis"};
+            return "the same all around the axis";
     }
-    return {"Unknown", "unknown"};
+    return "unknown";
 }
-
-std::string degreesText(double degrees) { return shortNumber(degrees) + " deg"; }
 
 std::string rangeText(const std::vector<double>& angles) {
     const std::string count = std::to_string(angles.size()) + (angles.size() == 1 ? " angle" : " angles");
@@ -40,7 +40,7 @@ std::string rangeText(const std::vector<double>& angles) {
 }
 
 /// Where the first of the largest values stands.
-std::string peakPlace(const RnPhotoWebData& web) {
+std::string peakPlace(RnPhotoWebData& web) {
     int bestTheta = 0;
     int bestPsi = 0;
     for (int j = 0; j < web.getPsiCount(); ++j) {
@@ -50,21 +50,42 @@ std::string peakPlace(const RnPhotoWebData& web) {
             bestPsi = j;
         }
     }
-    return "theta " + degreesText(toDegrees(web.getTheta(bestTheta))) + ", psi " +
-           degreesText(toDegrees(web.getPsi(bestPsi)));
+    const PhotoFileInfo file = fileInfoOf(web);
+    return "vertical " + degreesText(verticalOf(file, web.getTheta(bestTheta))) + ", horizontal " +
+           degreesText(horizontalOf(file, web.getPsi(bestPsi)));
 }
 
-std::string orientationText(const RnPhotoWebData& web) {
+std::string orientationText(RnPhotoWebData& web) {
     const GeLinearMatrix3<float> matrix = web.getOrientation();
     if (web.hasIdentityOrientation()) return "not turned: host and file share their frame";
     if (std::abs(matrix[8]) < 0.5F) return "turned: the poles lie in the host's horizontal plane";
-    const double turn = std::round(std::atan2(matrix[1], matrix[0]) * 18000 / std::numbers::pi) / 100;
-    return "turned about the axis: the host's psi 0 is psi " + degreesText(turn < 0 ? turn + 360 : turn) + " here";
+    const auto turn = static_cast<float>(std::atan2(matrix[1], matrix[0]));  // of the host's psi 0
+    const double angle = fileInfoOf(web).horizontal(turn);
+    const double rounded = std::round(angle * 100) / 100 + 0.0;
+    return "the host's psi 0 is horizontal " + degreesText(rounded < 0 ? rounded + 360 : rounded) + " of the file";
+}
+
+std::string luminaireText(RnPhotoWebData& web) {
+    const auto ratio = outputRatio(web);
+    return shortNumber(luminaireLumensOf(web)) + " lm" +
+           (ratio ? ", " + fixedNumber(*ratio * 100, 1) + " % of the lamps'" : "");
 }
 
 }  // namespace
 
-const char* symmetryName(PhotoWebSymmetry symmetry) { return symmetryText(symmetry).name; }
+const char* symmetryName(PhotoWebSymmetry symmetry) {
+    switch (symmetry) {
+        case PhotoWebSymmetry::Full:
+            return "Full";
+        case PhotoWebSymmetry::Half:
+            return "Half";
+        case PhotoWebSymmetry::Quarter:
+            return "Quarter";
+        case PhotoWebSymmetry::Axial:
+            return "Axial";
+    }
+    return "Unknown";
+}
 
 std::vector<double> thetasOf(const RnPhotoWebData& web) {
     std::vector<double> angles;
@@ -85,24 +106,31 @@ std::vector<std::string> filesOf(const RnPhotoWebData& web) {
     return files;
 }
 
-/// What the values of the file are; webs hold them as they stand there.
-const char* unitOf(const ReadResult& result) {
-    return result.format == "NIMB" || result.format == "TBT" ? "cd/klm" : "cd";
+const char* unitName(PhotoValueUnit unit) { return unit == PhotoValueUnit::candela ? "cd" : "cd/klm"; }
+
+float peakCandela(RnPhotoWebData& web) {
+    return std::min(web.getMaxCandela() * fileInfoOf(web).candelaFactor, std::numeric_limits<float>::max());
+}
+
+std::optional<double> outputRatio(RnPhotoWebData& web) {
+    const float lamps = fileInfoOf(web).lampLumens;
+    return lamps > 0 ? std::optional(double{luminaireLumensOf(web)} / lamps) : std::nullopt;
 }
 
 std::vector<std::pair<std::string, std::string>> webTexts(const ReadResult& result) {
-    const RnPhotoWebData& web = *result.web;
-    const SymmetryText symmetry = symmetryText(web.getSymmetry());
+    RnPhotoWebData& web = *result.web;
+    const PhotoFileInfo file = fileInfoOf(web);
     std::vector<std::pair<std::string, std::string>> texts{
         {"Format", result.format},
         {"Name", toUtf8(web.getName())},
-        {"Symmetry", std::string(symmetry.name) + ": " + symmetry.meaning},
-        {"Vertical", rangeText(thetasOf(web))},
-        {"Horizontal", rangeText(psisOf(web)) + (web.isPsiTruncated() ? ", dark beyond" : "")},
-        {"Peak", shortNumber(web.getMaxCandela()) + " " + unitOf(result) + " at " + peakPlace(web)},
-        {"Total flux", shortNumber(web.getLumens()) + " lm"},
-        {"Orientation", orientationText(web)}};
-    for (const std::string& file : filesOf(web)) texts.emplace_back("Needs file", file);
+        {"Symmetry", symmetryName(web.getSymmetry()) + (": " + meaningOf(web.getSymmetry(), file))},
+        {"Vertical", rangeText(verticalsOf(web))},
+        {"Horizontal", rangeText(horizontalsOf(web)) + (web.isPsiTruncated() ? ", dark beyond" : "")},
+        {"Peak", shortNumber(peakCandela(web)) + " cd at " + peakPlace(web)}};
+    if (file.lampLumens > 0) texts.emplace_back("Lamp flux", shortNumber(file.lampLumens) + " lm");
+    texts.emplace_back("Luminaire flux", luminaireText(web));
+    texts.emplace_back("Orientation", orientationText(web));
+    for (const std::string& needed : filesOf(web)) texts.emplace_back("Needs file", needed);
     return texts;
 }
 

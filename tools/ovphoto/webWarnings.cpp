@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
@@ -54,13 +55,13 @@ bool isUnturnedTypeB(const RnPhotoWebData& web, const std::vector<Fact>& facts) 
 }
 
 /// How far the light's last plane lies from where the symmetry wants it, beyond what a step may be.
-std::optional<std::string> earlyEnd(const RnPhotoWebData& web) {
+std::optional<std::string> earlyEnd(RnPhotoWebData& web) {
     const int count = web.getPsiCount();
     if (web.isPsiTruncated() || web.getSymmetry() == PhotoWebSymmetry::Axial || count < 2) return {};
     const double last = toDegrees(web.getPsi(count - 1));
-    const double end = web.getSymmetry() == PhotoWebSymmetry::Full   ? 360
-                       : web.getSymmetry() == PhotoWebSymmetry::Half ? 180
-                                                                     : 90;
+    const float end = web.getSymmetry() == PhotoWebSymmetry::Full   ? 360
+                      : web.getSymmetry() == PhotoWebSymmetry::Half ? 180
+                                                                    : 90;
     double allowed = tolerance;
     if (web.getSymmetry() == PhotoWebSymmetry::Full) {
         double step = 0;
@@ -69,11 +70,18 @@ std::optional<std::string> earlyEnd(const RnPhotoWebData& web) {
         allowed = 1.5 * step;
     }
     if (end - last <= allowed) return {};
-    return "the horizontal angles end at " + shortNumber(last) + " deg: up to " + shortNumber(end) +
-           " deg the values are extrapolated";
+    const PhotoFileInfo file = fileInfoOf(web);
+    return "the horizontal angles end at " + shortNumber(horizontalOf(file, web.getPsi(count - 1))) +
+           " deg: up to " + shortNumber(horizontalOf(file, toRadians(end))) + " deg the values are extrapolated";
 }
 
 }  // namespace
+
+std::optional<std::string> negativeFlux(RnPhotoWebData& web) {
+    const float lumens = luminaireLumensOf(web);
+    if (!(lumens < 0)) return {};
+    return "the flux of the luminaire is negative: the values integrate to " + shortNumber(lumens) + " lm";
+}
 
 std::vector<std::string> webWarnings(const ReadResult& result) {
     std::vector<std::string> warnings;
@@ -81,6 +89,7 @@ std::vector<std::string> webWarnings(const ReadResult& result) {
         if (warning) warnings.push_back(std::move(*warning));
     };
     add(negativeValues(*result.web));
+    add(negativeFlux(*result.web));
     add(darkness(result));
     if (hasTilt(result.facts)) add("the tilt data is read but not applied");
     if (isUnturnedTypeB(*result.web, result.facts))

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -7,8 +8,11 @@
 
 namespace OvTool {
 
-/// What a user should know of a file that was read without a fault: negative candela, a web that is dark, tilt
+/// What a user should know of a file that was read without a fault: negative candela or flux, a web that is dark, tilt
 /// data that is not applied, a type B file that stays unturned, planes that end early.
 std::vector<std::string> webWarnings(const ReadResult& result);
+
+/// The warning of a flux that is integrated and comes out below 0.
+std::optional<std::string> negativeFlux(Ov::RnPhotoWebData& web);
 
 }  // namespace OvTool

@@ -11,7 +11,7 @@ constexpr double visibleShare = 0.005;  // of the peak: less is dark
 }  // namespace
 
 void drawCartesian(Canvas& canvas, const Diagram& diagram) {
-    const Box room = drawCaption(canvas, diagram, "Luminous intensity in " + diagram.unit + " over gamma", true);
+    const Box room = drawCaption(canvas, diagram, "Luminous intensity in cd over gamma", true);
     const std::vector<PlaneCurve> curves = planeCurves(diagram);
     double most = 0;
     double behind = 0;

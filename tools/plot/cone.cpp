@@ -90,7 +90,6 @@ void drawCone(Canvas& canvas, const Diagram& diagram) {
 
     const double axial = subject.intensity(0, 0);
     const double largest = largestIlluminance(subject);
-    const std::string lux = illuminanceUnit(diagram.unit);
     const auto width = [&](std::size_t plane) {
         return [beam = beamOf(subject, plane)](double distance) { return diameterText(beam, distance); };
     };
@@ -101,8 +100,8 @@ void drawCone(Canvas& canvas, const Diagram& diagram) {
               {{"Distance", "m", tickLabel},
                {planeName(subject, 0), "width, m", width(0)},
                {planeName(subject, 90), "width, m", width(1)},
-               {"On axis", lux, illuminance(axial)},
-               {"Largest", lux, illuminance(largest)}});
+               {"On axis", "lx", illuminance(axial)},
+               {"Largest", "lx", illuminance(largest)}});
 }
 
 }  // namespace OvPlot

@@ -28,7 +28,6 @@ struct Diagram {
     std::string title;
     std::vector<Subject> subjects;      // one at least
     std::vector<double> planes{0, 90};  // C of the planes shown, each with C + 180
-    std::string unit = "cd";            // of the intensities: cd or cd/klm
     std::optional<double> height;       // of the light over the plane that it lights, or the farthest one, m
 };
 

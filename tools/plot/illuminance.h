@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cmath>
-#include <string>
 
 #include "tools/plot/diagram.h"
 
@@ -21,10 +20,6 @@ inline double largestIlluminance(const Subject& subject) {
         for (double gamma = 0; gamma < 90; gamma += 0.5)
             most = std::max(most, horizontalIlluminance(subject, gamma, c, 1));
     return most;
-}
-
-inline std::string illuminanceUnit(const std::string& intensityUnit) {
-    return intensityUnit == "cd" ? "lx" : "lx/klm";
 }
 
 }  // namespace OvPlot

@@ -88,10 +88,9 @@ void drawLuminaire(Canvas& canvas, Point place) {
 void drawIsolux(Canvas& canvas, const Diagram& diagram) {
     const Subject& subject = diagram.subjects.front();
     const double height = diagram.height.value_or(3);
-    const Box room = drawCaption(canvas, diagram,
-                                 "Illuminance in " + illuminanceUnit(diagram.unit) + " on a plane " +
-                                     tickLabel(height) + " m below (+), seen from above",
-                                 false);
+    const Box room = drawCaption(
+        canvas, diagram,
+        std::string("Illuminance in lx on a plane ") + tickLabel(height) + " m below (+), seen from above", false);
     const double most = largestIlluminance(subject) / (height * height);
     const std::vector<double> levels = roundLevels(most, levelCount);
     const double reach = height * (levels.empty() ? 1 : reachOf(subject, height, levels.back()));

@@ -120,7 +120,7 @@ std::vector<Path> pathsOf(const std::vector<PlaneCurve>& curves, double scale) {
 }  // namespace
 
 void drawPolar(Canvas& canvas, const Diagram& diagram) {
-    const Box room = drawCaption(canvas, diagram, "Luminous intensity in " + diagram.unit, true);
+    const Box room = drawCaption(canvas, diagram, "Luminous intensity in cd", true);
     const std::vector<PlaneCurve> curves = planeCurves(diagram);
     const Axis axis = axisTo(largestOf(curves), 5);
     const Layout layout = layoutOf(curves, room);

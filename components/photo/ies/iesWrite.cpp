@@ -70,7 +70,7 @@ bool iesRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, IesFileRecor
                                                              : IesPhotometricType::B;
     rec.grid = std::move(file.grid);
     rec.candelaMultiplier = scaleForFile(rec.grid, 1);
-    rec.lumensPerLamp = dist.getFlux();
+    if (const float flux = dist.getFlux(); flux > 0) rec.lumensPerLamp = flux;
     return true;
 }
 

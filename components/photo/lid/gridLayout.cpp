@@ -98,7 +98,8 @@ bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout
     layout = {.symmetry = oneSided ? PhotoWebSymmetry::Half : PhotoWebSymmetry::Full,
               .columns = grid.horizontalCount,
               .verticalShift = shift,
-              .horizontalShift = oneSided ? 0 : -h0};
+              .horizontalShift = oneSided ? 0 : -h0,
+              .lateral = true};
     return true;
 }
 
@@ -115,6 +116,10 @@ void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout
         photoWebRecordSetPsi(rec, j, toRadians(psi < -0.5 ? psi + 360 : psi));  // planes from 270 run on through 0
         photoWebRecordSetRow(rec, j, &grid.candelas[grid.index(0, j)], factor);
     }
+    rec.file.verticalShift = layout.verticalShift;
+    rec.file.horizontalShift = layout.horizontalShift;
+    rec.file.lateral = layout.lateral;
+    if (layout.columns < grid.horizontalCount) rec.file.closingPlane = grid.horizontalAngles.back();
 }
 
 GeLinearMatrix3<float> turnedBy(float degrees) {

@@ -14,6 +14,7 @@ struct WebLayout {
     int columns = 0;            // horizontal angles kept
     float verticalShift = 0;    // degrees, added to every vertical angle
     float horizontalShift = 0;  // degrees; not 0: the web is turned by as much
+    bool lateral = false;       // planes through a horizontal axis
 };
 
 /// The tolerance of a format, in degrees, and the messages for what its layouts refuse.
@@ -40,7 +41,7 @@ bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& la
 /// False after a message.
 bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout& layout);
 
-/// Sets angles and candelas of a record that was started for `layout`, candelas times `factor`.
+/// Sets angles, candelas times `factor`, and how the file counts its angles, of a record started for `layout`.
 void fillWebRecord(PhotoWebRecord& rec, const CandelaGrid& grid, const WebLayout& layout, float factor);
 
 /// The turn about the vertical axis by an angle in degrees.

@@ -45,14 +45,6 @@ struct Placement {
     float horizontalShift;
 };
 
-/// Whether a web has the orientation that `turned`, a record's, gives it.
-bool isTurned(const Ov::RnPhotoWebData& web, const GeLinearMatrix3<float>& turned) {
-    const auto expected = turned.computeTranspose();
-    const auto orientation = web.getOrientation();
-    return std::equal(expected.values().begin(), expected.values().end(), orientation.values().begin(),
-                      [](float a, float b) { return std::fabs(a - b) < 1e-5f; });
-}
-
 /// What a reader of planes through the vertical axis adds to the horizontal angles, if it can give this web.
 std::optional<float> polarShift(const Ov::RnPhotoWebData& web, float last, const OwnGridRules& rules) {
     const auto about = [&](float a, float b) { return std::fabs(a - b) <= rules.tolerance; };
@@ -115,6 +107,13 @@ void copyCandelas(CandelaGrid& grid, const Ov::RnPhotoWebData& web, float factor
 }
 
 }  // namespace
+
+bool isTurned(const Ov::RnPhotoWebData& web, const GeLinearMatrix3<float>& turned) {
+    const auto expected = turned.computeTranspose();
+    const auto orientation = web.getOrientation();
+    return std::equal(expected.values().begin(), expected.values().end(), orientation.values().begin(),
+                      [](float a, float b) { return std::fabs(a - b) < 1e-5f; });
+}
 
 bool ownGrid(Ov::RnIntensityDist& dist, const OwnGridRules& rules, FileGrid& out) {
     const auto web = webOf(dist);

@@ -23,6 +23,9 @@ struct OwnGridRules {
     bool uprightTurned;     // an upright grid may have angles to both sides of 0
 };
 
+/// Whether a web has the orientation that `turned`, a record's, gives it.
+bool isTurned(const Ov::RnPhotoWebData& web, const GeLinearMatrix3<float>& turned);
+
 /// Copies the grid of the web that `dist` holds, shifted back to where the format's reader shifts it from; a full
 /// circle is closed with plane 360. False when there is no web, an angle is no multiple of 0.01 degree or the
 /// format cannot hold the web's layout or orientation. Throws std::bad_alloc.

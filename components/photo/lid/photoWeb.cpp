@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <limits>
 #include <new>
 #include <vector>
 
@@ -106,38 +107,38 @@ private:
     std::vector<double> _sines;
 };
 
-std::vector<float> integrateRows(const PhotoWebRecord& rec, const float* values) {
+std::vector<float> integrateRows(const WebGrid& grid) {
     constexpr int together = 8;
-    const ThetaIntegral integral(rec.nthetas, rec.thetas.get());
+    const ThetaIntegral integral(grid.nthetas, grid.thetas);
     std::vector<float> rows;
-    rows.reserve(count(rec.npsis));
+    rows.reserve(count(grid.npsis));
     const auto add = [&](const auto& sums) { rows.insert(rows.end(), sums.begin(), sums.end()); };
     int j = 0;
-    for (; j + together <= rec.npsis; j += together)
-        add(integral.of<together>(values + count(j) * count(rec.nthetas)));
-    for (; j < rec.npsis; ++j) add(integral.of<1>(values + count(j) * count(rec.nthetas)));
+    const auto row = [&] { return grid.values + count(j) * count(grid.nthetas); };
+    for (; j + together <= grid.npsis; j += together) add(integral.of<together>(row()));
+    for (; j < grid.npsis; ++j) add(integral.of<1>(row()));
     return rows;
 }
 
 /// Flux in lumens of a grid whose values are relative to a peak of `maxCandela`.
-float integrateFlux(const PhotoWebRecord& rec, const float* values, float maxCandela) {
-    const std::vector<float> rows = integrateRows(rec, values);
+float integrateFlux(const WebGrid& grid, float maxCandela) {
+    const std::vector<float> rows = integrateRows(grid);
     const float first = rows.front();
     const float last = rows.back();
     float sum = 0;
-    for (int j = 1; j < rec.npsis; ++j)
-        sum += (rows[count(j)] + rows[count(j - 1)]) * (rec.psis[j] - rec.psis[j - 1]);
-    const float lastPsi = rec.psis[rec.npsis - 1];
-    switch (rec.symmetry) {
+    for (int j = 1; j < grid.npsis; ++j)
+        sum += (rows[count(j)] + rows[count(j - 1)]) * (grid.psis[j] - grid.psis[j - 1]);
+    const float lastPsi = grid.psis[grid.npsis - 1];
+    switch (grid.symmetry) {
         case PhotoWebSymmetry::Full:
-            if (!rec.psiTruncated) sum += ((rec.psis[0] + twoPi) - lastPsi) * (last + first);
+            if (!grid.psiTruncated) sum += ((grid.psis[0] + twoPi) - lastPsi) * (last + first);
             break;
         case PhotoWebSymmetry::Half:
-            if (!rec.psiTruncated) sum += 2 * last * (pi - lastPsi);
+            if (!grid.psiTruncated) sum += 2 * last * (pi - lastPsi);
             sum = 2 * sum;
             break;
         case PhotoWebSymmetry::Quarter:
-            if (!rec.psiTruncated) sum += 2 * last * (halfPi - lastPsi);
+            if (!grid.psiTruncated) sum += 2 * last * (halfPi - lastPsi);
             sum = 4 * sum;
             break;
         case PhotoWebSymmetry::Axial:
@@ -171,6 +172,12 @@ unsigned refusedPsiRange(const PhotoWebRecord& rec) {
             return rec.npsis != 1 ? messages::axialCount : 0;
     }
     return 0;
+}
+
+/// The value, or the nearest that is finite; 0 for none.
+float held(float value) {
+    constexpr float most = std::numeric_limits<float>::max();
+    return value == value ? std::clamp(value, -most, most) : 0;
 }
 
 unsigned refusedAngles(const PhotoWebRecord& rec) {
@@ -268,7 +275,10 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     if (rec.maxCandela > 0) {
         std::transform(rec.candelas.get(), rec.candelas.get() + values, candelas.get(),
                        [peak = rec.maxCandela](float value) { return value / peak; });
-        lumens = rec.lumens > 0 ? rec.lumens : integrateFlux(rec, candelas.get(), rec.maxCandela);
+        lumens = rec.lumens > 0 ? rec.lumens
+                                : integrateFlux({rec.thetas.get(), rec.psis, candelas.get(), rec.nthetas,
+                                                 rec.npsis, rec.symmetry, rec.psiTruncated},
+                                                rec.maxCandela);
     } else {
         std::copy_n(rec.candelas.get(), values, candelas.get());
     }
@@ -289,11 +299,13 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     web._psiTruncated = rec.psiTruncated;
     web._identityOrientation = rec.identityOrientation;
     web._loaded = rec.loaded;
+    web._file = rec.file;
+    if (rec.lumens > 0) web._file.lampLumens = rec.lumens;
     return true;
 }
 
 RnBasePhotoWebData::RnBasePhotoWebData(const RnBasePhotoWebData& other)
-    : Ov::RnPhotoWebData(),
+    : Ov::RnPhotoFileWeb(),
       _maxCandela(other._maxCandela),
       _lumens(other._lumens),
       _orientation(other._orientation),
@@ -301,7 +313,8 @@ RnBasePhotoWebData::RnBasePhotoWebData(const RnBasePhotoWebData& other)
       _npsis(other._npsis),
       _symmetry(other._symmetry),
       _psiTruncated(other._psiTruncated),
-      _identityOrientation(other._identityOrientation) {
+      _identityOrientation(other._identityOrientation),
+      _file(other._file) {
     if (!other._thetas) return;
     const std::size_t angles = count(_nthetas) + count(_npsis);
     const std::size_t values = count(_nthetas) * count(_npsis);
@@ -321,6 +334,24 @@ GeVector3<float>& RnBasePhotoWebData::toWebFrameUnit(GeVector3<float>& out,
                                                      const GeVector3<float>& direction) const {
     out = (_identityOrientation ? direction : _orientation * direction.measurable()).normalized();
     return out;
+}
+
+float RnBasePhotoWebData::getLuminaireLumens() const {
+    if (empty() || !(_maxCandela > 0)) return 0;
+    return held(integrateFlux(grid(), _maxCandela) * _file.candelaFactor);
+}
+
+RnRef<Ov::RnPhotoWebData> RnBasePhotoWebData::inCandela() {
+    const float lumens = _file.lampLumens > 0 ? _file.lampLumens : _lumens;
+    if (_file.candelaFactor == 1 && lumens == _lumens) return RnRef<Ov::RnPhotoWebData>::share(this);
+    auto copy = clone();
+    auto& web = static_cast<RnBasePhotoWebData&>(*copy);
+    web._name = _name;
+    web._loaded = _loaded;
+    web._maxCandela = held(_maxCandela * _file.candelaFactor);
+    web._lumens = lumens;
+    web._file.candelaFactor = 1;
+    return copy;
 }
 
 float RnBasePhotoWebData::getIntensity(float theta, float psi) const { return evaluateWeb(*this, theta, psi); }

@@ -6,7 +6,7 @@
 
 #include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/gridEvaluation.h"
-#include "ovphoto/photoWebData.h"
+#include "ovphoto/photoFile.h"
 
 // The photometric web in memory: the record that a format's reader fills, and the class behind RnPhotoWebData that
 // a finished record is installed into.
@@ -53,6 +53,7 @@ struct PhotoWebRecord {
     bool psiTruncated = false;  // nothing is emitted beyond the last psi
     bool identityOrientation = true;
     bool loaded = false;
+    Ov::PhotoFileInfo file;  // lumens of lamps that `lumens` says need not stand here too
 };
 
 /// Starts a record: angles and candelas are allocated and not yet set (psi 0 of an axial web is 0). Throws
@@ -102,10 +103,10 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);
 
 /// The web behind RnPhotoWebData; each format derives its own. Queries work from the members alone and allocate
 /// nothing.
-class RnBasePhotoWebData : public Ov::RnPhotoWebData {
+class RnBasePhotoWebData : public Ov::RnPhotoFileWeb {
 public:
     RnBasePhotoWebData() = default;
-    /// The grid, flux, peak, orientation and flags of `other`; no name, not loaded.
+    /// The grid, flux, peak, orientation, flags and file of `other`; no name, not loaded.
     RnBasePhotoWebData(const RnBasePhotoWebData& other);
     RnBasePhotoWebData& operator=(const RnBasePhotoWebData&) = delete;
 
@@ -142,6 +143,9 @@ public:
         return visitor.finish();
     }
     float getIntensity(float theta, float psi) const override;
+    const Ov::PhotoFileInfo& getFileInfo() const override { return _file; }
+    float getLuminaireLumens() const override;
+    RnRef<Ov::RnPhotoWebData> inCandela() override;
 
     /// Id by which the module knows its own webs among those of the host.
     static constexpr Ov::RnUid iid{0x7c1e9f10, 0x4a5b11ef, 0x9c6e0b62, 0x5d83a4f7};
@@ -174,6 +178,7 @@ protected:
     bool _psiTruncated = false;
     bool _identityOrientation = true;
     bool _loaded = false;
+    Ov::PhotoFileInfo _file;
 };
 
 inline float* RnBasePhotoWebData::copyRow(int j, IndexRange thetas, float* out) const {

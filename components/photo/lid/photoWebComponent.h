@@ -18,6 +18,7 @@
 //         using Web = PhotoWebIES;               // final, derived from PhotoWebOf<PhotoWebIES, IesFormat>
 //         using Record = IesFileRecord;          // the file as plain values; owns its parts
 //         static constexpr BuilderFacts facts;   // class id and texts
+//         static constexpr PhotoFormatTraits traits;  // what its files are like
 //         static constexpr const wchar_t* extension;
 //         static constexpr const char* source;   // what stream exceptions carry: source path, lines, stream name
 //         static constexpr int saveLine, loadLine;
@@ -70,7 +71,7 @@ void loadWeb(typename Format::Record& record, Ov::RnStream& in, typename Format:
 /// Base of a format's web class `Self`.
 template <class Self, class Format>
 class PhotoWebOf : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData,
-                                           Ov::RnPhotoWebData, RnBasePhotoWebData> {
+                                           Ov::RnPhotoFileWeb, Ov::RnPhotoWebData, RnBasePhotoWebData> {
 public:
     static constexpr BuilderFacts facts = Format::facts;
     static constexpr Ov::RnUid classId = Format::facts.classId;
@@ -110,12 +111,14 @@ public:
 /// Builds webs of a format and imports them.
 template <class Format>
 class PhotoWebBuilder final
-    : public FactsBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnImportBuilder,
+    : public FactsBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
                                                                 Ov::RnComponentBuilder, Ov::RnBuilderDescription>>,
       public FileFormat {
 public:
     using Ov::RnImportBuilder::canImport;
     using Ov::RnImportBuilder::import;
+
+    Ov::PhotoFormatTraits getTraits() const override { return Format::traits; }
 
     RnEnum::Action enumerateExtensions(Ov::RnEnumerator<const wchar_t*>& visitor) override {
         const auto action = visitor.visit(Format::extension);

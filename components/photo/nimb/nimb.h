@@ -16,8 +16,8 @@
 //   lines 2-5  four lines of free text, 72 characters kept of each
 //   lines 6-   candela values, 17 to a line: vertical angle 0 first, every horizontal angle of it
 //
-// Units:    whole degrees and candela in the file (written by the library: candela per 1000 lumens); radians and
-//           values relative to the peak in an installed web.
+// Units:    whole degrees and candela of a lamp of 1000 lumens in the file; radians and values relative to the
+//           peak in an installed web.
 // Errors:   false, after a reported message (12970 to 12981, 12935, 12936); only the bad cast of a distribution's
 //           web raises.
 // Threads:  any number; each reading counts its own lines.
@@ -65,7 +65,8 @@ bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, cons
 /// A record to write for a distribution: candela per 1000 lumens in the host frame, mostly every degree by 5
 /// degrees. Without a flux every value is 0.
 bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec);
-/// A record to write as a file for other programs, with steps as fine as the light wants. Throws std::bad_alloc.
+/// A record to write as a file for other programs: candela, on the web's own grid where the format can hold it with
+/// its orientation, else with steps as fine as the light wants. Throws std::bad_alloc.
 bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord& rec);
 /// Writes the record as text. Header fields must fit their four characters.
 bool nimbWrite(const NimbRecord& rec, Ov::RnStream& s);

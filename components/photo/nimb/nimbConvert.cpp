@@ -3,13 +3,17 @@
 
 #include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/gridLayout.h"
+#include "components/photo/lid/ownGrid.h"
 #include "components/photo/lid/sampling.h"
+#include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/nimb/nimb.h"
 
 namespace OvPhotometrics {
 
 namespace {
+
+constexpr float lampLumens = 1000;  // of every file
 
 PhotoWebSymmetry symmetryOf(int psiMax) {
     switch (psiMax) {
@@ -31,6 +35,7 @@ void fillWebRecord(PhotoWebRecord& webRecord, const NimbRecord& rec) {
         photoWebRecordSetTheta(webRecord, j, toRadians(j * rec.thetaStep));
         for (int i = 0; i < rec.psiCount(); ++i) photoWebRecordSetCandela(webRecord, j, i, *value++);
     }
+    webRecord.file.lampLumens = lampLumens;
     if (rec.orientationAngle != 90)
         photoWebRecordSetOrientation(webRecord, turnedBy(static_cast<float>(90 - rec.orientationAngle)));
 }
@@ -109,6 +114,50 @@ void sample(NimbRecord& rec, float flux, Intensity intensity) {
             *value++ = rounded(intensity(j * rec.thetaStep, i * rec.psiStep) * scale);
 }
 
+/// The nearest whole candela that four characters hold.
+std::int16_t whole(float candela) {
+    return static_cast<std::int16_t>(std::clamp(std::round(candela), -999.0f, 9999.0f));
+}
+
+/// The whole degrees between angles that start at 0 and go up evenly, a divisor of 90; 0 for others.
+int evenStep(int count, auto angleAt) {
+    const int step = count > 1 ? static_cast<int>(std::lround(inDegrees(angleAt(1)))) : 0;
+    if (step < 1 || 90 % step != 0) return 0;
+    for (int k = 0; k < count; ++k)
+        if (angleAt(k) != toRadians(k * step)) return 0;
+    return step;
+}
+
+/// The header of a web's own grid. False when the format cannot hold that.
+bool takeOwnGrid(const Ov::RnPhotoWebData& web, NimbRecord& rec) {
+    const int thetas = web.getThetaCount();
+    const int psis = web.getPsiCount();
+    rec.thetaStep = evenStep(thetas, [&](int k) { return web.getTheta(k); });
+    rec.thetaMax = (thetas - 1) * rec.thetaStep;
+    const bool axial = web.getSymmetry() == PhotoWebSymmetry::Axial;
+    rec.psiStep = axial ? 90 : evenStep(psis, [&](int k) { return web.getPsi(k); });
+    rec.psiMax = (psis - 1) * rec.psiStep;
+    if (web.isPsiTruncated() || rec.thetaStep == 0 || rec.psiStep == 0 || rec.thetaMax < 90 ||
+        rec.thetaMax > 180 || symmetryOf(rec.psiMax) != web.getSymmetry() ||
+        (web.getSymmetry() == PhotoWebSymmetry::Full && rec.psiMax != 360 - rec.psiStep))
+        return false;
+    for (const int angle : {90, 0, 180, -90}) {
+        rec.orientationAngle = angle;
+        if (isTurned(web, turnedBy(static_cast<float>(90 - angle)))) return true;
+    }
+    return false;
+}
+
+void planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
+    const SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
+    rec.orientationAngle = 90;
+    rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
+    rec.thetaMax = static_cast<std::int32_t>(plan.lastTheta);
+    rec.psiStep = static_cast<std::int32_t>(plan.psiStep);
+    rec.psiMax = static_cast<std::int32_t>(plan.lastPsi());
+    if (plan.symmetry == PhotoWebSymmetry::Full) rec.psiMax -= rec.psiStep;  // plane 360 is plane 0
+}
+
 }  // namespace
 
 bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
@@ -134,16 +183,17 @@ bool nimbRecordFromDistribution(Ov::RnIntensityDist& dist, NimbRecord& rec) {
 }
 
 bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord& rec) {
-    const SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
     rec = recordToWrite();
-    rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
-    rec.thetaMax = static_cast<std::int32_t>(plan.lastTheta);
-    rec.psiStep = static_cast<std::int32_t>(plan.psiStep);
-    rec.psiMax = static_cast<std::int32_t>(plan.lastPsi());
-    if (plan.symmetry == PhotoWebSymmetry::Full) rec.psiMax -= rec.psiStep;  // plane 360 is plane 0
-    rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(plan.symmetry);
+    const auto web = webOf(dist);
+    const bool own = web && takeOwnGrid(*web, rec);
+    if (!own) planGrid(dist, rec);
+    rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(symmetryOf(rec.psiMax));
+    rec.values.reserve(static_cast<std::size_t>(rec.valueCount()));
     const HostView view(dist);
-    sample(rec, dist.getFlux(), [&](int theta, int psi) { return view.intensity(theta, psi); });
+    for (int j = 0; j < rec.thetaCount(); ++j)
+        for (int i = 0; i < rec.psiCount(); ++i)
+            rec.values.push_back(whole(own ? dist.getPeakIntensity() * web->getCandela(i, j)
+                                           : view.intensity(j * rec.thetaStep, i * rec.psiStep)));
     return true;
 }
 

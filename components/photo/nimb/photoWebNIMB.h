@@ -13,6 +13,7 @@ struct NimbFormat {
     using Record = NimbRecord;
     static constexpr BuilderFacts facts{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
                                         L"NIMB Photometric Web"};
+    static constexpr Ov::PhotoFormatTraits traits{};
     static constexpr const wchar_t* extension = L"nmb";
     static constexpr const char* source = "components/photo/nimb/nimb";
     static constexpr int saveLine = 237;

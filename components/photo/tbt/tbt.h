@@ -41,7 +41,7 @@ struct TbtFileRecord {
     std::wstring title = {};
     float flux = 0;  // lumens
     float referenceFlux = 1000;
-    float multiplier = 0;  // written as flux / 1000
+    float multiplier = 0;  // what the values are multiplied by for candela, where the library writes it
     float auxValue1 = 1;   // kept, never interpreted
     float auxValue2 = 5;
     float auxValue3 = 0;
@@ -72,8 +72,12 @@ void tbtRecordInit(TbtFileRecord& rec);
 /// A record to write for a distribution: candela per 1000 lumens in the host frame, on an even grid with the
 /// smallest steps of its web, at most 90 by 180 angles. Without a flux every value is 0.
 bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec);
-/// A record to write as a file for other programs, with steps as fine as the light wants. Throws std::bad_alloc.
+/// A record to write as a file for other programs: on the web's own grid where the format can hold it, else with
+/// steps as fine as the light wants. Throws std::bad_alloc.
 bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec);
+/// Gives a record another flux and reference flux, and its values the unit that follows: the candela stay. Without
+/// a flux (0) values are candela.
+void tbtSetFlux(TbtFileRecord& rec, float flux, float referenceFlux);
 /// Writes the record, whose values must be as many as its counts say, as text. True; a stream's failure raises.
 bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out);
 

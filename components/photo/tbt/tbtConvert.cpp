@@ -1,8 +1,10 @@
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "components/photo/lid/angleSearch.h"
 #include "components/photo/lid/sampling.h"
+#include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/tbt/tbt.h"
 
@@ -76,6 +78,12 @@ void sample(TbtFileRecord& rec, float flux, Intensity intensity) {
         for (int v = 0; v < rec.verticalCount; ++v) *value++ = intensity(v, h) * scale;
 }
 
+/// What a value is multiplied by for candela. A file without a flux holds candela.
+float candelaFactor(const TbtFileRecord& rec) {
+    constexpr float most = std::numeric_limits<float>::max();
+    return rec.flux > 0 ? std::min(static_cast<float>(double{rec.flux} / rec.referenceFlux), most) : 1;
+}
+
 void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
     const float range = rangeOf(webRecord.symmetry);
     for (int v = 0; v < rec.verticalCount; ++v)
@@ -86,6 +94,51 @@ void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
         photoWebRecordSetRow(webRecord, h, row, 1);
     }
     photoWebRecordSetLumens(webRecord, rec.flux);
+    webRecord.file.candelaFactor = candelaFactor(rec);
+}
+
+bool areAngles(int count, auto angleAt, auto expected) {
+    constexpr double tolerance = 1e-6;  // radians
+    for (int k = 0; k < count; ++k)
+        if (!(std::fabs(double{angleAt(k)} - expected(k)) < tolerance)) return false;
+    return true;
+}
+
+/// The counts of a web's own grid. False when the format cannot hold that.
+bool takeOwnGrid(const Ov::RnPhotoWebData& web, TbtFileRecord& rec) {
+    const int vertical = web.getThetaCount();
+    const int horizontal = web.getPsiCount();
+    const float range = rangeOf(web.getSymmetry());
+    if (web.isPsiTruncated() || !web.hasIdentityOrientation() || vertical < 2) return false;
+    if (!areAngles(
+            vertical, [&](int v) { return web.getTheta(v); }, [&](int v) { return verticalAngle(v, vertical); }) ||
+        !areAngles(
+            horizontal, [&](int h) { return web.getPsi(h); },
+            [&](int h) { return horizontalAngle(h, horizontal, range); }))
+        return false;
+    rec.symmetryCode = codeOf(web.getSymmetry());
+    rec.verticalCount = vertical;
+    rec.horizontalCount = horizontal;
+    return true;
+}
+
+/// Fills the grid with candela.
+void fillFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
+    const auto web = webOf(dist);
+    if (web && takeOwnGrid(*web, rec)) {
+        for (int h = 0; h < rec.horizontalCount; ++h)
+            for (int v = 0; v < rec.verticalCount; ++v)
+                rec.values.push_back(dist.getPeakIntensity() * std::max(web->getCandela(h, v), 0.0f));
+        return;
+    }
+    const SamplingPlan plan = planSampling(dist, {.wholeSphere = true, .planeKept = true});
+    rec.symmetryCode = codeOf(plan.symmetry);
+    rec.verticalCount = plan.thetaCount();
+    rec.horizontalCount = plan.psiCount();
+    const HostView view(dist);
+    for (int h = 0; h < rec.horizontalCount; ++h)
+        for (int v = 0; v < rec.verticalCount; ++v)
+            rec.values.push_back(view.intensity(v * plan.thetaStep, plan.psi(h)));
 }
 
 }  // namespace
@@ -119,15 +172,20 @@ bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
 }
 
 bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
-    const SamplingPlan plan = planSampling(dist, {.wholeSphere = true, .planeKept = true});
-    const HostView view(dist);
     tbtRecordInit(rec);
-    rec.symmetryCode = codeOf(plan.symmetry);
-    rec.verticalCount = plan.thetaCount();
-    rec.horizontalCount = plan.psiCount();
-    const float flux = std::max(0.0f, dist.getFlux());  // the format has no signs, be it that of a zero
-    sample(rec, flux, [&](int v, int h) { return view.intensity(v * plan.thetaStep, plan.psi(h)); });
+    fillFaithfully(dist, rec);
+    const float flux = dist.getFlux();
+    tbtSetFlux(rec, flux > 0 ? flux : 0, rec.referenceFlux);
     return true;
+}
+
+void tbtSetFlux(TbtFileRecord& rec, float flux, float referenceFlux) {
+    const double before = candelaFactor(rec);
+    rec.flux = flux;
+    rec.referenceFlux = referenceFlux;
+    rec.multiplier = candelaFactor(rec);
+    const double scale = before / rec.multiplier;
+    for (float& value : rec.values) value = static_cast<float>(value * scale);
 }
 
 }  // namespace OvPhotometrics

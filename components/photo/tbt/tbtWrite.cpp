@@ -56,6 +56,16 @@ std::wstring chooseTitle(const FileFacts& facts, const std::wstring& name) {
 bool isReadable(float value) { return std::isfinite(value) && !std::signbit(value); }
 bool isReadableShare(float value) { return isReadable(value) && value <= 1; }
 
+/// The reference flux of another file, and its flux where that is none: values then come out as they were.
+void carryUnit(const FileFacts& facts, TbtFileRecord& rec) {
+    float reference = 0;
+    float flux = rec.flux;
+    if (!facts.read(L"referenceFlux", reference) || !isReadable(reference) || reference == 0) return;
+    if (std::round(reference * 100) / 100 != reference) return;  // is written with two decimals
+    if (facts.read(L"flux", flux) && flux != 0) flux = rec.flux;
+    tbtSetFlux(rec, flux, reference);
+}
+
 void carryValue(const FileFacts& facts, const wchar_t* key, float& value) {
     if (float carried = 0; facts.read(key, carried) && isReadable(carried)) value = carried;
 }
@@ -93,6 +103,7 @@ void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts) {
 void tbtCarry(const FileFacts& facts, const std::wstring& name, TbtFileRecord& rec) {
     if (std::wstring title = chooseTitle(facts, name); !title.empty()) rec.title = std::move(title);
     if (std::int32_t code = 0; facts.read(L"kindCode", code) && tbtKindValues(code) >= 0) rec.kindCode = code;
+    carryUnit(facts, rec);
     carryValue(facts, L"kindValue1", rec.kindValue1);
     carryValue(facts, L"kindValue2", rec.kindValue2);
     carryValue(facts, L"auxValue1", rec.auxValue1);

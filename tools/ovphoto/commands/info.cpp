@@ -6,6 +6,7 @@
 #include "host/platform/path.h"
 #include "tools/ovphoto/beamAngles.h"
 #include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/fileFacts.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
@@ -37,31 +38,40 @@ Json valuesOf(const RnPhotoWebData& web) {
 }
 
 void printJson(const ReadResult& result, bool withValues) {
-    const RnPhotoWebData& web = *result.web;
+    RnPhotoWebData& web = *result.web;
+    const float lamps = fileInfoOf(web).lampLumens;
+    const auto ratio = outputRatio(web);
     Json object{{"file", result.file},
                 {"format", result.format},
                 {"name", toUtf8(web.getName())},
                 {"symmetry", symmetryName(web.getSymmetry())},
                 {"thetas", thetasOf(web)},
                 {"psis", psisOf(web)},
-                {"maxCandela", web.getMaxCandela()},
+                {"verticals", verticalsOf(web)},
+                {"horizontals", horizontalsOf(web)},
+                {"maxCandela", peakCandela(web)},
                 {"lumens", web.getLumens()},
+                {"lampLumens", lamps > 0 ? Json(lamps) : Json()},
+                {"luminaireLumens", luminaireLumensOf(web)},
+                {"outputRatio", ratio ? Json(static_cast<float>(*ratio)) : Json()},
                 {"identityOrientation", web.hasIdentityOrientation()},
                 {"orientation", web.getOrientation().values()},
                 {"psiTruncated", web.isPsiTruncated()},
                 {"files", filesOf(web)},
-                {"unit", unitOf(result)},
+                {"unit", "cd"},
+                {"fileUnit", unitName(result.traits.unit)},
                 {"facts", factsToJson(result.facts)}};
     if (withValues) object["values"] = valuesOf(web);
     printLine(object);
 }
 
-void printBeamAngles(const RnPhotoWebData& web, const RnWebIntensityDist& light) {
+void printBeamAngles(const RnWebIntensityDist& light) {
     const auto angleText = [](const std::optional<OvPlot::AngleSpan>& angle) {
         return padLeft(angle ? shortNumber(std::round(angle->width() * 10) / 10) + " deg" : "-", 9);
     };
     Table table;
-    table.add({web.isPsiTruncated() ? "Plane through the axis" : "Plane", "beam, 50 %", "field, 10 %"});
+    table.add(
+        {mainFrame(*light.getWeb()).aimed ? "Plane through the axis" : "Plane", "beam, 50 %", "field, 10 %"});
     for (const BeamAngles& angles : beamAngles(light)) {
         table.add({angles.plane, " " + angleText(angles.beam), "  " + angleText(angles.field)});
     }
@@ -77,12 +87,11 @@ void printFacts(const std::vector<Fact>& facts) {
 }
 
 void printText(const ReadResult& result, const HostSession& session) {
-    const RnPhotoWebData& web = *result.web;
     Table table;
     for (const auto& [name, text] : webTexts(result)) table.add({name, text});
     say(result.file);
     table.print(2);
-    printBeamAngles(web, *session.distribute(*result.web, web.getLumens()));
+    printBeamAngles(*session.lightOf(*result.web));
     printFacts(result.facts);
 }
 

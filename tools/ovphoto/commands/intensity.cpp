@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/standardStreams.h"
@@ -18,16 +19,16 @@ namespace {
 struct IntensityOptions {
     std::string file;
     std::vector<std::string> directions;
-    std::string frame = "local";
+    std::string frame = "file";
     std::optional<float> flux;
     std::string as;
     bool json = false;
 };
 
-/// Degrees.
+/// Degrees: vertical and horizontal angle of the file, or theta and psi.
 struct Direction {
-    float theta;
-    float psi;
+    float first;
+    float second;
 };
 
 constexpr std::string_view blanks = " \t\r";
@@ -38,44 +39,56 @@ std::string_view trimmed(std::string_view text) {
     return text.substr(first, text.find_last_not_of(blanks) - first + 1);
 }
 
-/// "theta,psi" or "theta psi".
+/// Two numbers with a comma or a blank between them.
 std::optional<Direction> parseDirection(std::string_view text) {
     text = trimmed(text);
     const std::size_t end = text.find_first_of(", \t");
     if (end == std::string_view::npos) return {};
     std::string_view second = trimmed(text.substr(end));
     if (second.starts_with(',')) second = trimmed(second.substr(1));
-    const auto theta = parseFloat(text.substr(0, end));
-    const auto psi = parseFloat(second);
-    if (!theta || !psi) return {};
-    return Direction{*theta, *psi};
+    const auto one = parseFloat(text.substr(0, end));
+    const auto other = parseFloat(second);
+    if (!one || !other) return {};
+    return Direction{*one, *other};
 }
 
 std::string checkDirection(std::string& text) {
-    return parseDirection(text) ? "" : "'" + text + "' is no direction: theta,psi in degrees are wanted";
+    return parseDirection(text)
+               ? ""
+               : "'" + text + "' is no direction: two angles in degrees, such as 30,90, are wanted";
 }
 
 class IntensityPrinter {
 public:
-    IntensityPrinter(const IntensityOptions& options, const RnIntensityDist& light)
-        : _host(options.frame == "host"), _json(options.json), _light(light) {}
+    IntensityPrinter(const IntensityOptions& options, const RnWebIntensityDist& light)
+        : _frame(options.frame), _json(options.json), _light(light), _file(fileInfoOf(*light.getWeb())) {}
 
     void print(const Direction& direction) const {
-        const float theta = toRadians(direction.theta);
-        const float psi = toRadians(direction.psi);
-        const float candela = _host ? _light.intensity(theta, psi) : _light.localIntensity(theta, psi);
+        const float candela = towards(direction);
         if (_json) {
-            printLine(Json{{"theta", direction.theta}, {"psi", direction.psi}, {"candela", candela}});
+            const bool ofFile = _frame == "file";
+            printLine(Json{{ofFile ? "vertical" : "theta", direction.first},
+                           {ofFile ? "horizontal" : "psi", direction.second},
+                           {"candela", candela}});
         } else {
-            say(padLeft(exactNumber(direction.theta), 8) + " deg " + padLeft(exactNumber(direction.psi), 8) +
+            say(padLeft(exactNumber(direction.first), 8) + " deg " + padLeft(exactNumber(direction.second), 8) +
                 " deg " + padLeft(exactNumber(candela), 12) + " cd");
         }
     }
 
 private:
-    bool _host;
+    float towards(const Direction& direction) const {
+        if (_frame == "file")
+            return _light.localIntensity(_file.theta(direction.first), _file.psi(direction.second));
+        const float theta = toRadians(direction.first);
+        const float psi = toRadians(direction.second);
+        return _frame == "host" ? _light.intensity(theta, psi) : _light.localIntensity(theta, psi);
+    }
+
+    std::string _frame;
     bool _json;
-    const RnIntensityDist& _light;
+    const RnWebIntensityDist& _light;
+    PhotoFileInfo _file;
 };
 
 /// Answers the directions of the lines of standard input. Lines that hold none are reported.
@@ -88,7 +101,7 @@ int answerInput(const IntensityPrinter& printer) {
         if (const auto direction = parseDirection(text)) {
             printer.print(*direction);
         } else {
-            complain("standard input, line " + std::to_string(number) + ": no direction (theta psi, in degrees)");
+            complain("standard input, line " + std::to_string(number) + ": no direction (two angles in degrees)");
             status = exitFailed;
         }
     }
@@ -104,7 +117,14 @@ int runIntensity(const IntensityOptions& options, const HostSession& session) {
         if (options.json) printRefusal(result);
         return exitFailed;
     }
-    const auto light = session.distribute(*result.web, options.flux.value_or(result.web->getLumens()));
+    const auto light = session.lightOf(*result.web);
+    if (options.flux) {
+        if (!(light->getFlux() > 0)) {
+            complain(options.file + ": --flux cannot scale a flux that is not above 0");
+            return exitFailed;
+        }
+        light->setFlux(*options.flux);
+    }
     const IntensityPrinter printer(options, *light);
     if (options.directions.empty()) return answerInput(printer);
     for (const std::string& text : options.directions) printer.print(*parseDirection(text));
@@ -116,19 +136,25 @@ int runIntensity(const IntensityOptions& options, const HostSession& session) {
 Action declareIntensity(CLI::App& app) {
     auto options = std::make_shared<IntensityOptions>();
     app.add_option("FILE", options->file, "Photometric file, - for standard input")->required();
-    app.add_option("DIRECTION", options->directions,
-                   "Directions theta,psi in degrees; without any, lines \"theta psi\" from standard input")
+    app.add_option(
+           "DIRECTION", options->directions,
+           "Directions in degrees, vertical and horizontal angle or theta and psi: 30,90; without any, lines "
+           "\"30 90\" from standard input")
         ->check(CLI::Validator(checkDirection, "", "direction"));
-    app.add_option("--frame", options->frame,
-                   "Frame of the directions: local (the file's angles, the default) or host")
-        ->check(CLI::IsMember({"local", "host"}).description(""))
-        ->type_name("local|host");
+    app.add_option(
+           "--frame", options->frame,
+           "How directions count: as the vertical and horizontal angles of the file (the default), or as theta "
+           "and psi of the host's frame or of the web's own")
+        ->check(CLI::IsMember({"file", "host", "local"}).description(""))
+        ->type_name("file|host|local");
     const auto setFlux = [options](const std::string& text) {
         options->flux = parseFloat(text);
         if (!options->flux || *options->flux < 0)
             throw CLI::ValidationError("--flux", "'" + text + "' is no flux");
     };
-    app.add_option_function<std::string>("--flux", setFlux, "Total flux in lumens, instead of the file's")
+    app.add_option_function<std::string>(
+           "--flux", setFlux,
+           "Flux of the lamps in lumens, instead of the file's; of the luminaire where it names no lamps'")
         ->type_name("LM");
     app.callback([options] {
         if (options->directions.empty() && isStandardStream(options->file))

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <span>
+
 #include "tools/ovphoto/beamAngles.h"
 #include "tools/ovphoto/lightFile.h"
 #include "tools/plot/diagram.h"
@@ -10,7 +12,7 @@ namespace OvTool {
 struct DrawnFile {
     ReadResult source;  // with a web
     std::vector<BeamAngles> angles;
-    WebLight light;  // with the values of the file: candela, or candela per 1000 lm
+    WebLight light;  // in candela
 };
 
 /// None when the file is refused; `result` then has the reasons.
@@ -19,14 +21,7 @@ std::optional<DrawnFile> drawnFile(const HostSession& session, ReadResult& resul
 /// What the luminaire is called in the file, else the file's name.
 std::string titleOf(const DrawnFile& file);
 
-/// @{
-/// The diagram of one file's light, or of several: in candela or, where a file holds none, all of them per 1000
-/// lm. It refers to `lights`, which it adds to.
-OvPlot::Diagram diagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights);
-OvPlot::Diagram diagramOf(const HostSession& session, const std::vector<DrawnFile>& files,
-                          std::vector<WebLight>& lights);
-/// @}
-/// The same of one file in candela, as illuminances need them; NIMB files hold none.
-OvPlot::Diagram trueDiagramOf(const HostSession& session, const DrawnFile& file, std::vector<WebLight>& lights);
+/// The diagram of the lights of one file or several; it refers to them.
+OvPlot::Diagram diagramOf(std::span<const DrawnFile> files);
 
 }  // namespace OvTool

@@ -71,10 +71,7 @@ int write(const PlotOptions& options, PictureFormat format, const std::string& t
 int plotLights(const PlotOptions& options, PictureFormat format, const HostSession& session) {
     const auto files = readAll(options, session);
     if (!files) return exitFailed;
-    std::vector<WebLight> lights;
-    const bool needsCandela = options.kind == PictureKind::cone || options.kind == PictureKind::isolux;
-    OvPlot::Diagram diagram =
-        needsCandela ? trueDiagramOf(session, files->front(), lights) : diagramOf(session, *files, lights);
+    OvPlot::Diagram diagram = diagramOf(*files);
     diagram.planes = options.planes;
     diagram.height = options.height;
     return write(options, format, diagram.title, [&](Canvas& canvas) { drawerOf(options.kind)(canvas, diagram); });

@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "host/platform/path.h"
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/report/html.h"
@@ -17,7 +18,7 @@ using OvPlot::Canvas;
 
 namespace {
 
-constexpr int columnsEach = 12;  // of a candela table: as many as fit on A4
+constexpr std::size_t columnsEach = 12;  // of a candela table: as many as fit on A4
 
 std::string drawn(const OvPlot::Diagram& diagram, void (*draw)(Canvas&, const OvPlot::Diagram&),
                   const char* what) {
@@ -97,50 +98,60 @@ std::string checkSection(const std::vector<std::string>& remarks) {
     return section + "</ul></section>\n";
 }
 
-/// The values of some of the planes, as they stand in the file.
-std::string candelaTable(const Ov::RnPhotoWebData& web, int first, int last, const std::string& unit) {
-    std::string table = "<table class=\"candela\"><caption>" + unit + ", psi " +
-                        shortNumber(toDegrees(web.getPsi(first))) +
-                        (last > first ? " to " + shortNumber(toDegrees(web.getPsi(last))) : "") +
-                        " deg</caption><thead><tr><th scope=\"col\">theta \\ psi</th>";
-    for (int j = first; j <= last; ++j)
-        table += "<th scope=\"col\">" + shortNumber(toDegrees(web.getPsi(j))) + "</th>";
+/// What a table of candela shows: its rows and columns by the angles of the file.
+struct CandelaValues {
+    Ov::RnPhotoWebData& web;
+    std::vector<double> verticals;
+    std::vector<double> horizontals;
+    float peak;
+
+    /// The plane that closes the circle, which the web does without, is the first.
+    double candela(int j, int i) const { return double{web.getCandela(j < web.getPsiCount() ? j : 0, i)} * peak; }
+};
+
+/// Some of the planes.
+std::string candelaTable(const CandelaValues& values, std::size_t first, std::size_t last) {
+    std::string table = "<table class=\"candela\"><caption>cd, horizontal " +
+                        shortNumber(values.horizontals[first]) +
+                        (last > first ? " to " + shortNumber(values.horizontals[last]) : "") +
+                        " deg</caption><thead><tr><th scope=\"col\">vertical \\ horizontal</th>";
+    for (std::size_t j = first; j <= last; ++j)
+        table += "<th scope=\"col\">" + shortNumber(values.horizontals[j]) + "</th>";
     table += "</tr></thead><tbody>\n";
-    for (int i = 0; i < web.getThetaCount(); ++i) {
-        table += "<tr><th scope=\"row\">" + shortNumber(toDegrees(web.getTheta(i))) + "</th>";
-        for (int j = first; j <= last; ++j)
-            table += "<td>" + shortNumber(double{web.getCandela(j, i)} * web.getMaxCandela()) + "</td>";
+    for (std::size_t i = 0; i < values.verticals.size(); ++i) {
+        table += "<tr><th scope=\"row\">" + shortNumber(values.verticals[i]) + "</th>";
+        for (std::size_t j = first; j <= last; ++j)
+            table += "<td>" + shortNumber(values.candela(static_cast<int>(j), static_cast<int>(i))) + "</td>";
         table += "</tr>\n";
     }
     return table + "</tbody></table>\n";
 }
 
 std::string candelaSection(const DrawnFile& file) {
-    const Ov::RnPhotoWebData& web = *file.source.web;
+    Ov::RnPhotoWebData& web = *file.source.web;
+    const CandelaValues values{web, verticalsOf(web), horizontalsOf(web), file.light->getPeakIntensity()};
     std::string section =
         "<section><h2 id=\"candela\">Luminous intensities</h2>\n"
-        "<p class=\"muted\">At the angles of the file, degrees: theta from the axis, psi around it.</p>\n"
+        "<p class=\"muted\">At the angles of the file, degrees.</p>\n"
         "<div class=\"scroll\" role=\"region\" aria-labelledby=\"candela\" tabindex=\"0\">\n";
-    for (int first = 0; first < web.getPsiCount(); first += columnsEach)
-        section +=
-            candelaTable(web, first, std::min(first + columnsEach, web.getPsiCount()) - 1, unitOf(file.source));
+    for (std::size_t first = 0; first < values.horizontals.size(); first += columnsEach)
+        section += candelaTable(values, first, std::min(first + columnsEach, values.horizontals.size()) - 1);
     return section + "</div></section>\n";
 }
 
 }  // namespace
 
-Datasheet datasheetOf(const HostSession& session, DrawnFile file) {
-    Datasheet sheet{std::move(file), {}, {}, {}, {}};
+Datasheet datasheetOf(DrawnFile file) {
+    Datasheet sheet{std::move(file), {}, {}};
     sheet.remarks = sheet.file.source.reasons();
     const auto warnings = webWarnings(sheet.file.source);
     sheet.remarks.insert(sheet.remarks.end(), warnings.begin(), warnings.end());
-    sheet.intensities = diagramOf(session, sheet.file, sheet.lights);
-    sheet.illuminances = trueDiagramOf(session, sheet.file, sheet.lights);
+    sheet.diagram = diagramOf({&sheet.file, 1});
     return sheet;
 }
 
 std::string datasheetPage(const Datasheet& sheet, const std::string& indexUrl) {
-    const OvPlot::Diagram& diagram = sheet.intensities;
+    const OvPlot::Diagram& diagram = sheet.diagram;
     std::string body;
     if (!indexUrl.empty()) body += "<p class=\"back\"><a href=\"" + indexUrl + "\">All files</a></p>\n";
     body += "<header><h1>" + escaped(diagram.title) + "</h1>\n<p class=\"muted\">" +
@@ -148,15 +159,14 @@ std::string datasheetPage(const Datasheet& sheet, const std::string& indexUrl) {
             "<section><h2>Diagrams</h2><div class=\"diagrams\">\n" +
             figure(diagram, OvPlot::drawPolar, "Polar diagram") +
             figure(diagram, OvPlot::drawCartesian, "Linear diagram") +
-            figure(sheet.illuminances, OvPlot::drawCone, "Cone diagram") +
-            figure(sheet.illuminances, OvPlot::drawIsolux, "Isolux lines") + solidFigure(diagram) +
-            "</div></section>\n" + factsSection(sheet.file) + checkSection(sheet.remarks) +
-            candelaSection(sheet.file) + "</main>\n";
+            figure(diagram, OvPlot::drawCone, "Cone diagram") +
+            figure(diagram, OvPlot::drawIsolux, "Isolux lines") + solidFigure(diagram) + "</div></section>\n" +
+            factsSection(sheet.file) + checkSection(sheet.remarks) + candelaSection(sheet.file) + "</main>\n";
     return htmlPage(diagram.title, body, pageScript);
 }
 
 std::string thumbnail(const Datasheet& sheet, const std::string& prefix) {
-    const OvPlot::Subject& subject = sheet.intensities.subjects.front();
+    const OvPlot::Subject& subject = sheet.diagram.subjects.front();
     return inlineSvg(
         OvPlot::drawPicture(OvPlot::PictureFormat::svg, {100, 100}, OvPlot::lightPalette(), "Polar diagram",
                             [&](Canvas& canvas) { OvPlot::drawThumbnail(canvas, subject); }),

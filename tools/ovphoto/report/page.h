@@ -8,12 +8,10 @@ namespace OvTool {
 struct Datasheet {
     DrawnFile file;
     std::vector<std::string> remarks;  // what reading reported and what a user should know
-    std::vector<WebLight> lights;      // of the diagrams
-    OvPlot::Diagram intensities;
-    OvPlot::Diagram illuminances;
+    OvPlot::Diagram diagram;
 };
 
-Datasheet datasheetOf(const HostSession& session, DrawnFile file);
+Datasheet datasheetOf(DrawnFile file);
 
 /// The page; any number of threads may make pages. `indexUrl` leads back to an index and may be empty.
 std::string datasheetPage(const Datasheet& sheet, const std::string& indexUrl);

@@ -8,6 +8,7 @@
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
 #include "tools/ovphoto/expandPaths.h"
+#include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/progress.h"
@@ -35,7 +36,7 @@ int reportOne(const ReportOptions& options, const HostSession& session) {
     showReasons(result);
     auto file = drawnFile(session, result);
     if (!file) return exitFailed;
-    const std::string page = datasheetPage(datasheetOf(session, std::move(*file)), "");
+    const std::string page = datasheetPage(datasheetOf(std::move(*file)), "");
     const std::string error = writeFile(options.out, page);
     return error.empty() ? exitWell : fail(options.out, error);
 }
@@ -127,21 +128,22 @@ Entry refusedEntry(const ReadResult& result) {
 
 Entry entryOf(const Datasheet& sheet, std::size_t number, const PageFolder& folder, const std::string& indexUrl) {
     const DrawnFile& file = sheet.file;
-    const Ov::RnPhotoWebData& web = *file.source.web;
+    Ov::RnPhotoWebData& web = *file.source.web;
+    const float lumens = luminaireLumensOf(web);
+    const float peak = file.light->getPeakIntensity();
     const std::string page = pageNameOf(file.source.file, number);
-    std::string row =
-        "<tr><td>" + thumbnail(sheet, "t" + std::to_string(number) + "-") + "</td><th scope=\"row\"><a href=\"" +
-        folder.urlOf(page) + "\">" + escaped(file.source.file) + "</a></th>" + cell(titleOf(file)) +
-        cell(file.source.format) + numberCell(web.getLumens(), shortNumber(web.getLumens())) +
-        numberCell(web.getMaxCandela(), shortNumber(web.getMaxCandela()) + " " + unitOf(file.source)) +
-        angleCell(file.angles[0].beam) + angleCell(file.angles[1].beam) + cell(symmetryName(web.getSymmetry())) +
-        remarksCell(sheet.remarks) + "</tr>\n";
+    std::string row = "<tr><td>" + thumbnail(sheet, "t" + std::to_string(number) + "-") +
+                      "</td><th scope=\"row\"><a href=\"" + folder.urlOf(page) + "\">" +
+                      escaped(file.source.file) + "</a></th>" + cell(titleOf(file)) + cell(file.source.format) +
+                      numberCell(lumens, shortNumber(lumens)) + numberCell(peak, shortNumber(peak)) +
+                      angleCell(file.angles[0].beam) + angleCell(file.angles[1].beam) +
+                      cell(symmetryName(web.getSymmetry())) + remarksCell(sheet.remarks) + "</tr>\n";
     return {std::move(row), page, datasheetPage(sheet, indexUrl)};
 }
 
 std::string indexPage(const std::string& rows, std::size_t files, std::size_t refused) {
-    static constexpr const char* headings[] = {"File",   "Luminaire",       "Format",           "Flux, lm",
-                                               "Peak",   "Beam C0, \u00b0", "Beam C90, \u00b0", "Symmetry",
+    static constexpr const char* headings[] = {"File",     "Luminaire",       "Format",           "Flux, lm",
+                                               "Peak, cd", "Beam C0, \u00b0", "Beam C90, \u00b0", "Symmetry",
                                                "Remarks"};
     std::string body = "<header><h1>Photometric files</h1>\n<p class=\"muted\">" + std::to_string(files) +
                        (files == 1 ? " file, " : " files, ") + std::to_string(refused) +
@@ -164,7 +166,7 @@ public:
     void add(ReadResult result, const HostSession& session) {
         const std::size_t number = ++_files;
         if (auto file = drawnFile(session, result)) {
-            auto sheet = std::make_shared<Datasheet>(datasheetOf(session, std::move(*file)));
+            auto sheet = std::make_shared<Datasheet>(datasheetOf(std::move(*file)));
             _underWay.push_back(std::async(std::launch::async, [this, sheet, number] {
                 return entryOf(*sheet, number, _folder, _indexUrl);
             }));
