@@ -56,16 +56,33 @@ TEST_F(ToolPlot, EveryKindIsWrittenInEveryFormat) {
     }
 }
 
-TEST_F(ToolPlot, IlluminancesAreThoseOfTheCandelaWhateverTheUnitOfTheFile) {
+TEST_F(ToolPlot, LightIsInCandelaWhateverTheUnitOfTheFile) {
     IesFile file;  // 628 lm, so that a TBT file holds other values
     file.candela = [](double v, double) { return 100 - v; };
     folder.write("in.ies", file.text());
     ASSERT_EQ(runTool("convert in.ies in.tbt", folder).status, 0);
-    ASSERT_EQ(run("in.ies --kind isolux -o a.svg").status, 0);
-    ASSERT_EQ(run("in.tbt --kind isolux -o b.svg").status, 0);
-    const OvPlot::Path a = longestPath(bytes("a.svg")), b = longestPath(bytes("b.svg"));
-    ASSERT_EQ(a.size(), b.size());
-    for (std::size_t i = 0; i < a.size(); ++i) EXPECT_LT(distance(a[i], b[i]), 0.2);
+    for (const std::string kind : {"isolux", "cartesian"}) {
+        ASSERT_EQ(run("in.ies -o a.svg --kind " + kind).status, 0);
+        ASSERT_EQ(run("in.tbt -o b.svg --kind " + kind).status, 0);
+        const auto extent = [&](const char* file) {
+            OvPlot::Box box{1e9, 1e9, 0, 0};
+            for (const OvPlot::Point& p : longestPath(bytes(file)))
+                box = {std::min(box.left, p.x), std::min(box.top, p.y), std::max(box.right, p.x),
+                       std::max(box.bottom, p.y)};
+            return box;
+        };
+        const OvPlot::Box a = extent("a.svg"), b = extent("b.svg");
+        EXPECT_LT(distance({a.left, a.top}, {b.left, b.top}), 0.2) << kind;
+        EXPECT_LT(distance({a.right, a.bottom}, {b.right, b.bottom}), 0.2) << kind;
+    }
+    // Reports: candela at the angles of the file, and both fluxes.
+    file.lamps = "1 1000";
+    file.horizontals = {90, 180, 270};
+    folder.write("in.ies", file.text());
+    ASSERT_EQ(runTool("report in.ies -o a.html", folder).status, 0);
+    for (const char* text : {"<th scope=\"col\">90</th><th scope=\"col\">180</th><th scope=\"col\">270</th>",
+                             "<th scope=\"row\">45</th><td>55</td>", "1000 lm", "of the lamps"})
+        EXPECT_THAT(bytes("a.html"), testing::HasSubstr(text));
 }
 
 TEST_F(ToolPlot, WrongInputIsToldAndLeavesNothing) {

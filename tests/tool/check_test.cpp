@@ -12,6 +12,7 @@ TEST(ToolCheck, WarnsOfWhatAFileDoesNotShow) {
     } cases[] = {
         {"[]", {}},
         {"1 candela value is negative", {.candela = [](double v, double) { return v - 1; }}},
+        {"flux of the luminaire is negative", {.candela = [](double v, double) { return v == 0 ? 1 : -1; }}},
         {"ballast-lamp factor (future use) is 0", {.factors = "1 0 20"}},
         {"candela multiplier is 0", {.multiplier = "0"}},
         {"dark", {.candela = [](double, double) { return 0; }}},

@@ -48,12 +48,14 @@ TEST(ToolInfo, TellsTheWebInJson) {
     const Json facts = info["facts"];
     EXPECT_EQ(facts.at(1).dump(), R"({"key":"TEST","value":"one"})");
     EXPECT_EQ(facts.back().dump(), R"({"key":"watts","value":"0"})");
-    for (const char* key : {"file", "lumens", "orientation", "files", "values", "facts"})
+    for (const char* key : {"file", "lumens", "luminaireLumens", "orientation", "files", "values", "facts"})
         EXPECT_EQ(info.erase(key), 1U) << key;
     EXPECT_EQ(info.dump(),
               "{\"format\":\"IES\",\"name\":\"a \u00E4 \uFFFD\","  // the odd byte became U+FFFD
-              R"("symmetry":"Half","thetas":[0.0,0.1,33.3,90.0],"psis":[0.0,90.0,180.0],"maxCandela":360.0,)"
-              R"("identityOrientation":false,"psiTruncated":false,"unit":"cd"})");
+              R"("symmetry":"Half","thetas":[0.0,0.1,33.3,90.0],"psis":[0.0,90.0,180.0],)"
+              R"("verticals":[0.0,0.1,33.3,90.0],"horizontals":[90.0,180.0,270.0],"maxCandela":360.0,)"
+              R"("lampLumens":null,"outputRatio":null,"identityOrientation":false,"psiTruncated":false,)"
+              R"("unit":"cd","fileUnit":"cd"})");
 }
 
 TEST(ToolInfo, ARefusedFileStopsNothingAndHasItsLine) {
@@ -132,7 +134,76 @@ TEST(ToolInfo, PlanesOfA90To270FileAreThoseOfTheSameLightWrittenOut) {
     EXPECT_NEAR(at("--frame host 45,90"), half.candela(45, 90), 0.01);
     EXPECT_NEAR(at("--frame host 45,270"), half.candela(45, 270), 0.01);
     EXPECT_NEAR(at("--frame local 45,0"), half.candela(45, 90), 0.01);
-    EXPECT_NEAR(at("45,0"), half.candela(45, 90), 0.01);
+    EXPECT_NEAR(at("45,90"), half.candela(45, 90), 0.01);
+}
+
+TEST(ToolIntensity, AnglesAreThoseOfTheFileEverywhere) {
+    const auto grid = [](const std::vector<double>& verticals, const std::vector<double>& horizontals) {
+        std::string text;
+        for (const auto* list : {&verticals, &horizontals})
+            for (const double angle : *list) text += std::to_string(angle) + "\n";
+        for (std::size_t j = 0; j < horizontals.size(); ++j)
+            for (std::size_t i = 0; i < verticals.size(); ++i)
+                text += std::to_string(horizontals[j] == horizontals[0] + 360 ? 10 + i : 10 + i + 5 * j) + "\n";
+        return text;
+    };
+    using Angles = std::vector<double>;
+    const struct {
+        int format;  // 0: IES, 1: CIBSE
+        int type;
+        Angles verticals, horizontals;
+    } cases[] = {
+        {0, 1, {0, 30, 90}, {90, 135.5, 180, 270}}, {0, 1, {90, 120, 180}, {0, 90, 180, 270, 360}},
+        {0, 3, {-70.3, 0, 70}, {-40.7, 0, 20.1}},   {0, 3, {-90, 0, 90}, {0, 30, 60}},
+        {0, 2, {-45, 0, 60}, {-30, 0, 80}},         {0, 2, {-45, 0, 60}, {0, 30, 80}},
+        {1, 1, {0, 45, 90}, {270, 300, 0, 90}},     {1, 2, {-90, 0, 90}, {-30, 0, 60.5}},
+        {1, 2, {-90, 0, 90}, {0, 45, 90}},
+    };
+    TempFolder folder;
+    for (const auto& c : cases) {
+        const std::string counts =
+            std::to_string(c.verticals.size()) + " " + std::to_string(c.horizontals.size()) + "\n";
+        const std::string body = grid(c.verticals, c.horizontals);
+        const std::string type = std::to_string(c.type);
+        folder.write("f",
+                     c.format == 0
+                         ? "IESNA91\nTILT=NONE\n1 -1 1 " + counts + type + " 2 0 0 0\n1 1 0\n" + body
+                         : "CIBSE/1\n\n\n\n\n\n\n\n1 " + type + " 0 0 0 1 0 0 0\n" + counts + body + "99 0 0 0");
+        SCOPED_TRACE(type + " of " + std::to_string(c.format) + ": " + counts + body);
+        const Json info = one(runTool("info --json f", folder));
+        EXPECT_EQ(info["verticals"].get<Angles>(), c.verticals);
+        EXPECT_EQ(info["horizontals"].get<Angles>(), c.horizontals);
+        std::string directions;
+        for (const double h : c.horizontals)
+            for (const double v : c.verticals) directions += std::to_string(v) + " " + std::to_string(h) + "\n";
+        const auto answers = runTool("intensity --json f", folder, directions).json();
+        std::istringstream values(body);
+        for (double skipped, k = 0; k < double(c.verticals.size() + c.horizontals.size()); ++k) values >> skipped;
+        std::size_t best = 0;
+        for (std::size_t k = 0; k < c.verticals.size() * c.horizontals.size(); ++k) {
+            double value = 0;
+            values >> value;
+            EXPECT_NEAR(answers.at(k)["candela"].get<double>(), value, 1e-4) << answers.at(k);
+            if (answers.at(k)["candela"] > answers.at(best)["candela"]) best = k;
+        }
+        // The peak is told where the same angles find it, in the report as well.
+        const auto angle = [&](const char* name) { return answers.at(best)[name].dump(); };
+        const std::string text = runTool("info f", folder).out;
+        std::smatch found;
+        ASSERT_TRUE(std::regex_search(text, found, std::regex("cd at vertical (\\S+) deg, horizontal (\\S+) deg")))
+            << text;
+        EXPECT_EQ(std::stod(found[1]), std::stod(angle("vertical"))) << text;
+        EXPECT_EQ(std::stod(found[2]), std::stod(angle("horizontal"))) << text;
+    }
+    // The planes that beam angles are told of are those of the file, too, whatever a NIMB file is turned by.
+    const auto nimb = [&](const std::string& turn) {
+        folder.write("f.nmb", "   0  90  90  90  30" + turn +
+                                  "   0   0   0NIMB\nA\nB\nC\nD, a line to make it 72 bytes long, and more\n"
+                                  " 100 100  90  20  50   1   0   0\n");
+        return runTool("info f.nmb", folder);
+    };
+    for (const char* plane : {"C0-C180", "C90-C270"})
+        EXPECT_EQ(printedAngles(nimb("  90"), plane), printedAngles(nimb("   0"), plane)) << plane;
 }
 
 TEST(ToolIntensity, AnswersEveryGivenDirection) {
