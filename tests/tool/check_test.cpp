@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "tool/toolRun.h"
 
 using Json = nlohmann::ordered_json;
@@ -65,13 +67,79 @@ TEST(ToolCheck, GoesThroughFoldersAndIsStoppedByNothing) {
     EXPECT_EQ(human.err, "");  // no progress where no terminal is
 }
 
-TEST(ToolCheck, ShowsEqualTextsInARowOnce) {
+/// People are told the line, equal texts in a row once, and not what only follows; JSON has everything.
+TEST(ToolCheck, TellsWhereTheFaultIsAndNotWhatFollowsFromIt) {
+    const std::string good =
+        IesFile{.tilt = "INCLUDE\n1\n2\n0 90\n1 1"}.text();  // 16 lines, candela on the last 3
+    const auto changed = [&](std::size_t line, const std::string& text) {
+        std::istringstream lines(good);
+        std::string result, each;
+        for (std::size_t i = 1; std::getline(lines, each); ++i) result += (i == line ? text : each) + "\n";
+        return result;
+    };
+    const auto ended = [](std::string text, const std::string& end) {
+        for (std::size_t i = 0; (i = text.find('\n', i)) != std::string::npos; i += end.size())
+            text.replace(i, 1, end);
+        return text;
+    };
+    const std::string faulty = changed(8, "x -1 1 3 1 1 2 0 0 0");
+    const std::string threeBad = good.substr(0, good.size() - 12) + "x\n x\r\n x\n";
+    const struct {
+        const char* name;
+        std::string text;
+        std::size_t messages;  // in all
+        const char* told;      // what the only line of those told ends in
+    } cases[] = {{"word for a number", faulty, 2, " (line 8)"},
+                 {"CR LF", ended(faulty, "\r\n"), 2, " (line 8)"},
+                 {"CR", ended(faulty, "\r"), 2, " (line 8)"},
+                 {"number out of range", changed(8, "1 -1 1 1 1 1 2 0 0 0"), 1, " (line 8)"},
+                 {"tilt data", changed(6, "0 70"), 1, " (line 6)"},
+                 {"end of the file", good.substr(0, good.size() - 9) + "\n\n", 2, " (line 14)"},
+                 {"no number", "IESNA91\nTILT=NONE\n", 2, " (line 2)"},
+                 {"equal texts", threeBad, 4, " (3 times, from line 14 on)"},
+                 {"values", changed(13, "45"), 1, "0."},
+                 {"tilt file", "IESNA91\nTILT=bad.tlt\n1", 2, "start."}};
     TempFolder folder;
-    std::string text = IesFile{.verticals = angles(0, 90, 10)}.text();
-    text.replace(text.size() - 8, 8, "x\nx\nx\n");  // each of these numbers is reported
-    folder.write("f.ies", text);
-    const auto messages = runTool("check --json f.ies", folder).json().at(0)["messages"];
-    EXPECT_EQ(messages.at(0), messages.at(1));
-    const ToolResult human = runTool("check f.ies", folder);
-    EXPECT_TRUE(human.says(messages[0].get<std::string>() + " (") && human.says(" times)")) << human.out;
+    folder.write("bad.tlt", "x");
+    for (const auto& c : cases) {
+        folder.write("f.ies", c.text);
+        const Json object = runTool("check --json f.ies", folder).json().at(0);
+        EXPECT_EQ(object["messages"].size(), c.messages) << c.name << object;
+        const ToolResult human = runTool("info f.ies", folder);
+        EXPECT_EQ(std::count(human.err.begin(), human.err.end(), '\n'), 1) << c.name << human.err;
+        EXPECT_TRUE(human.err.ends_with(std::string(c.told) + "\n")) << c.name << human.err;
+        EXPECT_EQ(runTool("convert f.ies out.ies", folder).err, human.err) << c.name;
+        EXPECT_EQ(runTool("convert f.ies --to tbt --into out --jobs 2", folder).err, human.err) << c.name;
+        const std::string all = runTool("info f.ies --verbose", folder).err;
+        EXPECT_EQ(static_cast<std::size_t>(std::count(all.begin(), all.end(), '\n')), c.messages) << c.name << all;
+    }
+    folder.write("f.nmb", "   1 345 180  15  15  90   0   0   0NIMB\n");  // whose reader names the line itself
+    EXPECT_FALSE(runTool("check f.nmb", folder).says("(line"));
+    folder.write("f.ies", faulty);
+    EXPECT_TRUE(runShell("LC_ALL=de ovphoto check f.ies", folder).says("(Zeile 8)"));
+}
+
+TEST(ToolCheck, SaysWhatAnUnknownFileMayBe) {
+    const std::pair<std::string, const char*> cases[] = {
+        {"", "it is empty"},
+        {"\x1F\x8B\b", "gzip"},
+        {std::string("PK\3\4\0\0", 6), "zip archive"},
+        {std::string("\xFF\xFEI\0E\0", 6), "UTF-16"},
+        {std::string("I\0E\0S\0N\0A\0"
+                     "9\0"
+                     "1\0\n\0",
+                     16),
+         "UTF-16"},
+        {"Maker\r\n1\r\n 0 \r\n24\r\n15\r\n37\r\n2,5\r\nReport", "EULUMDAT"},
+        {"IESNA:LM-63-2002\rTILT=NONE\r", "--as ies"},
+        {"Dear reader,\r", "carriage returns alone"},
+        {"Dear reader,\n1\n2\n3\n", "known format\n"}};
+    TempFolder folder;
+    for (const auto& [bytes, hint] : cases) {
+        folder.write("f", bytes);
+        EXPECT_TRUE(runTool("check f", folder).says("not a photometric file of a known format")) << hint;
+        EXPECT_TRUE(runTool("check f", folder).says(hint)) << hint << runTool("check f", folder).out;
+    }
+    folder.write("f", cases[3].first);
+    EXPECT_TRUE(runTool("check f --as ies", folder).says("UTF-16"));
 }

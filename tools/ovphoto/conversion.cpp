@@ -50,7 +50,7 @@ Json droppedOf(const ReadResult& source, const LightFile& made) {
 }
 
 Json convert(const Conversion& conversion, const HostSession& session, const ReadResult& source) {
-    Json report = unconverted(conversion, source.reasons());
+    Json report = unconverted(conversion, conversion.brief ? source.told() : source.reasons());
     if (!source.format.empty()) report["format"] = source.format;
     if (!source.web) return report;
 

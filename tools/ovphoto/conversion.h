@@ -15,6 +15,7 @@ struct Conversion {
     std::string as;  // format to read as; empty: told by content
     const TargetFormat* target;
     bool asSaved = false;
+    bool brief = false;  // messages are for people: see ReadResult::told
 };
 
 /// Converts a file and reads the result again before it is put in place. The report has the members

@@ -1,15 +1,20 @@
 #include "tools/ovphoto/hostSession.h"
 
+#include <algorithm>
 #include <filesystem>
+#include <iterator>
 
 #include "host/componentManager/devices.h"
 #include "host/componentManager/streamEx.h"
 #include "host/platform/file.h"
 #include "host/platform/path.h"
 #include "ovphoto/classIds.h"
+#include "tools/ovphoto/closeFormats.h"
+#include "tools/ovphoto/language.h"
 #include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/standardStreams.h"
+#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
@@ -40,12 +45,73 @@ RnRef<RnComponentBuilder> chooseBuilder(const HostSession& session, RnBufferedIO
     return {};
 }
 
+std::wstring pathOf(const std::string& file) { return fromUtf8(isStandardStream(file) ? "stdin" : file); }
+
+int lineOf(const ReadResult& result, std::size_t message) {
+    return message < result.lines.size() ? result.lines[message] : 0;
+}
+
+/// What stands behind a message that was reported several times in a row, from this line on.
+std::string lineText(int line, std::size_t times) {
+    const std::string where = line > 0 ? inLanguage("line ", "Zeile ") + std::to_string(line) : "";
+    if (times == 1) return where.empty() ? "" : " (" + where + ")";
+    return " (" + std::to_string(times) + inLanguage(" times", "-mal") +
+           (where.empty() ? "" : inLanguage(", from ", ", ab ") + where + inLanguage(" on", "")) + ")";
+}
+
+/// The bytes of an input from its start on, up to and with the one at `position` where there is one.
+std::string bytesTo(RnBufferedIO& io, long position) {
+    constexpr long blockSize = 1 << 16;
+    std::string bytes;
+    io.seek(0, 0);
+    for (int count = 1; count > 0 && std::ssize(bytes) <= position;) {
+        const std::size_t before = bytes.size();
+        const long wanted = std::min(position + 1 - std::ssize(bytes), blockSize);
+        bytes.resize(before + static_cast<std::size_t>(wanted));
+        count = io.readBytes(bytes.data() + before, static_cast<int>(wanted));
+        bytes.resize(before + static_cast<std::size_t>(std::max(count, 0)));
+    }
+    return bytes;
+}
+
+/// The lines that positions lie in, which end in CR LF, LF or CR; behind the end it is the last with anything on it. 0
+/// where nothing of the line has been read: the fault lies elsewhere then, as in a tilt file.
+std::vector<int> linesAt(RnBufferedIO& io, const std::vector<long>& positions) {
+    const std::string bytes = bytesTo(io, *std::max_element(positions.begin(), positions.end()));
+    std::vector<std::size_t> starts{0};
+    for (std::size_t i = 0; i < bytes.size(); ++i) {
+        const bool ends = bytes[i] == '\n' || (bytes[i] == '\r' && i + 1 < bytes.size() && bytes[i + 1] != '\n');
+        if (ends) starts.push_back(i + 1);
+    }
+    std::vector<int> lines;
+    for (const long position : positions) {
+        auto place = static_cast<std::size_t>(std::max(position, 0L));
+        if (place >= bytes.size()) place = bytes.find_last_not_of(" \t\r\n\x1A") + 1;
+        const auto next = std::upper_bound(starts.begin(), starts.end(), place);
+        lines.push_back(*std::prev(next) == place ? 0 : static_cast<int>(next - starts.begin()));
+    }
+    return lines;
+}
+
 }  // namespace
 
 std::vector<std::string> ReadResult::reasons() const {
-    std::vector<std::string> all = messages;
+    std::vector<std::string> all;
+    for (std::size_t i = 0; i < messages.size(); ++i) all.push_back(messages[i] + lineText(lineOf(*this, i), 1));
     if (!error.empty()) all.push_back(error);
     return all;
+}
+
+std::vector<std::string> ReadResult::told() const {
+    if (verbose) return reasons();
+    const std::size_t count = messages.size() - (!web && messages.size() > 1 ? 1 : 0);
+    std::vector<std::string> texts;
+    for (std::size_t i = 0, end = 0; i < count; i = end) {
+        for (end = i + 1; end < count && messages[end] == messages[i];) ++end;
+        texts.push_back(messages[i] + lineText(lineOf(*this, i), end - i));
+    }
+    if (!error.empty()) texts.push_back(error);
+    return texts;
 }
 
 HostSession::HostSession(const std::string& modulePath)
@@ -86,16 +152,43 @@ template <class Open>
 ReadResult HostSession::readFrom(const std::string& file, const std::string& as, Open open) const {
     ReadResult result;
     result.file = file;
+    result.verbose = _verbose;
+    RnRef<RnBufferedIO> io;
+    std::vector<long> positions;  // of the input at each message
     try {
-        const MessageCollector collector(result.messages);
-        if (const RnRef<RnBufferedIO> io = open(result.error)) import(*io, result, as);
+        const MessageCollector collector(result.messages, [&] { positions.push_back(io ? io->seek(0, 1) : 0); });
+        io = open(result.error);
+        if (io) import(*io, result, as);
     } catch (const RnStreamEx::ExReadError& refusal) {
         // A reader that refuses a file has reported why; a failing device has not.
         if (result.messages.empty()) result.error = std::string("cannot be read: ") + refusal.getReason();
     } catch (...) {
         result.error = currentExceptionText();
     }
+    if (io && !result.web) explainRefusal(*io, result, positions, as);
     return result;
+}
+
+/// Adds lines to the messages of a reader that does not name them itself, or what the input may be instead.
+void HostSession::explainRefusal(RnBufferedIO& io, ReadResult& result, const std::vector<long>& positions,
+                                 const std::string& as) const {
+    try {
+        const std::string close = result.format.empty() || !as.empty() ? closeFormat(io) : "";
+        if (!close.empty()) result.error += (result.error.empty() ? "" : ": ") + close;
+        const TargetFormat* format = targetNamed(result.format);
+        if (format && !format->namesLines && !positions.empty() && !canBeRead(io, result))
+            result.lines = linesAt(io, positions);
+    } catch (...) {  // of a device that fails
+    }
+}
+
+/// Whether it is the values of a file that are refused, not their text: then no line has the fault.
+bool HostSession::canBeRead(RnBufferedIO& io, const ReadResult& result) const {
+    std::vector<std::string> unheard;
+    const MessageCollector collector(unheard);
+    auto skip = rnVisitor<const OvPhotometrics::FileFact&>([](const OvPhotometrics::FileFact&) {});
+    io.seek(0, 0);
+    return functions().readFileFacts(io, &result.classId, pathFolder(pathOf(result.file)).c_str(), skip);
 }
 
 void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string& as) const {
@@ -107,7 +200,7 @@ void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string
     result.format = formatName(*builder);
     result.classId = builder->getClassId();
     if (const auto format = rnQuery<RnPhotoFormat>(builder.get())) result.traits = format->getTraits();
-    const std::wstring path = fromUtf8(isStandardStream(result.file) ? "stdin" : result.file);
+    const std::wstring path = pathOf(result.file);
     auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&result](const OvPhotometrics::FileFact& fact) {
         result.facts.push_back({fact.key, fact.text});
     });

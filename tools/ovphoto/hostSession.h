@@ -26,10 +26,15 @@ struct ReadResult {
     Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
     std::vector<Fact> facts;            // in the order of the file; none when it was refused
     std::vector<std::string> messages;  // texts that the reader reported, in order
+    std::vector<int> lines;             // of the input, on which it did so; 0 where that is not known
     std::string error;                  // what the tool itself has to say; empty when there is a web
+    bool verbose = false;               // whether people are told everything
 
     /// Why the file was refused, or what was reported though it was not: the reader's texts, then the tool's own.
     std::vector<std::string> reasons() const;
+    /// The same for people: equal texts in a row once and, where a file is refused for several, without the last one,
+    /// which only follows from the others: a reader ends with what it missed for their sake.
+    std::vector<std::string> told() const;
 };
 
 /// The tool as a host: the module is loaded, and files are read through whatever builders it brings.
@@ -38,6 +43,10 @@ public:
     /// Loads the module at `modulePath`, or, when that is empty, the one beside the tool or in ../lib from there.
     /// Raises ExModule.
     explicit HostSession(const std::string& modulePath);
+
+    /// Lets people be told everything of what is read from now on.
+    void setVerbose(bool verbose) { _verbose = verbose; }
+    bool verbose() const { return _verbose; }
 
     Ov::RnComponentManager& manager() const { return *_manager; }
     const Ov::Module& module() const { return *_module; }
@@ -65,9 +74,13 @@ private:
     template <class Open>
     ReadResult readFrom(const std::string& file, const std::string& as, Open open) const;
     void import(Ov::RnBufferedIO& io, ReadResult& result, const std::string& as) const;
+    void explainRefusal(Ov::RnBufferedIO& io, ReadResult& result, const std::vector<long>& positions,
+                        const std::string& as) const;
+    bool canBeRead(Ov::RnBufferedIO& io, const ReadResult& result) const;
 
     Ov::RnRef<Ov::RnComponentManager> _manager;
     const Ov::Module* _module;
+    bool _verbose = false;
 };
 
 /// "IES" for the builder named "IES Web".

@@ -47,7 +47,7 @@ std::optional<LightFile> makeFile(const HostSession& session, const std::string&
         made.facts = std::move(again.facts);
     } else {
         made.refusal = std::string("the output is no readable ") + target.name + " file";
-        for (const std::string& reason : again.reasons()) made.refusal += ": " + reason;
+        for (const std::string& reason : again.told()) made.refusal += ": " + reason;
     }
     return made;
 }

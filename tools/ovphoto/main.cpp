@@ -15,9 +15,10 @@ using namespace OvTool;
 constexpr const char* helpHint = "Run with --help for more information.";
 
 /// Runs the command that was given; whatever it throws but wrong usage ends here as a message.
-int runCommand(const Action& action, const std::string& module) {
+int runCommand(const Action& action, const std::string& module, bool verbose) {
     try {
         HostSession session(module);
+        session.setVerbose(verbose);
         return action(session);
     } catch (const CLI::ParseError&) {
         throw;  // what the module alone can tell of the arguments
@@ -30,6 +31,9 @@ int runCommand(const Action& action, const std::string& module) {
 int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     std::string module;
     app.add_option("--module", module, "Load this module instead of the one beside the tool")->type_name("PATH");
+    bool verbose = false;
+    app.add_flag("--verbose", verbose,
+                 "Tell every message of a reader, those that only follow from others as well");
     app.set_version_flag("--version", "ovphoto " OVPHOTO_VERSION, "Print the version and exit");
     app.require_subcommand(0, 1);
     app.fallthrough();
@@ -47,7 +51,7 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
         std::reverse(arguments.begin(), arguments.end());  // so they are parsed, from the end
         app.parse(arguments);
         for (const auto& [sub, action] : actions) {
-            if (sub->parsed()) return runCommand(action, module);
+            if (sub->parsed()) return runCommand(action, module, verbose);
         }
     } catch (const CLI::ParseError& error) {
         return app.exit(error) == 0 ? exitWell : exitUsage;

@@ -9,10 +9,10 @@ namespace {
 using Functions = OvPhotometrics::NumberedFunctions;
 
 constexpr TargetFormat formats[] = {
-    {"IES", "ies", &Functions::writeIes},
-    {"CIBSE", "cib", &Functions::writeCibse},
-    {"NIMB", "nmb", &Functions::writeNimb},
-    {"TBT", "tbt", &Functions::writeTbt},
+    {"IES", "ies", &Functions::writeIes, false},
+    {"CIBSE", "cib", &Functions::writeCibse, false},
+    {"NIMB", "nmb", &Functions::writeNimb, true},
+    {"TBT", "tbt", &Functions::writeTbt, true},
 };
 
 }  // namespace

@@ -12,6 +12,7 @@ struct TargetFormat {
     const char* name;       // "IES", as formatName gives it
     const char* extension;  // "ies"
     decltype(&OvPhotometrics::NumberedFunctions::writeIes) write;
+    bool namesLines;  // in the messages of its reader
 };
 
 std::span<const TargetFormat> targetFormats();

@@ -35,15 +35,8 @@ void printJson(const ReadResult& result, const std::vector<std::string>& warning
                    {"warnings", warnings}});
 }
 
-/// Prints the texts, equal ones in a row once with their count.
 void printTexts(const char* label, const std::vector<std::string>& texts) {
-    for (std::size_t i = 0; i < texts.size();) {
-        std::size_t end = i + 1;
-        while (end < texts.size() && texts[end] == texts[i]) ++end;
-        const std::string times = end - i > 1 ? " (" + std::to_string(end - i) + " times)" : "";
-        say(std::string("    ") + label + texts[i] + times);
-        i = end;
-    }
+    for (const std::string& text : texts) say(std::string("    ") + label + text);
 }
 
 void printText(const ReadResult& result, const std::vector<std::string>& warnings) {
@@ -51,7 +44,7 @@ void printText(const ReadResult& result, const std::vector<std::string>& warning
     format.resize(5, ' ');
     const char* verdict = !result.web ? "refused  " : warnings.empty() ? "ok       " : "warning  ";
     say(verdict + format + "  " + result.file);
-    printTexts("", result.reasons());
+    printTexts("", result.told());
     printTexts("warning: ", warnings);
 }
 

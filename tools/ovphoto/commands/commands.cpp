@@ -66,7 +66,7 @@ void showReasons(const std::string& file, const std::vector<std::string>& reason
     for (const std::string& reason : reasons) complain(file + ": " + reason);
 }
 
-void showReasons(const ReadResult& result) { showReasons(result.file, result.reasons()); }
+void showReasons(const ReadResult& result) { showReasons(result.file, result.told()); }
 
 void printRefusal(const std::string& file, const std::vector<std::string>& reasons) {
     printLine(Json{{"file", file}, {"error", reasons.front()}, {"messages", reasons}});

@@ -23,7 +23,8 @@ std::optional<std::size_t> parseJobs(const std::string& text) {
 }
 
 int convertOne(const ConvertOptions& options, const HostSession& session) {
-    const Conversion conversion{options.paths[0], options.paths[1], options.as, options.target, options.asSaved};
+    const Conversion conversion{options.paths[0], options.paths[1], options.as,
+                                options.target,   options.asSaved,  options.brief};
     const Json report = convertFile(conversion, session);
     printReport(report, conversion, options.json);
     return report["ok"].get<bool>() ? exitWell : exitFailed;
@@ -31,6 +32,7 @@ int convertOne(const ConvertOptions& options, const HostSession& session) {
 
 /// What depends on more than one argument.
 void checkArguments(ConvertOptions& options) {
+    if (!options.json) options.brief = true;
     if (!options.folder.empty()) {
         if (std::any_of(options.paths.begin(), options.paths.end(), isStandardStream))
             throw CLI::ValidationError("--into", "what comes from standard input has no name there");
@@ -63,6 +65,8 @@ Action declareConvert(CLI::App& app) {
     app.add_flag("--as-saved", options->asSaved,
                  "Write what a web's own save writes, relative values as a rule, instead of candela for other "
                  "programs");
+    app.add_flag("--brief", options->brief)
+        ->group("");  // for the tool's own processes: JSON of what people are told
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
     app.callback([options] { checkArguments(*options); });

@@ -66,7 +66,7 @@ public:
         const fs::path folder = Ov::nativePath(Ov::fromUtf8(_options.folder));
         const std::wstring stem = Ov::pathStem(Ov::fromUtf8(file.path));
         const std::string out = pathText(folder / Ov::nativePath(stem)) + "." + _options.target->extension;
-        return {{file.path, out, _options.as, _options.target, _options.asSaved},
+        return {{file.path, out, _options.as, _options.target, _options.asSaved, _options.brief},
                 file.error.empty() ? refusal(file.path, out) : file.error};
     }
 
@@ -104,6 +104,8 @@ std::vector<std::string> argumentsOf(const ConvertOptions& options, const HostSe
         "--into",  options.folder};
     if (!options.as.empty()) arguments.insert(arguments.end(), {"--as", options.as});
     if (options.asSaved) arguments.push_back("--as-saved");
+    if (options.brief) arguments.push_back("--brief");
+    if (session.verbose()) arguments.push_back("--verbose");
     arguments.push_back("--");
     return arguments;
 }

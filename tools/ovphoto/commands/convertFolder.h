@@ -16,6 +16,7 @@ struct ConvertOptions {
     std::size_t jobs = 1;
     bool asSaved = false;
     bool json = false;
+    bool brief = false;  // tell people, though the report is in JSON
 };
 
 /// Converts files, and those in folders, into a folder; the exit status.

@@ -143,7 +143,7 @@ std::string candelaSection(const DrawnFile& file) {
 
 Datasheet datasheetOf(DrawnFile file) {
     Datasheet sheet{std::move(file), {}, {}};
-    sheet.remarks = sheet.file.source.reasons();
+    sheet.remarks = sheet.file.source.told();
     const auto warnings = webWarnings(sheet.file.source);
     sheet.remarks.insert(sheet.remarks.end(), warnings.begin(), warnings.end());
     sheet.diagram = diagramOf({&sheet.file, 1});

@@ -122,7 +122,7 @@ std::string pageNameOf(const std::string& file, std::size_t number) {
 Entry refusedEntry(const ReadResult& result) {
     return {"<tr class=\"refused\"><td></td><th scope=\"row\">" + escaped(result.file) + "</th><td></td>" +
                 cell(result.format) + numberCell({}, "") + numberCell({}, "") + numberCell({}, "") +
-                numberCell({}, "") + "<td>refused</td>" + remarksCell(result.reasons()) + "</tr>\n",
+                numberCell({}, "") + "<td>refused</td>" + remarksCell(result.told()) + "</tr>\n",
             "", ""};
 }
 
