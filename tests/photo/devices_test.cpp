@@ -13,6 +13,7 @@
 #include "components/photo/tbt/photoWebTBT.h"
 #include "tests/photo/photoFixture.h"
 #include "tests/support/dripDevice.h"
+#include "tests/support/paths.h"
 #include "tests/support/plainDevice.h"
 
 // What devices of hosts are read and written as memory is: all forms of files and streams, with the same objects,
@@ -147,8 +148,8 @@ TEST_P(Devices, AreReadAndWrittenAsMemoryIs) {
                 readsAsMemory(bytes.substr(0, size));
         }
     }
-    for (const char* folder : {OVPHOTO_SOURCE_DIR "/tests/data", OVPHOTO_SOURCE_DIR "/examples"})
-        for (const auto& entry : std::filesystem::recursive_directory_iterator(folder)) {
+    for (const char* folder : {"/tests/data", "/examples"})
+        for (const auto& entry : std::filesystem::recursive_directory_iterator(sourceFolder() + folder)) {
             if (!entry.is_regular_file()) continue;
             std::ifstream file(entry.path(), std::ios::binary);
             const std::string bytes{std::istreambuf_iterator<char>(file), {}};
