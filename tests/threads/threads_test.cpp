@@ -4,6 +4,7 @@
 
 #include "components/photo/distributions/web.h"
 #include "components/photo/naturallight/calendar.h"
+#include "components/photo/naturallight/timeZones.h"
 #include "host/componentManager/importer.h"
 #include "ovphoto/classIds.h"
 #include "ovphoto/naturalLight.h"
@@ -89,6 +90,24 @@ TEST_F(Threads, CreateAndLoadObjectsOfTheirOwn) {
     EXPECT_EQ(wrong, 0);
 }
 
+TEST_F(Threads, AskForTextsThatNobodyHasAskedFor) {
+    const std::wstring file = Ov::messageFile().fileName();
+    const auto names = [] {
+        std::wstring all;
+        for (int month = 1; month <= monthsInYear; ++month) all += getMonthName(month);
+        for (int zone = 0; zone < getTimeZoneCount(); ++zone) all += getTimeZoneName(zone);
+        return all;
+    };
+    const std::wstring alone = names();
+    std::atomic<int> wrong = 0;
+    for (int round = 0; round < 50; ++round) {
+        Ov::releaseTexts();
+        Ov::messageFile().setFileName(file.c_str());
+        together([&] { wrong += names() != alone; });
+    }
+    EXPECT_EQ(wrong, 0);
+}
+
 /// Files of all formats, good and refused, whose light and messages tell the number of their thread.
 std::array<std::string, 9> filesOf(int number) {
     const std::string n = std::to_string(number), feeds(static_cast<std::size_t>(number), '\n');
@@ -151,7 +170,7 @@ TEST_F(Threads, ImportFilesOfAllFormatsWhileOthersEvaluateAndSave) {
     const auto everythingElse = [&] {
         const auto sun = Ov::rnCast<Ov::RnNaturalLight>(manager->createObject(classIds::naturalLight).get());
         return std::to_string(light->intensity(1, 1)) + saved(*light) + saved(*web) + saved(*sun) +
-               std::to_string(sun->getSolarAltitude()) + Ov::toUtf8(getMonthName(6));
+               std::to_string(sun->getSolarAltitude());
     };
     const std::string expected = everythingElse();
 
