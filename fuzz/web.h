@@ -14,9 +14,11 @@
 #include "components/photo/nimb/photoWebNIMB.h"
 #include "components/photo/tbt/photoWebTBT.h"
 #include "fuzz/fuzz.h"
+#include "host/componentManager/componentManager.h"
+#include "tests/support/plainDevice.h"
 
 // What is demanded of the builder of a file format: any bytes are refused with a message, or give, without one, a
-// web that is whole, gives light everywhere, is written in every format, and reads back.
+// web that is whole, gives light everywhere, is written in every format, and reads back. Written, it is of that format by content.
 
 namespace OvPhotometrics::fuzz {
 
@@ -104,6 +106,9 @@ inline void demandLight(const Ov::RnPhotoWebData& web, Ov::RnIntensityDist& ligh
     demandAll(DirectionForm::vectors, vectors, [&](const float* d) {
         return light.intensityAt({d[0], d[1], d[2]});
     });
+    demandAll(DirectionForm::localVectors, vectors, [&](const float* d) {
+        return light.localIntensityAt({d[0], d[1], d[2]});
+    });
 }
 
 /// The web that a format's builder imports, checked; null when it is refused.
@@ -124,6 +129,13 @@ RnRef<Ov::RnPhotoWebData> imported(Ov::RnBufferedIO& io, std::size_t size) {
     return web;
 }
 
+/// The class that the importer makes of an input; none when it knows no format.
+inline Ov::RnUid recognisedAs(Ov::RnBufferedIO& io) {
+    const auto manager = Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager());
+    const auto importers = manager->importersFor(photometricWebCategory, &io);
+    return importers.empty() ? Ov::RnUid{} : importers.front()->getClassId();
+}
+
 /// Writes a web as a file for other programs, with the facts of the file that it came from, and reads that.
 template <class Format>
 void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
@@ -138,7 +150,7 @@ void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
     demand(written || !ordinary(web.getMaxCandela()) || !ordinary(web.getLumens()), "what is read is written");
     if (!written) return;
     io->seek(0, 0);
-    demand(builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get())), "what is written is recognised");
+    demand(recognisedAs(*io) == Format::facts.classId, "what is written is recognised as its format");
     demand(!!imported<Format>(*io, io->bytes().size()), "what is written is read");
 }
 
@@ -150,6 +162,9 @@ void tryFile(std::string_view bytes) {
     builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get()));
     demand(io->seek(0, 1) == 0 && takeMessages() == 0, "the content test leaves no trace");
     const auto web = imported<Format>(*io, bytes.size());
+    const auto plain = Ov::rnCreate<PlainDevice>(bytes);
+    demand(!!imported<Format>(*plain, bytes.size()) == !!web && plain->seek(0, 1) == io->seek(0, 1),
+           "every device is read the same");
     if (!web) return;
     const auto facts = [&] {
         FileFacts all;
