@@ -113,10 +113,13 @@ TEST_F(Files, AreFoundInTheOrderOfPlacesAndSpellings) {
 TEST(ProcessController, ReportsToItsReporterOrStandardError) {
     const auto controller = rnCast<RnProcessController>(RnGetProcessController());
     std::wstring heard;
-    setMessageReporter([&](int level, const wchar_t* text) { heard = std::to_wstring(level) + text; });
+    // Gone from inside its own call, it is whole to the end of it.
+    setMessageReporter([&heard, own = std::vector(1000, L'x')](int level, const wchar_t* text) {
+        setMessageReporter(nullptr);
+        heard = std::to_wstring(level) + text + own.back();
+    });
     controller->report(3, L"c");
-    EXPECT_EQ(heard, L"3c");
-    setMessageReporter(nullptr);
+    EXPECT_EQ(heard, L"3cx");
     testing::internal::CaptureStderr();
     controller->report(0, L"l\xE4mp\xDCFF");
     controller->report(0, nullptr);
