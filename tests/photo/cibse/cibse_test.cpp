@@ -61,6 +61,7 @@ TEST_F(Cibse, PlanesAreLitWhereTheFileSays) {
         {1, {90, 180, 270}, Half, 3, {90, 180, 270}},
         {1, {270, 330, 0, 30, 90}, Half, 5, {270, 330, 0, 30, 90}},
         {1, {270, 0, 90, 180, 270}, Full, 4, {270, 0, 90, 180}},
+        {1, {270, 0, 90, 180, 269}, Full, 5, {270, 0, 90, 180, 269}},
         {1, {270, 360, 90, 225}, Full, 4, {270, 0, 90, 225}},
         {2, {-70, 0, 80}, Full, 3, {-1, -90}},  // turned: the axis lies at -Y
     };
@@ -92,19 +93,22 @@ TEST_F(Cibse, SavesGridsThatFitAndSamplesOthers) {
     EXPECT_EQ(saved(*immortal<CIBSEBuilder>().create()),
               first + "2" + factors + "2 1\n 0.00 180.00\n 0.00\n 0.00 0.00\n99 0 0 0\n");
 
-    PhotoWebRecord half;
-    photoWebRecordInit(half, 2, 2, PhotoWebSymmetry::Half, false, false, nullptr);
-    for (int i = 0; i < 2; ++i) {
-        photoWebRecordSetTheta(half, i, toRadians(20 + 100 * i));
-        photoWebRecordSetPsi(half, i, toRadians(180 * i));
-        for (int j = 0; j < 2; ++j) photoWebRecordSetCandela(half, i, j, 8);
+    using enum PhotoWebSymmetry;
+    for (const auto& [symmetry, lastPsi, planes] : {std::tuple(Half, 180, 19), {Quarter, 90, 10}}) {
+        PhotoWebRecord other;
+        photoWebRecordInit(other, 2, 2, symmetry, false, false, nullptr);
+        for (int i = 0; i < 2; ++i) {
+            photoWebRecordSetTheta(other, i, toRadians(20 + 100 * i));
+            photoWebRecordSetPsi(other, i, toRadians(lastPsi * i));
+            for (int j = 0; j < 2; ++j) photoWebRecordSetCandela(other, i, j, 8);
+        }
+        ASSERT_TRUE(photoWebInstall(*web, other));
+        const auto again = imported(saved(*web));
+        ASSERT_TRUE(again) << log.take();
+        EXPECT_EQ(again->getSymmetry(), symmetry);
+        EXPECT_EQ(again->getPsiCount() * 100 + again->getThetaCount(), planes * 100 + 19);
+        EXPECT_NEAR(again->getMaxCandela(), 8000 / web->getLumens(), 0.01);
     }
-    ASSERT_TRUE(photoWebInstall(*web, half));
-    const auto again = imported(saved(*web));
-    ASSERT_TRUE(again) << log.take();
-    EXPECT_EQ(again->getSymmetry(), PhotoWebSymmetry::Half);
-    EXPECT_EQ(again->getPsiCount() * 100 + again->getThetaCount(), 1919);
-    EXPECT_NEAR(again->getMaxCandela(), 8000 / web->getLumens(), 0.01);
 }
 
 TEST_F(Cibse, RecordsAndFactsReadBackAsWritten) {

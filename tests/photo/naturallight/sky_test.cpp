@@ -123,6 +123,29 @@ TEST(Sky, HorizontalIlluminanceFollowsTheAltitude) {
             EXPECT_FLOAT_EQ(skyWith(covers[i], c.altitude).skyHorizontalIlluminance, c.lux[i]) << c.altitude;
 }
 
+TEST(Sky, ValuesOfTheModel) {
+    // Worked out apart, from the model's formulas: 21 June, the sun 30 degrees high.
+    const struct {
+        float direct, zenith;
+        std::array<float, 6> coefficients;
+    } cases[] = {{80990.858f, 1837.9965f, {4613.9737f, 0, 1724.8773f, 8084.6657f, 5798.2757f, 2987.7877f}},
+                 {24886.77f, 5247.1477f, {6087.0421f, 0, 6283.1855f, 15021.51f, 11350, 4959.1901f}},
+                 {0, 4417.2001f, {6419.3927f, 1481.5528f, 4250.0001f, 0, 5350.0001f, 0}}};
+    for (int i = 0; i < 3; ++i) {
+        const Daylight sky = skyWith(covers[i], 30);
+        EXPECT_FLOAT_EQ(sky.directNormalIlluminance, cases[i].direct);
+        EXPECT_FLOAT_EQ(sky.zenithLuminance, cases[i].zenith);
+        for (std::size_t k = 0; k < 6; ++k)
+            EXPECT_FLOAT_EQ(sky.skyCoefficients[k], cases[i].coefficients[k]) << covers[i] << " " << k;
+    }
+    const float shares[] = {0.263f, 0.655f, 0.082f};  // of red, green and blue in a luminance
+    for (std::size_t k = 0; k < 3; ++k) {
+        Ov::NaturalLightSettings settings{.sunColor = {}};
+        settings.sunColor[k] = 2;
+        EXPECT_FLOAT_EQ(computeDaylight(settings, {}).sunColor[k], 1 / shares[k]);
+    }
+}
+
 TEST(Sky, CoverChoosesTheKind) {
     EXPECT_EQ(skyWith(std::nextafter(0.35f, 0.0f), 60).skyType, SkyType::clear);
     EXPECT_EQ(skyWith(0.35f, 60).skyType, SkyType::partlyCloudy);

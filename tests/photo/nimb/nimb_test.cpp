@@ -55,6 +55,8 @@ TEST_F(Nimb, FieldsAndLines) {
     EXPECT_EQ(rec.lines, (Lines{std::wstring(72, L'x'), L"", L"\tb", L"d"}));
     EXPECT_EQ(rec.identifier, 12340678);
     EXPECT_EQ((std::array{rec.spare1, rec.spare2, rec.spare3, rec.symmetryCode1}), (std::array{0, -12, -1, -1}));
+    ASSERT_TRUE(read(head + "           3\n" + lines + "   1  20 300"));  // one code of two
+    EXPECT_EQ(rec.symmetryCode1, 3);
 }
 
 TEST_F(Nimb, WhatIsWrittenReadsBack) {

@@ -107,8 +107,9 @@ TEST_F(Tbt, RowsAreWrittenInShortAndReadBack) {
         {{10, 0, 0, 0}, " 10.00 Z0\n"},
         {{10, 0}, " 10.00 0.\n"},
         {{0, 0, 0}, " 0.00 Z0\n"},
-        // A line of 66 characters takes a further value, one of 70 does not.
-        {std::vector<float>(12, 10), " 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00\n"},
+        // A line of 68 characters takes a further value, one of 70 does not.
+        {{1000, 10, 10, 10, 10, 10, 10, 10, 10, 10, 10, 9},
+         " 1000.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 10.00 9.00\n"},
         {std::vector<float>(8, 123456.75f),
          " 123456.75 123456.75 123456.75 123456.75 123456.75 123456.75 123456.75\n 123456.75\n"},
     };
