@@ -224,9 +224,22 @@ TEST(ToolIntensity, AnswersEveryGivenDirection) {
     EXPECT_EQ(candela("30,0 60,90 90,270 120,0"), (Values{300, 690, 1170, 0}));
     EXPECT_EQ(candela("", "30,0\n  60\t90 \r\n\n# a comment\n90 , 270\n120 0"), (Values{300, 690, 1170, 0}));
     EXPECT_EQ(candela("30,0 --flux 500"), Values{150});
-    // Minus signs, behind "--" and without it: psi of -90 is 270, theta below 0 is 0.
-    EXPECT_EQ(candela("-- -5,0 30,-90"), (Values{0, 570}));
-    EXPECT_EQ(candela("-5,0 30,-90"), (Values{0, 570}));
+    // Minus signs, behind "--" and without it: psi of -90 is 270.
+    EXPECT_EQ(candela("-- 30,-90 0,-0"), (Values{570, 0}));
+    EXPECT_EQ(candela("30,-90"), Values{570});
+    // Below the axis there is nothing; where it is depends on the file.
+    EXPECT_EQ(candela("", "-5,0\n60,90"), Values{690});
+    for (const char* frame : {"file", "local", "host"}) {
+        const ToolResult below = runTool("intensity f.ies 30,0 -5,0 --frame " + std::string(frame), folder);
+        EXPECT_TRUE(below.status == 2 && below.out.empty() && below.says("-5")) << frame << below.err;
+    }
+    file.type = 3;
+    file.verticals = {-90, 0, 90};
+    file.horizontals = {-90, 0, 90};
+    folder.write("a.ies", file.text());
+    EXPECT_TRUE(runTool("intensity a.ies -90,0", folder).says("cd"));
+    EXPECT_EQ(runTool("intensity a.ies -90.1,0", folder).status, 2);
+    EXPECT_EQ(runTool("intensity a.ies -90,0 --frame local", folder).status, 2);
     EXPECT_TRUE(runTool("intensity f.ies 60,90", folder).says("60 deg       90 deg          690 cd"));
 
     const ToolResult bad = runTool("intensity f.ies --json", folder, "0 0\n\nnorth\n45 0\n");

@@ -63,6 +63,14 @@ public:
     IntensityPrinter(const IntensityOptions& options, const RnWebIntensityDist& light)
         : _frame(options.frame), _json(options.json), _light(light), _file(fileInfoOf(*light.getWeb())) {}
 
+    /// Why there is no such direction; empty where there is.
+    std::string fault(const Direction& direction) const {
+        const double lowest = _frame == "file" ? -double{_file.verticalShift} : 0;
+        if (direction.first >= lowest) return {};
+        return exactNumber(direction.first) + " deg is below the axis, which is at " +
+               exactNumber(static_cast<float>(lowest));
+    }
+
     void print(const Direction& direction) const {
         const float candela = towards(direction);
         if (_json) {
@@ -98,10 +106,12 @@ int answerInput(const IntensityPrinter& printer) {
     for (int number = 1; std::cout && std::getline(std::cin, line); ++number) {
         const std::string_view text = trimmed(line);
         if (text.empty() || text.front() == '#') continue;
-        if (const auto direction = parseDirection(text)) {
+        const auto direction = parseDirection(text);
+        const std::string fault = direction ? printer.fault(*direction) : "no direction (two angles in degrees)";
+        if (fault.empty()) {
             printer.print(*direction);
         } else {
-            complain("standard input, line " + std::to_string(number) + ": no direction (two angles in degrees)");
+            complain("standard input, line " + std::to_string(number) + ": " + fault);
             status = exitFailed;
         }
     }
@@ -127,6 +137,10 @@ int runIntensity(const IntensityOptions& options, const HostSession& session) {
     }
     const IntensityPrinter printer(options, *light);
     if (options.directions.empty()) return answerInput(printer);
+    for (const std::string& text : options.directions) {
+        const std::string fault = printer.fault(*parseDirection(text));
+        if (!fault.empty()) throw CLI::ValidationError("DIRECTION", "'" + text + "': " + fault);
+    }
     for (const std::string& text : options.directions) printer.print(*parseDirection(text));
     return exitWell;
 }
