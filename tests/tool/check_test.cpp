@@ -113,8 +113,11 @@ TEST(ToolCheck, TellsWhereTheFaultIsAndNotWhatFollowsFromIt) {
         const std::string all = runTool("info f.ies --verbose", folder).err;
         EXPECT_EQ(static_cast<std::size_t>(std::count(all.begin(), all.end(), '\n')), c.messages) << c.name << all;
     }
-    folder.write("f.nmb", "   1 345 180  15  15  90   0   0   0NIMB\n");  // whose reader names the line itself
-    EXPECT_FALSE(runTool("check f.nmb", folder).says("(line"));
+    folder.write("f.ies", good);
+    runTool("convert f.ies f.nmb", folder);
+    folder.write("f.nmb", readBytes(folder.path() / "f.nmb").substr(0, 90));
+    const ToolResult nimb = runTool("check f.nmb", folder);  // whose reader names the line itself
+    EXPECT_TRUE(nimb.says("refused  NIMB") && nimb.says("Line ") && !nimb.says("(line")) << nimb.out;
     folder.write("f.ies", faulty);
     EXPECT_TRUE(runShell("LC_ALL=de ovphoto check f.ies", folder).says("(Zeile 8)"));
 }
@@ -133,6 +136,7 @@ TEST(ToolCheck, SaysWhatAnUnknownFileMayBe) {
         {"Maker\r\n1\r\n 0 \r\n24\r\n15\r\n37\r\n2,5\r\nReport", "EULUMDAT"},
         {"IESNA:LM-63-2002\rTILT=NONE\r", "--as ies"},
         {"Dear reader,\r", "carriage returns alone"},
+        {"Maker\n9\n0\n24\n15\n37\n2\n", "known format\n"},
         {"Dear reader,\n1\n2\n3\n", "known format\n"}};
     TempFolder folder;
     for (const auto& [bytes, hint] : cases) {
