@@ -61,12 +61,12 @@ std::string lineText(int line, std::size_t times) {
 
 /// The bytes of an input from its start on, up to and with the one at `position` where there is one.
 std::string bytesTo(RnBufferedIO& io, long position) {
-    constexpr long blockSize = 1 << 16;
+    constexpr std::ptrdiff_t blockSize = 1 << 16;
     std::string bytes;
     io.seek(0, 0);
     for (int count = 1; count > 0 && std::ssize(bytes) <= position;) {
         const std::size_t before = bytes.size();
-        const long wanted = std::min(position + 1 - std::ssize(bytes), blockSize);
+        const auto wanted = std::min<std::ptrdiff_t>(position + 1 - std::ssize(bytes), blockSize);
         bytes.resize(before + static_cast<std::size_t>(wanted));
         count = io.readBytes(bytes.data() + before, static_cast<int>(wanted));
         bytes.resize(before + static_cast<std::size_t>(std::max(count, 0)));
