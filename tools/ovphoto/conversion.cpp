@@ -9,6 +9,7 @@
 #include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
+#include "tools/ovphoto/webTexts.h"
 #include "tools/ovphoto/webWarnings.h"
 
 namespace OvTool {
@@ -20,6 +21,13 @@ namespace {
 
 void append(Json& array, const std::vector<std::string>& texts) {
     for (const std::string& text : texts) array.push_back(text);
+}
+
+/// What a file was read from: itself, and its tilt file.
+InputFiles inputsOf(const ReadResult& source) {
+    InputFiles inputs(source.web ? filesOf(*source.web) : std::vector<std::string>());
+    inputs.add(source.file);
+    return inputs;
 }
 
 /// Writes what was read as another file in memory.
@@ -67,7 +75,8 @@ Json convert(const Conversion& conversion, const HostSession& session, const Rea
         append(report[conversion.asSaved ? "warnings" : "messages"], {made->refusal});
     }
     if (made && (made->light || conversion.asSaved)) {
-        const std::string error = writeFile(conversion.out, made->bytes);
+        std::string error = inputsOf(source).refusal(conversion.out);
+        if (error.empty()) error = writeFile(conversion.out, made->bytes);
         if (!error.empty()) messages.push_back(conversion.out + ": " + error);
         report["ok"] = error.empty();
     }

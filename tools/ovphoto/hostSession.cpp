@@ -257,18 +257,29 @@ RnRef<RnBufferedIO> openFile(const std::string& file, std::string& error) {
     return {};
 }
 
-std::string currentExceptionText() {
+namespace {
+
+template <class Take>
+auto takeExceptionText(Take take) {
     try {
         throw;
     } catch (const ExBase& error) {
-        return error.getReason();
+        return take(error.getReason());
     } catch (const std::bad_alloc&) {
-        return "not enough memory";
+        return take("not enough memory");
     } catch (const std::exception& error) {
-        return error.what();
+        return take(error.what());
     } catch (...) {
-        return "failed for an unknown reason";
+        return take("failed for an unknown reason");
     }
 }
+
+}  // namespace
+
+std::string currentExceptionText() {
+    return takeExceptionText([](const char* text) { return std::string(text); });
+}
+
+void tellCurrentException(void (*tell)(const char* text)) { takeExceptionText(tell); }
 
 }  // namespace OvTool

@@ -91,8 +91,11 @@ std::string extensionOf(Ov::RnComponentBuilder& builder);
 /// Opens a file, or standard input as "-", for reading. When that fails it gives null and says in `error` why.
 Ov::RnRef<Ov::RnBufferedIO> openFile(const std::string& file, std::string& error);
 
-/// What the exception in flight says; to be called in a handler.
+/// @{
+/// What the exception in flight says; to be called in a handler. The second hands the text on without memory of its own.
 std::string currentExceptionText();
+void tellCurrentException(void (*tell)(const char* text));
+/// @}
 
 inline constexpr const char* unknownFormat = "not a photometric file of a known format";
 

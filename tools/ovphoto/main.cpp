@@ -1,10 +1,14 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <exception>
 #include <iostream>
 #include <utility>
 #include <vector>
 
 #include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/terminal.h"
 
@@ -14,19 +18,33 @@ using namespace OvTool;
 
 constexpr const char* helpHint = "Run with --help for more information.";
 
-/// Runs the command that was given; whatever it throws but wrong usage ends here as a message.
-int runCommand(const Action& action, const std::string& module, bool verbose) {
+/// A line on standard error, by the way that takes no memory.
+void tell(const char* text) noexcept {
+    for (const char* part : {"ovphoto: ", text, "\n"}) std::fputs(part, stderr);
+}
+
+/// Tells of the exception that ends the run, cleaned as all that people read while there is memory for that.
+void tellException() {
     try {
-        HostSession session(module);
-        session.setVerbose(verbose);
-        return action(session);
-    } catch (const CLI::ParseError&) {
-        throw;  // what the module alone can tell of the arguments
-    } catch (...) {
         complain("ovphoto: " + currentExceptionText());
-        return exitFailed;
+    } catch (...) {
+        tellCurrentException(tell);
     }
 }
+
+/// Where an exception cannot be caught, as in the destructors of libraries when memory is gone.
+[[noreturn]] void breakOff() noexcept {
+    std::set_terminate([] { std::_Exit(exitFailed); });
+    std::current_exception() ? tellCurrentException(tell) : tell("broke off");
+    removeUnfinishedFiles();
+    std::_Exit(exitFailed);
+}
+
+/// Constants of libraries take memory, too, before `main`.
+struct Guard {
+    Guard() { std::set_terminate(breakOff); }
+};
+[[gnu::init_priority(101)]] const Guard guard;
 
 int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     std::string module;
@@ -51,9 +69,12 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
         std::reverse(arguments.begin(), arguments.end());  // so they are parsed, from the end
         app.parse(arguments);
         for (const auto& [sub, action] : actions) {
-            if (sub->parsed()) return runCommand(action, module, verbose);
+            if (!sub->parsed()) continue;
+            HostSession session(module);
+            session.setVerbose(verbose);
+            return action(session);
         }
-    } catch (const CLI::ParseError& error) {
+    } catch (const CLI::ParseError& error) {  // by the session, too: what the module alone can tell of arguments
         return app.exit(error) == 0 ? exitWell : exitUsage;
     }
     complain("A command is required");
@@ -61,11 +82,7 @@ int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     return exitUsage;
 }
 
-}  // namespace
-
-int main(int argc, char** argv) {
-    prepareStandardStreams();
-    std::ios::sync_with_stdio(false);
+int run(std::vector<std::string> arguments) {
     CLI::App app{"Reads, checks and converts photometric files of luminaires; works out the light of sun and sky.",
                  "ovphoto"};
     app.get_formatter()->label("SUBCOMMAND", "COMMAND");
@@ -75,7 +92,21 @@ int main(int argc, char** argv) {
         "Angles are in degrees: theta from the axis, psi around it; latitudes positive towards north, "
         "longitudes,\n"
         "time zones and azimuths (0 is south) towards west.");
-    const int status = parseAndRun(app, commandLine(argc, argv));
+    return parseAndRun(app, std::move(arguments));
+}
+
+}  // namespace
+
+/// Whatever is thrown ends here as a message.
+int main(int argc, char** argv) {
+    int status = exitFailed;
+    try {
+        prepareStandardStreams();
+        std::ios::sync_with_stdio(false);
+        status = run(commandLine(argc, argv));
+    } catch (...) {
+        tellException();
+    }
     if (std::cout.flush()) return status;
     // Whoever closes a pipe has read enough.
     if (!standardOutputIsClosedPipe()) complain("ovphoto: standard output cannot be written");

@@ -1,8 +1,12 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <memory>
+#include <optional>
 #include <string>
+#include <string_view>
+#include <system_error>
 #include <utility>
 #include <vector>
 
@@ -11,8 +15,8 @@
 namespace OvTool {
 
 /// Makes sure that the three standard streams can be told from files opened later, even if the caller closed
-/// them, that writing to a closed pipe is an error like any other instead of the end of the process, and that
-/// bytes pass as they are.
+/// them, that writing to a closed pipe or beyond the largest size of files is an error like any other instead of the
+/// end of the process, and that bytes pass as they are.
 void prepareStandardStreams();
 bool standardErrorIsTerminal();
 /// Whether standard output, to which writing has failed, is a pipe that nobody reads any more.
@@ -25,6 +29,36 @@ bool isLink(const std::filesystem::path& folder);
 /// File name of the module, "libOVphoto.so".
 const char* moduleFileName();
 
+/// Tells a file from all others, whatever it is called: the volume and a number there.
+using FileIdentity = std::pair<std::uint64_t, std::uint64_t>;
+/// Of what a path leads to, links followed; none where there is nothing.
+std::optional<FileIdentity> identityOf(const std::filesystem::path& file);
+/// Whether a file that is there may be written.
+bool isWritable(const std::filesystem::path& file);
+/// Writes a file, which must not be there yet, and waits until the disk holds it.
+std::error_code writeNewFile(const std::filesystem::path& file, std::string_view bytes);
+/// Waits until the disk holds the names in a folder.
+std::error_code syncFolder(const std::filesystem::path& folder);
+
+/// While it lives, signals that end the process wait, for this thread and those that it starts. Of one thread.
+class SignalsHeld {
+public:
+    SignalsHeld() { hold(); }
+    SignalsHeld(const SignalsHeld&) = delete;
+    SignalsHeld& operator=(const SignalsHeld&) = delete;
+    ~SignalsHeld() { release(); }
+
+private:
+    static void hold();
+    static void release();
+};
+
+/// From now on `work` runs before a signal ends the process, while no signal is held. It must call nothing but
+/// `removeAtOnce`.
+void runBeforeEnd(void (*work)());
+/// Removes a file, in a process that a signal ends.
+void removeAtOnce(const std::filesystem::path& file) noexcept;
+
 /// How a process ended and what it wrote.
 struct ProcessResult {
     int status = -1;  // exit status; -1 when it was not started or did not end by itself
@@ -32,7 +66,7 @@ struct ProcessResult {
     std::string err;
 };
 
-/// A process that was started.
+/// A process that was started; waited for when it goes.
 struct Process;
 
 /// Starts the tool itself with these arguments; raises std::system_error.

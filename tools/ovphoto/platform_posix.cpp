@@ -45,6 +45,50 @@ std::string contents(std::FILE* file) {
     return bytes;
 }
 
+class Descriptor {
+public:
+    explicit Descriptor(int descriptor) : _descriptor(descriptor) {}
+    Descriptor(const Descriptor&) = delete;
+    Descriptor& operator=(const Descriptor&) = delete;
+    ~Descriptor() {
+        if (_descriptor != -1) ::close(_descriptor);
+    }
+    int get() const { return _descriptor; }
+
+private:
+    int _descriptor;
+};
+
+std::error_code lastError() { return {errno, std::generic_category()}; }
+
+std::error_code synced(int descriptor) {
+    // Not every file system knows how.
+    const bool done = ::fsync(descriptor) == 0 || errno == EINVAL || errno == ENOTSUP || errno == ENOSYS;
+    return done ? std::error_code() : lastError();
+}
+
+constexpr int endingSignals[] = {SIGHUP, SIGINT, SIGQUIT, SIGTERM, SIGXCPU};
+
+const sigset_t& endings() {
+    static const sigset_t set = [] {
+        sigset_t signals;
+        ::sigemptyset(&signals);
+        for (const int signal : endingSignals) ::sigaddset(&signals, signal);
+        return signals;
+    }();
+    return set;
+}
+
+int holders = 0;
+sigset_t maskBefore;
+void (*workBeforeEnd)() = nullptr;
+
+extern "C" void endBySignal(int signal) {
+    workBeforeEnd();
+    std::signal(signal, SIG_DFL);
+    std::raise(signal);  // comes when this returns
+}
+
 /// This program's file. Where /proc is not mounted, the name that it was started by is followed.
 std::filesystem::path executable() {
     std::error_code error;
@@ -57,13 +101,22 @@ std::filesystem::path executable() {
 }  // namespace
 
 struct Process {
-    pid_t pid = 0;
+    Process() = default;
+    Process(const Process&) = delete;
+    Process& operator=(const Process&) = delete;
+    ~Process() {
+        while (pid > 0 && ::waitpid(pid, nullptr, 0) == -1 && errno == EINTR) {
+        }
+    }
+
+    pid_t pid = 0;  // 0 before it is started and after it has been waited for
     File out = temporaryFile();
     File err = temporaryFile();
 };
 
 void prepareStandardStreams() {
     std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGXFSZ, SIG_IGN);
     // A closed stream is replaced by one that fails: the input can only be written, the outputs only be read.
     const int modes[] = {O_WRONLY, O_RDONLY, O_RDONLY};
     for (int stream = 0; stream < 3; ++stream) {
@@ -93,6 +146,59 @@ bool isLink(const std::filesystem::path& folder) {
 
 const char* moduleFileName() { return "libOVphoto.so"; }
 
+std::optional<FileIdentity> identityOf(const std::filesystem::path& file) {
+    struct stat found {};
+    if (::stat(file.c_str(), &found) != 0) return {};
+    return FileIdentity{found.st_dev, found.st_ino};
+}
+
+bool isWritable(const std::filesystem::path& file) {
+    // The superuser may write everything, and means a file that nobody may write as everyone does.
+    struct stat found {};
+    const bool toSome = ::stat(file.c_str(), &found) == 0 && (found.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0;
+    return toSome && ::faccessat(AT_FDCWD, file.c_str(), W_OK, AT_EACCESS) == 0;
+}
+
+std::error_code writeNewFile(const std::filesystem::path& file, std::string_view bytes) {
+    const Descriptor to(::open(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666));
+    if (to.get() == -1) return lastError();
+    while (!bytes.empty()) {
+        const ssize_t count = ::write(to.get(), bytes.data(), bytes.size());
+        if (count == -1 && errno == EINTR) continue;
+        if (count == -1) return lastError();
+        bytes.remove_prefix(static_cast<std::size_t>(count));
+    }
+    return synced(to.get());
+}
+
+std::error_code syncFolder(const std::filesystem::path& folder) {
+    const Descriptor names(::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    // A folder may be one to write into that nobody can list.
+    return names.get() == -1 ? std::error_code() : synced(names.get());
+}
+
+void SignalsHeld::hold() {
+    if (holders++ == 0) ::pthread_sigmask(SIG_BLOCK, &endings(), &maskBefore);
+}
+
+void SignalsHeld::release() {
+    if (--holders == 0) ::pthread_sigmask(SIG_SETMASK, &maskBefore, nullptr);
+}
+
+void runBeforeEnd(void (*work)()) {
+    workBeforeEnd = work;
+    struct sigaction action {};
+    action.sa_handler = endBySignal;
+    action.sa_mask = endings();
+    for (const int signal : endingSignals) {
+        struct sigaction before {};
+        const bool ignored = ::sigaction(signal, nullptr, &before) == 0 && before.sa_handler == SIG_IGN;
+        if (!ignored) ::sigaction(signal, &action, nullptr);
+    }
+}
+
+void removeAtOnce(const std::filesystem::path& file) noexcept { ::unlink(file.c_str()); }
+
 std::shared_ptr<Process> startSelf(const std::vector<std::string>& arguments) {
     auto process = std::make_shared<Process>();
     std::vector<std::string> texts{executable().string()};
@@ -120,6 +226,7 @@ std::pair<std::size_t, ProcessResult> waitForOne(const std::vector<std::shared_p
         const auto ended = std::find_if(processes.begin(), processes.end(),
                                         [pid](const auto& process) { return pid == -1 || process->pid == pid; });
         if (ended == processes.end()) continue;
+        (*ended)->pid = 0;
         const int exitStatus = pid != -1 && WIFEXITED(status) ? WEXITSTATUS(status) : -1;
         return {static_cast<std::size_t>(ended - processes.begin()),
                 {exitStatus, contents((*ended)->out.get()), contents((*ended)->err.get())}};

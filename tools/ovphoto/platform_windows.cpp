@@ -6,7 +6,7 @@
 #include <io.h>
 
 #include <algorithm>
-#include <system_error>
+#include <mutex>
 
 #include "host/platform/path.h"
 
@@ -72,6 +72,18 @@ std::wstring quoted(const std::wstring& argument) {
     return text.append(backslashes, L'\\') + L'"';
 }
 
+std::error_code lastError() { return {static_cast<int>(GetLastError()), std::system_category()}; }
+
+std::recursive_mutex ending;
+void (*workBeforeEnd)() = nullptr;
+
+/// Ctrl-C, a window that is closed, the end of the session: told in a thread of the system's.
+BOOL WINAPI endByConsole(DWORD) {
+    const std::lock_guard lock(ending);
+    workBeforeEnd();
+    return FALSE;  // and now what is usual
+}
+
 std::wstring executablePath() {
     std::wstring path;
     DWORD length = 0;
@@ -86,6 +98,13 @@ std::wstring executablePath() {
 }  // namespace
 
 struct Process {
+    Process() = default;
+    Process(const Process&) = delete;
+    Process& operator=(const Process&) = delete;
+    ~Process() {
+        if (handle) WaitForSingleObject(handle.get(), INFINITE);
+    }
+
     Handle handle;
     Handle out = temporaryFile();
     Handle err = temporaryFile();
@@ -134,6 +153,52 @@ bool isLink(const std::filesystem::path& folder) {
 }
 
 const char* moduleFileName() { return "libOVphoto.dll"; }
+
+std::optional<FileIdentity> identityOf(const std::filesystem::path& file) {
+    const HANDLE opened = CreateFileW(file.c_str(), 0, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE,
+                                      nullptr, OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr);
+    if (opened == INVALID_HANDLE_VALUE) return {};
+    const Handle handle(opened);
+    BY_HANDLE_FILE_INFORMATION found{};
+    if (!GetFileInformationByHandle(handle.get(), &found)) return {};
+    return FileIdentity{found.dwVolumeSerialNumber,
+                        (std::uint64_t{found.nFileIndexHigh} << 32) | found.nFileIndexLow};
+}
+
+bool isWritable(const std::filesystem::path& file) {
+    const DWORD attributes = GetFileAttributesW(file.c_str());
+    return attributes != INVALID_FILE_ATTRIBUTES && (attributes & FILE_ATTRIBUTE_READONLY) == 0;
+}
+
+std::error_code writeNewFile(const std::filesystem::path& file, std::string_view bytes) {
+    // Others may remove it: that is how it goes when the process is to end.
+    const HANDLE opened = CreateFileW(file.c_str(), GENERIC_WRITE, FILE_SHARE_READ | FILE_SHARE_DELETE, nullptr,
+                                      CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr);
+    if (opened == INVALID_HANDLE_VALUE) return lastError();
+    const Handle handle(opened);
+    while (!bytes.empty()) {
+        constexpr std::size_t most = 1 << 30;
+        DWORD count = 0;
+        if (!WriteFile(handle.get(), bytes.data(), static_cast<DWORD>(std::min(bytes.size(), most)), &count,
+                       nullptr))
+            return lastError();
+        bytes.remove_prefix(count);
+    }
+    return FlushFileBuffers(handle.get()) ? std::error_code() : lastError();
+}
+
+std::error_code syncFolder(const std::filesystem::path&) { return {}; }  // the system has no call for it
+
+void SignalsHeld::hold() { ending.lock(); }
+
+void SignalsHeld::release() { ending.unlock(); }
+
+void runBeforeEnd(void (*work)()) {
+    workBeforeEnd = work;
+    SetConsoleCtrlHandler(endByConsole, TRUE);
+}
+
+void removeAtOnce(const std::filesystem::path& file) noexcept { DeleteFileW(file.c_str()); }
 
 std::shared_ptr<Process> startSelf(const std::vector<std::string>& arguments) {
     auto process = std::make_shared<Process>();

@@ -8,10 +8,6 @@ namespace OvTool {
 SelfRunner::SelfRunner(std::vector<std::vector<std::string>> runs, std::size_t atOnce)
     : _arguments(std::move(runs)), _results(_arguments.size()), _atOnce(atOnce) {}
 
-SelfRunner::~SelfRunner() {
-    while (!_processes.empty()) endOne();
-}
-
 ProcessResult SelfRunner::next() {
     const std::size_t run = _next++;
     startMore();

@@ -4,14 +4,13 @@
 
 namespace OvTool {
 
-/// The tool itself, run once for each list of arguments, up to `atOnce` processes at a time.
+/// The tool itself, run once for each list of arguments, up to `atOnce` processes at a time. Waits for those that are
+/// under way when it goes.
 class SelfRunner {
 public:
     SelfRunner(std::vector<std::vector<std::string>> runs, std::size_t atOnce);
     SelfRunner(const SelfRunner&) = delete;
     SelfRunner& operator=(const SelfRunner&) = delete;
-    /// Waits for the processes that are under way.
-    ~SelfRunner();
 
     /// The result of the next list of arguments, in their order; there must be one.
     ProcessResult next();

@@ -5,13 +5,13 @@
 #include <iostream>
 #include <map>
 #include <memory>
-#include <set>
 #include <sstream>
 
 #include "host/platform/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/conversion.h"
 #include "tools/ovphoto/expandPaths.h"
+#include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/progress.h"
 #include "tools/ovphoto/selfRunner.h"
 #include "tools/ovphoto/terminal.h"
@@ -59,7 +59,7 @@ bool isForeign(const FoundFile& file, const ConvertOptions& options, const HostS
 class Planner {
 public:
     Planner(const ConvertOptions& options, const std::vector<FoundFile>& files) : _options(options) {
-        for (const FoundFile& file : files) _inputs.insert(placeOf(file.path));
+        for (const FoundFile& file : files) _inputs.add(file.path);
     }
 
     Job plan(const FoundFile& file) {
@@ -72,14 +72,14 @@ public:
 
 private:
     std::string refusal(const std::string& in, const std::string& out) {
-        const fs::path place = placeOf(out);
-        if (_inputs.contains(place)) return out + " is not written: it is one of the files to read";
-        const auto [taken, isNew] = _outputs.emplace(place, in);
+        const std::string isInput = _inputs.refusal(out);
+        if (!isInput.empty()) return out + " " + isInput;
+        const auto [taken, isNew] = _outputs.emplace(placeOf(out), in);
         return isNew ? "" : out + " is not written: it is made of " + taken->second;
     }
 
     const ConvertOptions& _options;
-    std::set<fs::path> _inputs;
+    InputFiles _inputs;
     std::map<fs::path, std::string> _outputs;
 };
 

@@ -115,11 +115,14 @@ int runShow(const SettingsOptions& options, const HostSession& session) {
 }
 
 int runWrite(const SettingsOptions& options, const HostSession& session) {
-    const auto light = makeLight(session, options.light, false);
-    if (!light) return exitFailed;
-    light->getSolarTime();  // a solar time that was given becomes a local time, which is what is saved
-    const auto form = options.binary ? RnStream::Form::binary : RnStream::Form::text;
-    const std::string error = writeFile(options.file, savedLight(*light, form));
+    std::string error = InputFiles({options.light.from}).refusal(options.file);
+    if (error.empty()) {
+        const auto light = makeLight(session, options.light, false);
+        if (!light) return exitFailed;
+        light->getSolarTime();  // a solar time that was given becomes a local time, which is what is saved
+        const auto form = options.binary ? RnStream::Form::binary : RnStream::Form::text;
+        error = writeFile(options.file, savedLight(*light, form));
+    }
     if (error.empty()) return exitWell;
     complain(options.file + ": " + error);
     return exitFailed;

@@ -142,6 +142,13 @@ int runPlot(const PlotOptions& options, const HostSession& session) {
         complain(options.out + ": does not end in .svg, .png or .pdf");
         return exitUsage;
     }
+    InputFiles inputs(options.files);
+    inputs.add(options.light.from);
+    const std::string refusal = inputs.refusal(options.out);
+    if (!refusal.empty()) {
+        std::cerr << options.out << ": " << refusal << '\n';
+        return exitFailed;
+    }
     const bool ofSky = options.kind == PictureKind::sky || options.kind == PictureKind::sunPath;
     return (ofSky ? plotNaturalLight : plotLights)(options, *format, session);
 }

@@ -41,45 +41,62 @@ int reportOne(const ReportOptions& options, const HostSession& session) {
     return error.empty() ? exitWell : fail(options.out, error);
 }
 
-/// The pages of an index, in a folder beside it named for it. Unless they are kept, those that were written go
-/// again.
-class PageFolder {
+/// An index and its pages, which lie in a folder beside it named for it. Nothing is in its place before all of it is
+/// complete.
+class IndexFiles {
 public:
-    explicit PageFolder(const std::string& index)
-        : _name(pathText(nativeOf(index).stem()) + "-pages"),
+    explicit IndexFiles(const std::string& index)
+        : _index(index),
+          _name(pathText(nativeOf(index).stem()) + "-pages"),
           _path(nativeOf(index).parent_path() / nativeOf(_name)) {}
-    PageFolder(const PageFolder&) = delete;
-    PageFolder& operator=(const PageFolder&) = delete;
-    ~PageFolder() {
+    IndexFiles(const IndexFiles&) = delete;
+    IndexFiles& operator=(const IndexFiles&) = delete;
+    ~IndexFiles() {
         std::error_code ignored;
-        if (_kept) return;
-        for (const fs::path& page : _written) fs::remove(page, ignored);
+        _files.reset();
         if (_made) fs::remove(_path, ignored);  // when it is empty
     }
 
-    /// Empty, or why there is no such folder.
-    std::string make() {
+    /// Empty, or why there is no folder.
+    std::string makeFolder() {
         std::error_code error;
         _made = fs::create_directory(_path, error);
         if (!error && fs::is_directory(_path)) return {};
         return "the folder " + pathText(_path) +
                " cannot be made: " + (error ? error.message() : "a file has its name");
     }
-    std::string write(const std::string& page, const std::string& html) {
-        const fs::path path = _path / nativeOf(page);
-        const std::string error = writeFile(pathText(path), html);
-        if (error.empty()) _written.push_back(path);
-        return error;
+    /// A file that is shown, and so is not written.
+    void addInput(const std::string& file) { _inputs.add(file); }
+    /// @{
+    /// Empty, or why it cannot be written.
+    std::string addPage(const std::string& page, const std::string& html) {
+        return add(pathText(_path / nativeOf(page)), html);
     }
-    void keep() { _kept = true; }
+    std::string finish(const std::string& html) {
+        const std::string error = add(_index, html);
+        return error.empty() ? _files->putInPlace() : error;
+    }
+    /// @}
     std::string urlOf(const std::string& page) const { return urlPart(_name) + "/" + urlPart(page); }
+    /// A file's path as it leads there from the index.
+    std::string pathTo(const std::string& file) const {
+        const auto place = [](const fs::path& path) { return fs::absolute(path).lexically_normal(); };
+        const fs::path path = place(nativeOf(file)).lexically_relative(place(nativeOf(_index)).parent_path());
+        return path.empty() ? file : pathText(path);
+    }
 
 private:
+    std::string add(const std::string& file, const std::string& html) {
+        const std::string refusal = _inputs.refusal(file);
+        return refusal.empty() ? _files->add(file, html) : refusal;
+    }
+
+    std::string _index;
     std::string _name;
     fs::path _path;
-    std::vector<fs::path> _written;
+    InputFiles _inputs;
+    std::optional<OutputFiles> _files{std::in_place};
     bool _made = false;
-    bool _kept = false;
 };
 
 struct Entry {
@@ -119,25 +136,26 @@ std::string pageNameOf(const std::string& file, std::size_t number) {
     return name + ".html";
 }
 
-Entry refusedEntry(const ReadResult& result) {
-    return {"<tr class=\"refused\"><td></td><th scope=\"row\">" + escaped(result.file) + "</th><td></td>" +
-                cell(result.format) + numberCell({}, "") + numberCell({}, "") + numberCell({}, "") +
-                numberCell({}, "") + "<td>refused</td>" + remarksCell(result.told()) + "</tr>\n",
+Entry refusedEntry(const ReadResult& result, const IndexFiles& files) {
+    return {"<tr class=\"refused\"><td></td><th scope=\"row\">" + escaped(files.pathTo(result.file)) +
+                "</th><td></td>" + cell(result.format) + numberCell({}, "") + numberCell({}, "") +
+                numberCell({}, "") + numberCell({}, "") + "<td>refused</td>" + remarksCell(result.told()) +
+                "</tr>\n",
             "", ""};
 }
 
-Entry entryOf(const Datasheet& sheet, std::size_t number, const PageFolder& folder, const std::string& indexUrl) {
+Entry entryOf(const Datasheet& sheet, std::size_t number, const IndexFiles& files, const std::string& indexUrl) {
     const DrawnFile& file = sheet.file;
     Ov::RnPhotoWebData& web = *file.source.web;
     const float lumens = luminaireLumensOf(web);
     const float peak = file.light->getPeakIntensity();
     const std::string page = pageNameOf(file.source.file, number);
-    std::string row = "<tr><td>" + thumbnail(sheet, "t" + std::to_string(number) + "-") +
-                      "</td><th scope=\"row\"><a href=\"" + folder.urlOf(page) + "\">" +
-                      escaped(file.source.file) + "</a></th>" + cell(titleOf(file)) + cell(file.source.format) +
-                      numberCell(lumens, shortNumber(lumens)) + numberCell(peak, shortNumber(peak)) +
-                      angleCell(file.angles[0].beam) + angleCell(file.angles[1].beam) +
-                      cell(symmetryName(web.getSymmetry())) + remarksCell(sheet.remarks) + "</tr>\n";
+    std::string row =
+        "<tr><td>" + thumbnail(sheet, "t" + std::to_string(number) + "-") + "</td><th scope=\"row\"><a href=\"" +
+        files.urlOf(page) + "\">" + escaped(files.pathTo(file.source.file)) + "</a></th>" + cell(titleOf(file)) +
+        cell(file.source.format) + numberCell(lumens, shortNumber(lumens)) + numberCell(peak, shortNumber(peak)) +
+        angleCell(file.angles[0].beam) + angleCell(file.angles[1].beam) + cell(symmetryName(web.getSymmetry())) +
+        remarksCell(sheet.remarks) + "</tr>\n";
     return {std::move(row), page, datasheetPage(sheet, indexUrl)};
 }
 
@@ -161,19 +179,20 @@ std::string indexPage(const std::string& rows, std::size_t files, std::size_t re
 /// Makes pages at the side while the next files are read, and takes them in order.
 class Maker {
 public:
-    Maker(PageFolder& folder, std::string indexUrl) : _folder(folder), _indexUrl(std::move(indexUrl)) {}
+    Maker(IndexFiles& files, std::string indexUrl) : _index(files), _indexUrl(std::move(indexUrl)) {}
 
     void add(ReadResult result, const HostSession& session) {
         const std::size_t number = ++_files;
+        _index.addInput(result.file);
+        const SignalsHeld held;  // they come to this thread alone
         if (auto file = drawnFile(session, result)) {
             auto sheet = std::make_shared<Datasheet>(datasheetOf(std::move(*file)));
-            _underWay.push_back(std::async(std::launch::async, [this, sheet, number] {
-                return entryOf(*sheet, number, _folder, _indexUrl);
-            }));
+            _underWay.push_back(std::async(
+                std::launch::async, [this, sheet, number] { return entryOf(*sheet, number, _index, _indexUrl); }));
         } else {
             ++_refused;
             std::promise<Entry> entry;
-            entry.set_value(refusedEntry(result));
+            entry.set_value(refusedEntry(result, _index));
             _underWay.push_back(entry.get_future());
         }
         if (_underWay.size() > std::clamp(std::thread::hardware_concurrency(), 1U, 16U)) takeOne();
@@ -193,10 +212,10 @@ private:
         const Entry entry = _underWay.front().get();
         _underWay.pop_front();
         _rows += entry.row;
-        if (_error.empty() && !entry.page.empty()) _error = _folder.write(entry.pageName, entry.page);
+        if (_error.empty() && !entry.page.empty()) _error = _index.addPage(entry.pageName, entry.page);
     }
 
-    PageFolder& _folder;
+    IndexFiles& _index;
     std::string _indexUrl;
     std::size_t _files = 0;
     std::size_t _refused = 0;
@@ -212,10 +231,10 @@ bool isForeign(const FoundFile& file, const ReadResult& result) {
 
 int reportMany(const ReportOptions& options, const HostSession& session) {
     const std::vector<FoundFile> files = expandPaths(options.paths);
-    PageFolder folder(options.out);
-    const std::string refusal = folder.make();
+    IndexFiles index(options.out);
+    const std::string refusal = index.makeFolder();
     if (!refusal.empty()) return fail(options.out, refusal);
-    Maker maker(folder, "../" + urlPart(pathText(nativeOf(options.out).filename())));
+    Maker maker(index, "../" + urlPart(pathText(nativeOf(options.out).filename())));
     {
         Progress progress(files.size());
         for (const FoundFile& file : files) {
@@ -231,9 +250,8 @@ int reportMany(const ReportOptions& options, const HostSession& session) {
     }
     if (maker.files() == 0) return fail(options.paths.front(), "no photometric file is in there");
     if (!maker.error().empty()) return fail(options.out, "a page of it " + maker.error());
-    const std::string error = writeFile(options.out, indexPage(maker.rows(), maker.files(), maker.refused()));
+    const std::string error = index.finish(indexPage(maker.rows(), maker.files(), maker.refused()));
     if (!error.empty()) return fail(options.out, error);
-    folder.keep();
     say(options.out + ": " + std::to_string(maker.files()) + (maker.files() == 1 ? " file, " : " files, ") +
         std::to_string(maker.refused()) + " refused");
     return maker.refused() == 0 ? exitWell : exitFailed;
@@ -247,6 +265,8 @@ int runReport(const ReportOptions& options, const HostSession& session) {
         complain(options.out + ": does not end in .html");
         return exitUsage;
     }
+    const std::string refusal = InputFiles(options.paths).refusal(options.out);
+    if (!refusal.empty()) return fail(options.out, refusal);
     std::error_code error;
     const bool one = options.paths.size() == 1 && (isStandardStream(options.paths.front()) ||
                                                    !fs::is_directory(nativeOf(options.paths.front()), error));
