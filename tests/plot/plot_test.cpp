@@ -144,6 +144,41 @@ TEST_F(ToolPlot, AReportIsOnePageOrAnIndexWithPages) {
     EXPECT_THAT(bytes("all.html"), testing::HasSubstr("class=\"refused\""));
 }
 
+TEST_F(ToolPlot, AnOldReportStaysUntilTheNewOneIsComplete) {
+    namespace fs = std::filesystem;
+    const fs::path lamps = folder.path() / "lamps";
+    folder.write("lamps/a.ies", IesFile().text());
+    folder.write("lamps/b.ies", IesFile().text());
+    ASSERT_EQ(runTool("report lamps -o all.html", folder).status, 0);
+    const auto report = [&] {
+        return bytes("all.html") + bytes("all-pages/0001-a.html") + bytes("all-pages/0002-b.html");
+    };
+    const auto files = [&] {
+        return std::distance(fs::recursive_directory_iterator(folder.path()), fs::recursive_directory_iterator());
+    };
+    folder.write("lamps/a.ies", IesFile{.multiplier = "2"}.text());
+    folder.write("lamps/b.ies", IesFile{.multiplier = "2"}.text());
+    const std::string old = report();
+    const auto before = files();
+    const auto expectOld = [&](const ToolResult& result, int status) {
+        EXPECT_EQ(result.status, status) << result.err;
+        EXPECT_TRUE(report() == old);
+        EXPECT_EQ(files(), before);
+    };
+    expectOld(runShell("(ulimit -f 64; ovphoto report lamps -o all.html)", folder), 1);  // no room for a page
+    for (const char* file : {"all.html", "all-pages/0002-b.html"}) {
+        fs::permissions(folder.path() / file, fs::perms::owner_read);
+        expectOld(runTool("report lamps -o all.html", folder), 1);
+        fs::permissions(folder.path() / file, fs::perms::owner_read | fs::perms::owner_write);
+    }
+    for (int place = 1; place <= 3; ++place)
+        expectOld(runFaulty("OVPHOTO_RENAME=" + std::to_string(place), "report lamps -o all.html", folder), 1);
+    expectOld(runFaulty("OVPHOTO_SIGNAL=15", "report lamps -o all.html", folder), 128 + 15);
+    ASSERT_EQ(runTool("report lamps -o all.html", folder).status, 0);
+    EXPECT_FALSE(report() == old);
+    EXPECT_EQ(files(), before);
+}
+
 TEST_F(ToolPlot, AReportThatCannotBeMadeLeavesNothing) {
     folder.write("taken-pages", "a file");
     std::filesystem::create_directories(folder.path() / "empty");

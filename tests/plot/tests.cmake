@@ -3,7 +3,7 @@ ovphoto_add_test(plot/diagram_test)
 target_link_libraries(plot_diagram_test PRIVATE ovphoto_plot)
 ovphoto_add_test(plot/plot_test)
 target_link_libraries(plot_plot_test PRIVATE ovphoto_plot)
-add_dependencies(plot_plot_test ovphoto)
+add_dependencies(plot_plot_test ovphoto ovphoto_faults)
 
 # Reports in a browser.
 find_program(OVPHOTO_SYSTEM_PYTHON python3 PATHS /usr/bin NO_DEFAULT_PATH)  # Selenium is Debian's

@@ -2,6 +2,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <cerrno>
 #include <csignal>
 #include <cstdio>
 #include <cstdlib>
@@ -11,6 +12,7 @@
 //
 //     OVPHOTO_MEMORY=N    of all allocations, those behind the first N fail
 //     OVPHOTO_SIGNAL=N    this signal comes when a file is to be kept by the disk
+//     OVPHOTO_RENAME=N    the Nth renaming fails
 //     OVPHOTO_TRACE=FILE  lists there what is kept by the disk, and what gets another name
 
 namespace {
@@ -68,6 +70,11 @@ extern "C" int fsync(int descriptor) {
 }
 
 extern "C" int rename(const char* from, const char* to) noexcept {
+    static long left = numberOf("OVPHOTO_RENAME");
     trace("rename");
+    if (left > 0 && --left == 0) {
+        errno = EIO;
+        return -1;
+    }
     return next<int(const char*, const char*)>("rename")(from, to);
 }

@@ -56,6 +56,14 @@ inline ToolResult runTool(const std::string& arguments, const TempFolder& folder
     return runShell("ovphoto " + arguments, folder, input);
 }
 
+/// Runs the tool with faults, "OVPHOTO_SIGNAL=2"; tests/tool/faults.cpp lists them.
+inline ToolResult runFaulty(const std::string& faults, const std::string& arguments, const TempFolder& folder) {
+    // The address sanitizer wants to be the first to be loaded.
+    return runShell("env " + faults + " ASAN_OPTIONS=verify_asan_link_order=0 LD_PRELOAD='" + binFolder() +
+                        "/libovphoto_faults.so' '" + toolFolder() + "/ovphoto' " + arguments,
+                    folder);
+}
+
 /// An IES file; what a test does not set is as plain as can be.
 struct IesFile {
     std::string tilt = "NONE", lamps = "1 -1", multiplier = "1";
