@@ -26,3 +26,23 @@ function(ovphoto_find_headers package target folder)
   add_library(${target} INTERFACE IMPORTED)
   target_include_directories(${target} INTERFACE ${CMAKE_BINARY_DIR}/headers)
 endfunction()
+
+# ovphoto_read_asset(<file> <variable>): its text, and in <variable>_HASH its SHA-256 in base 64, as the content policy
+# of a page wants it.
+function(ovphoto_read_asset file variable)
+  set(digits ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/)
+  file(READ ${file} text)
+  string(SHA256 hash "${text}")
+  set(base64)
+  foreach(at RANGE 0 60 6)
+    string(SUBSTRING ${hash}00 ${at} 6 bytes)  # the last byte is filled up
+    foreach(shift 18 12 6 0)
+      math(EXPR digit "(0x${bytes} >> ${shift}) & 63")
+      string(SUBSTRING ${digits} ${digit} 1 digit)
+      string(APPEND base64 ${digit})
+    endforeach()
+  endforeach()
+  string(SUBSTRING ${base64} 0 43 base64)
+  set(${variable} "${text}" PARENT_SCOPE)
+  set(${variable}_HASH "${base64}=" PARENT_SCOPE)
+endfunction()

@@ -106,6 +106,19 @@ class Report(unittest.TestCase):
         self.one(".back a").click()
         self.assertEqual(self.browser.title, "Photometric files")
 
+    def test_nothing_but_the_pages_own_style_and_script_runs(self):
+        seen = self.browser.execute_script("""
+            const script = document.createElement("script"), style = document.createElement("style");
+            script.textContent = "window.foreign = true";
+            style.textContent = "h1 { display: none }";
+            document.body.append(script, style);
+            document.body.setAttribute("style", "display: none");
+            return [window.foreign ?? null, getComputedStyle(document.querySelector("h1")).display,
+                    getComputedStyle(document.body).display];""")
+        self.assertEqual(seen, [None, "block", "block"])
+        refusals = [entry["message"] for entry in self.browser.get_log("browser")]
+        self.assertEqual(len([text for text in refusals if "Content Security Policy" in text]), 3)
+
     def test_the_solid_turns(self):
         self.open_page("wallwasher")
         canvas = self.one("#solid canvas")

@@ -170,6 +170,27 @@ TEST(PlotPicture, HasTheSizeAndTheFormatThatWereAskedFor) {
     for (const Point& p : circle) EXPECT_NEAR(distance(p, box.centre()), box.width() / 2, 0.1);
 }
 
+TEST(PlotPicture, LongTitlesTakeLinesThatFit) {
+    drawPicture(PictureFormat::svg, {}, lightPalette(), "", [](Canvas& canvas) {
+        const Font font = canvas.font();
+        const std::string words = "one two three four five six seven eight nine ten";
+        const double width = canvas.textWidth("one two three four", font);
+        const auto lines = canvas.wrapped(words, font, width, 9);
+        EXPECT_GT(lines.size(), 2U);
+        std::string joined;
+        for (const std::string& line : lines) {
+            EXPECT_LE(canvas.textWidth(line, font), width) << line;
+            joined += (joined.empty() ? "" : " ") + line;
+        }
+        EXPECT_EQ(joined, words);
+        EXPECT_THAT(canvas.wrapped(words, font, width, 2),
+                    ElementsAre("one two three four", testing::EndsWith("\u2026")));
+        EXPECT_EQ(canvas.wrapped(std::string(60, 'm'), font, width, 9).size(),
+                  std::ceil(60 / std::floor(width / canvas.textWidth("m", font))));
+        EXPECT_THAT(canvas.wrapped("", font, width, 3), ElementsAre(""));
+    });
+}
+
 TEST(PlotPicture, EveryDiagramIsDrawnOfDarkAndOfBrightestLights) {
     for (const float candela : {0.0F, 1e-30F, 3e38F}) {
         const auto light = lamp<OvPhotometrics::Isotropic>(candela);

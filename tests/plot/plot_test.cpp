@@ -144,6 +144,18 @@ TEST_F(ToolPlot, AReportIsOnePageOrAnIndexWithPages) {
     EXPECT_THAT(bytes("all.html"), testing::HasSubstr("class=\"refused\""));
 }
 
+TEST_F(ToolPlot, APageIsBoundedAndAnIndexShowsPathsFromItself) {
+    // Two fills stand for a million values, in 44 bytes.
+    folder.write("lamps/large.tbt", "t\n3\n1 1 1\n9 9 1 1 5 0\n2 524288 2\n1Z0Z0-1");
+    ASSERT_EQ(runShell("mkdir out; ovphoto report ./lamps \"$PWD/good.ies\" -o out/all.html", folder).err, "");
+    EXPECT_THAT(bytes("out/all.html"),
+                testing::AllOf(testing::HasSubstr(">../lamps/large.tbt<"), testing::HasSubstr(">../good.ies<")));
+    const std::string page = bytes("out/all-pages/0001-large.html");
+    EXPECT_THAT(page,
+                testing::HasSubstr("of 2 horizontal angles. All values: <code>ovphoto info --json --values"));
+    EXPECT_LT(page.size(), 1000000U);
+}
+
 TEST_F(ToolPlot, AnOldReportStaysUntilTheNewOneIsComplete) {
     namespace fs = std::filesystem;
     const fs::path lamps = folder.path() / "lamps";

@@ -51,6 +51,16 @@ TEST_F(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
         expectStatus(2, {"plot good.ies -o a.svg|no pictures", "report good.ies -o a.html|no pictures"});
     expectStatus(0, {"--help|Exit status", "intensity --help|--frame", "--version|ovphoto 0.",
                      "info good.ies --as Ies|good"});
+    // A file of 300 bytes or so, and standard input without end.
+    expectStatus(0, {"info good.ies --max-size 1K|good", "check good.ies --max-size 9G|1 ok"});
+    expectStatus(1,
+                 {"info good.ies --max-size 50|good.ies: is larger than 50 bytes", "check . --max-size 50|larger",
+                  "convert good.ies --into o --to tbt --jobs 2 --max-size 50|larger",
+                  "plot good.ies -o a.svg --max-size 0|larger", "sun --from good.ies --max-size 9|larger"});
+    expectStatus(2, {"--max-size 9T formats|'9T'", "--max-size 99999999999G formats|--max-size",
+                     "--max-size -1 formats|-1", "--max-size '' formats|--max-size"});
+    EXPECT_EQ(runShell("yes | ovphoto info - --max-size 1M", folder).err,
+              "-: is larger than 1048576 bytes; --max-size allows more\n");
     expectStatus(1, {"info good.ies --module ./none.so|none.so"});
 }
 

@@ -241,11 +241,25 @@ std::string extensionOf(RnComponentBuilder& builder) {
     return first;
 }
 
+namespace {
+
+std::uint64_t mostBytes = 256 << 20;
+
+}  // namespace
+
+void setLargestInput(std::uint64_t bytes) { mostBytes = bytes; }
+std::uint64_t largestInput() { return mostBytes; }
+
 RnRef<RnBufferedIO> openFile(const std::string& file, std::string& error) {
-    if (isStandardStream(file)) return openStandardInput(error);
+    if (isStandardStream(file)) return openStandardInput(mostBytes, error);
     const std::wstring path = fromUtf8(file);
-    if (auto io = openInputFile(path.c_str())) return io;
     std::error_code code;
+    const std::uintmax_t size = std::filesystem::file_size(nativePath(path), code);
+    if (!code && size > mostBytes) {
+        error = tooLarge(mostBytes);
+        return {};
+    }
+    if (auto io = openInputFile(path.c_str())) return io;
     const std::filesystem::file_status status = std::filesystem::status(nativePath(path), code);
     if (std::filesystem::is_directory(status)) {
         error = "is a folder";

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -87,6 +88,12 @@ private:
 std::string formatName(const Ov::RnBuilderDescription& builder);
 /// The first extension that the builder imports, or empty.
 std::string extensionOf(Ov::RnComponentBuilder& builder);
+
+/// @{
+/// The size of the largest input that `openFile` takes, in bytes: 256 MiB when it was not set.
+void setLargestInput(std::uint64_t bytes);
+std::uint64_t largestInput();
+/// @}
 
 /// Opens a file, or standard input as "-", for reading. When that fails it gives null and says in `error` why.
 Ov::RnRef<Ov::RnBufferedIO> openFile(const std::string& file, std::string& error);

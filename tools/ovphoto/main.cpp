@@ -1,13 +1,17 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
+#include <charconv>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
 #include <iostream>
+#include <optional>
 #include <utility>
 #include <vector>
 
 #include "tools/ovphoto/commands/commands.h"
+#include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/terminal.h"
@@ -46,9 +50,23 @@ struct Guard {
 };
 [[gnu::init_priority(101)]] const Guard guard;
 
+/// "300", or with K, M or G behind it: of 1024, its square and its cube.
+std::optional<std::uint64_t> parseBytes(std::string_view text) {
+    static constexpr std::string_view units = "KMG";
+    const std::size_t unit = text.empty() ? units.npos : units.find(text.back());
+    const std::size_t shift = unit == units.npos ? 0 : 10 * (unit + 1);
+    if (shift > 0) text.remove_suffix(1);
+    std::uint64_t number = 0;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    const bool isNumber = error == std::errc() && end == text.data() + text.size();
+    return isNumber && number <= UINT64_MAX >> shift ? std::optional(number << shift) : std::nullopt;
+}
+
 int parseAndRun(CLI::App& app, std::vector<std::string> arguments) {
     std::string module;
     app.add_option("--module", module, "Load this module instead of the one beside the tool")->type_name("PATH");
+    addParsed(app, {"--max-size", "BYTES", "Refuse larger inputs; K, M or G may follow; default 256M"}, parseBytes,
+              setLargestInput);
     bool verbose = false;
     app.add_flag("--verbose", verbose,
                  "Tell every message of a reader, those that only follow from others as well");

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 #include <string_view>
 
@@ -12,7 +13,11 @@ namespace OvTool {
 
 inline bool isStandardStream(std::string_view file) { return file == "-"; }
 
-/// Standard input, which can be read once: null, and why in `error`, from the second time on.
-Ov::RnRef<Ov::RnBufferedIO> openStandardInput(std::string& error);
+/// What an input is that has more than `mostBytes`.
+std::string tooLarge(std::uint64_t mostBytes);
+
+/// All of standard input, which can be read once: null, and why in `error`, from the second time on and where it has
+/// more than `mostBytes`.
+Ov::RnRef<Ov::RnBufferedIO> openStandardInput(std::uint64_t mostBytes, std::string& error);
 
 }  // namespace OvTool

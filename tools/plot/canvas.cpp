@@ -191,6 +191,25 @@ std::string Canvas::fitted(std::string_view text, const Font& font, double width
     return result;
 }
 
+std::vector<std::string> Canvas::wrapped(std::string_view text, const Font& font, double width,
+                                         std::size_t most) const {
+    std::vector<std::string> lines;
+    std::wstring rest = Ov::fromUtf8(cleanText(text));
+    const auto fits = [&](std::size_t count) {
+        return textWidth(Ov::toUtf8(rest.substr(0, count)), font) <= width;
+    };
+    while (lines.size() + 1 < most && !fits(rest.size())) {
+        std::size_t count = 1;
+        while (fits(count + 1)) ++count;
+        const std::size_t blank = rest.rfind(L' ', count);
+        if (blank != std::wstring::npos && blank > 0) count = blank;
+        lines.push_back(Ov::toUtf8(rest.substr(0, count)));
+        rest.erase(0, std::min(rest.find_first_not_of(L' ', count), rest.size()));
+    }
+    lines.push_back(fitted(Ov::toUtf8(rest), font, width));
+    return lines;
+}
+
 std::string cleanText(std::string_view text) {
     std::wstring clean = Ov::fromUtf8(text);
     for (wchar_t& c : clean) {

@@ -90,6 +90,9 @@ public:
     double textWidth(std::string_view text, const Font& font) const;
     /// The text, cut and ended by an ellipsis where it is wider.
     std::string fitted(std::string_view text, const Font& font, double width) const;
+    /// The text in lines that are no wider, broken at blanks where there are some; the last of `most` is cut.
+    std::vector<std::string> wrapped(std::string_view text, const Font& font, double width,
+                                     std::size_t most) const;
 
 private:
     void select(const Font& font) const;

@@ -8,6 +8,8 @@ constexpr double margin = 24;
 constexpr double rowHeight = 21;
 constexpr double swatchWidth = 40;  // with the gap behind it
 constexpr double gap = 22;
+constexpr double titleRow = 23;
+constexpr double subtitleRow = 18;
 
 double widthOf(const Canvas& canvas, const LegendItem& item) {
     return (item.swatch ? swatchWidth : 0) + canvas.textWidth(item.text, canvas.font());
@@ -48,13 +50,20 @@ Box drawCaption(Canvas& canvas, const std::string& title, const std::string& sub
     const double room = canvas.width() - 2 * margin;
     const Font titleFont{17, canvas.palette().ink, true};
     const Font font = canvas.mutedFont();
-    canvas.text({margin, 28}, canvas.fitted(title, titleFont, room), titleFont);
-    canvas.text({margin, 51}, canvas.fitted(subtitle, font, room), font);
+    double y = 28;
+    for (const std::string& line : canvas.wrapped(title, titleFont, room, 3)) {
+        canvas.text({margin, y}, line, titleFont);
+        y += titleRow;
+    }
+    for (const std::string& line : canvas.wrapped(subtitle, font, room, 2)) {
+        canvas.text({margin, y}, line, font);
+        y += subtitleRow;
+    }
     const auto rows = rowsOf(canvas, legend);
     const double top = canvas.height() - 14 - rowHeight * static_cast<double>(rows.size());
     for (std::size_t i = 0; i < rows.size(); ++i)
         drawRow(canvas, top + rowHeight * (static_cast<double>(i) + 0.5), rows[i]);
-    return {margin, 68, canvas.width() - margin, top - 8};
+    return {margin, y - 1, canvas.width() - margin, top - 8};
 }
 
 }  // namespace OvPlot

@@ -100,8 +100,8 @@ Plan makePlan(const ConvertOptions& options, const HostSession& session) {
 /// The arguments with which the tool converts files as this run would; the files are to follow.
 std::vector<std::string> argumentsOf(const ConvertOptions& options, const HostSession& session) {
     std::vector<std::string> arguments{
-        "convert", "--json",      "--module", Ov::toUtf8(session.module().path()), "--to", options.target->name,
-        "--into",  options.folder};
+        "convert", "--json",       "--module",   Ov::toUtf8(session.module().path()), "--to", options.target->name,
+        "--into",  options.folder, "--max-size", std::to_string(largestInput())};
     if (!options.as.empty()) arguments.insert(arguments.end(), {"--as", options.as});
     if (options.asSaved) arguments.push_back("--as-saved");
     if (options.brief) arguments.push_back("--brief");

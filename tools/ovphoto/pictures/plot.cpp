@@ -146,7 +146,7 @@ int runPlot(const PlotOptions& options, const HostSession& session) {
     inputs.add(options.light.from);
     const std::string refusal = inputs.refusal(options.out);
     if (!refusal.empty()) {
-        std::cerr << options.out << ": " << refusal << '\n';
+        complain(options.out + ": " + refusal);
         return exitFailed;
     }
     const bool ofSky = options.kind == PictureKind::sky || options.kind == PictureKind::sunPath;

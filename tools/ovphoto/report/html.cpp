@@ -1,11 +1,13 @@
 #include "tools/ovphoto/report/html.h"
 
+#include <algorithm>
+
 #include "tools/ovphoto/report/assets.h"
 
 namespace OvTool {
 
-const std::string_view pageScript = pageScriptText;
-const std::string_view indexScript = indexScriptText;
+const Asset& pageScript = pageScriptAsset;
+const Asset& indexScript = indexScriptAsset;
 
 namespace {
 
@@ -35,16 +37,36 @@ void shorten(std::string& svg, const std::string& attribute) {
     svg = std::move(result);
 }
 
+/// Attributes in place of styles, which the policy of a page does not let in: fill="none" for style="fill:none;".
+void spreadStyles(std::string& svg) {
+    static constexpr std::string_view start = " style=\"";
+    std::string result;
+    std::size_t at = 0;
+    for (std::size_t found; (found = svg.find(start, at)) != std::string::npos;) {
+        result.append(svg, at, found - at);
+        const std::size_t end = svg.find('"', found + start.size());
+        for (std::size_t i = found + start.size(); i < end;) {
+            const std::size_t colon = svg.find(':', i), next = std::min(svg.find(';', i), end);
+            result += ' ' + svg.substr(i, colon - i) + "=\"" + svg.substr(colon + 1, next - colon - 1) + '"';
+            i = next + 1;
+        }
+        at = end + 1;
+    }
+    svg = result.append(svg, at);
+}
+
 }  // namespace
 
-std::string htmlPage(const std::string& title, const std::string& body, std::string_view script) {
+std::string htmlPage(const std::string& title, const std::string& body, const Asset& script) {
+    const auto allowed = [](const Asset& asset) { return "'sha256-" + std::string(asset.hash) + "'"; };
     return "<!doctype html>\n<html lang=\"en\">\n<head>\n<meta charset=\"utf-8\">\n"
            "<meta name=\"viewport\" content=\"width=device-width, initial-scale=1\">\n"
-           "<meta http-equiv=\"Content-Security-Policy\" content=\"default-src 'none'; img-src data:; "
-           "style-src 'unsafe-inline'; script-src 'unsafe-inline'\">\n"
+           "<meta http-equiv=\"Content-Security-Policy\" content=\"default-src 'none'; img-src data:; style-src " +
+           allowed(style) + "; script-src " + allowed(script) +
+           "; base-uri 'none'; form-action 'none'\">\n"
            "<meta name=\"color-scheme\" content=\"light dark\">\n<link rel=\"icon\" href=\"data:,\">\n<title>" +
-           escaped(title) + "</title>\n<style>\n" + styleText + "</style>\n</head>\n<body>\n" + body +
-           "<script>\n" + std::string(script) + "</script>\n</body>\n</html>\n";
+           escaped(title) + "</title>\n<style>" + std::string(style.text) + "</style>\n</head>\n<body>\n" + body +
+           "<script>" + std::string(script.text) + "</script>\n</body>\n</html>\n";
 }
 
 std::string factTable(const std::string& caption, const std::vector<std::pair<std::string, std::string>>& rows) {
@@ -64,6 +86,7 @@ std::string inlineSvg(std::string svg, const std::string& prefix) {
                                     "stroke-linecap:butt;", "stroke-linejoin:round;", "stroke-miterlimit:10;"})
         replaceAll(svg, known, "");
     for (const std::string attribute : {" d=\"", " style=\""}) shorten(svg, attribute);
+    spreadStyles(svg);
     return svg;
 }
 

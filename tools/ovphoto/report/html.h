@@ -13,9 +13,15 @@ namespace OvTool {
 
 using OvPlot::escaped;
 
+/// A text that pages hold as it is.
+struct Asset {
+    std::string_view text;
+    std::string_view hash;  // SHA-256 in base 64, by which a page's policy lets it in
+};
+
 /// A whole page that needs nothing from outside, and is told to ask for nothing. `title` is escaped here, `body`
 /// is markup.
-std::string htmlPage(const std::string& title, const std::string& body, std::string_view script);
+std::string htmlPage(const std::string& title, const std::string& body, const Asset& script);
 
 /// A table of two columns with a caption; texts are escaped here.
 std::string factTable(const std::string& caption, const std::vector<std::pair<std::string, std::string>>& rows);
@@ -27,7 +33,7 @@ std::string inlineSvg(std::string svg, const std::string& prefix);
 std::string urlPart(std::string_view text);
 
 /// Of pages about files and of indices.
-extern const std::string_view pageScript;
-extern const std::string_view indexScript;
+extern const Asset& pageScript;
+extern const Asset& indexScript;
 
 }  // namespace OvTool

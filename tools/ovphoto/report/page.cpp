@@ -18,7 +18,8 @@ using OvPlot::Canvas;
 
 namespace {
 
-constexpr std::size_t columnsEach = 12;  // of a candela table: as many as fit on A4
+constexpr std::size_t mostValues = 20000;  // in the tables of a page
+constexpr std::size_t columnsEach = 12;    // of a candela table: as many as fit on A4
 
 std::string drawn(const OvPlot::Diagram& diagram, void (*draw)(Canvas&, const OvPlot::Diagram&),
                   const char* what) {
@@ -129,11 +130,19 @@ std::string candelaTable(const CandelaValues& values, std::size_t first, std::si
 
 std::string candelaSection(const DrawnFile& file) {
     Ov::RnPhotoWebData& web = *file.source.web;
-    const CandelaValues values{web, verticalsOf(web), horizontalsOf(web), file.light->getPeakIntensity()};
+    CandelaValues values{web, verticalsOf(web), horizontalsOf(web), file.light->getPeakIntensity()};
+    const std::size_t rows = values.verticals.size(), columns = values.horizontals.size();
+    values.verticals.resize(std::min(rows, mostValues));
+    values.horizontals.resize(std::min(columns, std::max<std::size_t>(mostValues / rows, 1)));
     std::string section =
         "<section><h2 id=\"candela\">Luminous intensities</h2>\n"
-        "<p class=\"muted\">At the angles of the file, degrees.</p>\n"
-        "<div class=\"scroll\" role=\"region\" aria-labelledby=\"candela\" tabindex=\"0\">\n";
+        "<p class=\"muted\">At the angles of the file, degrees.</p>\n";
+    if (values.verticals.size() < rows || values.horizontals.size() < columns)
+        section += "<p>The first " + std::to_string(values.verticals.size()) + " of " + std::to_string(rows) +
+                   " vertical and " + std::to_string(values.horizontals.size()) + " of " +
+                   std::to_string(columns) +
+                   " horizontal angles. All values: <code>ovphoto info --json --values</code></p>\n";
+    section += "<div class=\"scroll\" role=\"region\" aria-labelledby=\"candela\" tabindex=\"0\">\n";
     for (std::size_t first = 0; first < values.horizontals.size(); first += columnsEach)
         section += candelaTable(values, first, std::min(first + columnsEach, values.horizontals.size()) - 1);
     return section + "</div></section>\n";
