@@ -64,16 +64,16 @@ TEST_F(ToolPlot, LightIsInCandelaWhateverTheUnitOfTheFile) {
     for (const std::string kind : {"isolux", "cartesian"}) {
         ASSERT_EQ(run("in.ies -o a.svg --kind " + kind).status, 0);
         ASSERT_EQ(run("in.tbt -o b.svg --kind " + kind).status, 0);
-        const auto extent = [&](const char* file) {
+        const auto extent = [&](const char* picture) {
             OvPlot::Box box{1e9, 1e9, 0, 0};
-            for (const OvPlot::Point& p : longestPath(bytes(file)))
+            for (const OvPlot::Point& p : longestPath(bytes(picture)))
                 box = {std::min(box.left, p.x), std::min(box.top, p.y), std::max(box.right, p.x),
                        std::max(box.bottom, p.y)};
             return box;
         };
         const OvPlot::Box a = extent("a.svg"), b = extent("b.svg");
-        EXPECT_LT(distance({a.left, a.top}, {b.left, b.top}), 0.2) << kind;
-        EXPECT_LT(distance({a.right, a.bottom}, {b.right, b.bottom}), 0.2) << kind;
+        EXPECT_LT(OvPlot::distance({a.left, a.top}, {b.left, b.top}), 0.2) << kind;
+        EXPECT_LT(OvPlot::distance({a.right, a.bottom}, {b.right, b.bottom}), 0.2) << kind;
     }
     // Reports: candela at the angles of the file, and both fluxes.
     file.lamps = "1 1000";
