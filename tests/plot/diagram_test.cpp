@@ -6,6 +6,7 @@
 #include "tests/photo/photoFixture.h"
 #include "tests/plot/svgPath.h"
 #include "tools/plot/axis.h"
+#include "tools/plot/caption.h"
 #include "tools/plot/curve.h"
 #include "tools/plot/isolines.h"
 #include "tools/plot/picture.h"
@@ -188,6 +189,9 @@ TEST(PlotPicture, LongTitlesTakeLinesThatFit) {
         EXPECT_EQ(canvas.wrapped(std::string(60, 'm'), font, width, 9).size(),
                   std::ceil(60 / std::floor(width / canvas.textWidth("m", font))));
         EXPECT_THAT(canvas.wrapped("", font, width, 3), ElementsAre(""));
+        const std::string longTitle(90, 'm');
+        EXPECT_GT(drawCaption(canvas, longTitle, "", {}).top, drawCaption(canvas, "m", "", {}).top + 20);
+        EXPECT_GT(drawCaption(canvas, "", longTitle, {}).top, drawCaption(canvas, "", "m", {}).top + 15);
     });
 }
 

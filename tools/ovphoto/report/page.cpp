@@ -18,6 +18,7 @@ using OvPlot::Canvas;
 
 namespace {
 
+constexpr std::size_t mostRows = 2000;
 constexpr std::size_t mostValues = 20000;  // in the tables of a page
 constexpr std::size_t columnsEach = 12;    // of a candela table: as many as fit on A4
 
@@ -132,8 +133,8 @@ std::string candelaSection(const DrawnFile& file) {
     Ov::RnPhotoWebData& web = *file.source.web;
     CandelaValues values{web, verticalsOf(web), horizontalsOf(web), file.light->getPeakIntensity()};
     const std::size_t rows = values.verticals.size(), columns = values.horizontals.size();
-    values.verticals.resize(std::min(rows, mostValues));
-    values.horizontals.resize(std::min(columns, std::max<std::size_t>(mostValues / rows, 1)));
+    values.verticals.resize(std::min(rows, mostRows));
+    values.horizontals.resize(std::min(columns, std::max<std::size_t>(mostValues / values.verticals.size(), 1)));
     std::string section =
         "<section><h2 id=\"candela\">Luminous intensities</h2>\n"
         "<p class=\"muted\">At the angles of the file, degrees.</p>\n";
