@@ -16,7 +16,8 @@
     message(nimbLine,         12897, "ds")  /* line, detail */ \
     message(webRefused,       12935, "") \
     message(outOfMemory,      12936, "") \
-    message(fileNotRead,      12945, "s" )  /* detail */
+    message(fileNotRead,      12945, "s" )  /* detail */ \
+    message(textSetOff,       13082, "s" )  /* the text */
 
 // Natural light, text form: the line that is missing or malformed. Put into 12896 as they stand.
 #define OVPHOTO_MESSAGES_NATURAL_LIGHT(message) \

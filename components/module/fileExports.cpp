@@ -1,6 +1,5 @@
 #include "components/module/fileExports.h"
 
-#include <cwchar>
 #include <new>
 
 #include "components/messageFile/messageIds.h"
@@ -11,22 +10,6 @@
 namespace OvPhotometrics {
 
 namespace {
-
-FileFormat* formatOf(Ov::RnComponentBuilder* builder) { return dynamic_cast<FileFormat*>(builder); }
-
-/// The format that accepts the input, the first by name of several; or null.
-FileFormat* recognise(Ov::RnBufferedIO& io) {
-    FileFormat* first = nullptr;
-    const wchar_t* firstName = nullptr;
-    for (const auto& [classId, builder] : builderTable()) {
-        FileFormat* const format = formatOf(builder);
-        if (!format || (first && std::wcscmp(builder->getName(), firstName) > 0) || !format->recognises(io))
-            continue;
-        first = format;
-        firstName = builder->getName();
-    }
-    return first;
-}
 
 void visitAll(const FileFacts& facts, Ov::RnEnumerator<const FileFact&>& visitor) {
     for (const auto& [key, text] : facts)

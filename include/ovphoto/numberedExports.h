@@ -57,6 +57,9 @@ enum class FileForm : std::int32_t {
 ///     TBT      "flux", "referenceFlux", "multiplier", "auxValue1" to "auxValue3", "symmetryCode", "kindCode",
 ///              "kindValue1", "kindValue2", "unitTriple"
 ///
+/// and, last, where labels hold more than ASCII, "encoding": "UTF-8" or "Windows-1252". A label whose bytes are UTF-8
+/// is that text, all others are Windows-1252. Labels are written in the encoding that the facts name, or in UTF-8.
+///
 /// Numbers are the shortest text that reads back as the same value, several with one blank between them.
 struct FileFact {
     const wchar_t* key;   ///< which; as listed above
@@ -112,7 +115,8 @@ struct NumberedFunctions {
     /// Write any distribution as the text of a file to a text stream. A faithful file takes its label lines, and
     /// those of the format's own numbers that do not follow from the light, from `count` facts as `readFileFacts`
     /// gives them, of any format: lines of another format go where there is room, keywords in front; the name of a
-    /// web distribution's web goes where no fact says what the luminaire is.
+    /// web distribution's web goes where no fact says what the luminaire is. A text that would make an importer take
+    /// the file for one of another format is written behind a blank, after a message.
     /// False, and nothing has been written, after messages to the host's reporter; a stream that fails raises
     /// RnStreamEx.
     bool (*writeIes)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,

@@ -165,15 +165,48 @@ TEST_F(ToolConversion, TellsWhichFactsAreDropped) {
     EXPECT_EQ(dropped("out.ies"), "[" + tilt + "]");
     const std::string size = tilt + R"(,{"key":"units","value":"feet"},{"key":"length","value":"3"}])";
     const std::string inTbt = dropped("out.tbt");
-    EXPECT_EQ(inTbt.find(R"([{"key":"TEST","value":"one"},{"key":"OTHER")"), 0U) << inTbt;
+    EXPECT_EQ(inTbt.find(R"([{"key":"TEST","value":"one"},)"
+                         R"({"key":"MORE","value":""},{"key":"OTHER")"),
+              0U)
+        << inTbt;
     EXPECT_TRUE(inTbt.ends_with(size)) << inTbt;
     EXPECT_EQ(inTbt.find("LUMINAIRE"), std::string::npos) << "it is the title";
-    EXPECT_TRUE(runTool("convert rich.ies out.tbt", folder).says("; dropped TEST, OTHER, tilt, units, length"));
+    EXPECT_TRUE(
+        runTool("convert rich.ies out.tbt", folder).says("; dropped TEST, MORE, OTHER, tilt, units, length"));
 
     // Keywords come back from label lines.
     folder.write("short.ies", IesFile{}.text());
     convert("short.ies short.cib");
     EXPECT_EQ(texts(convert("short.cib back.ies")["dropped"]), "[]");
+
+    // What stays, and what is named, as keys.
+    const auto keys = [&](const std::string& arguments) {
+        std::string all;
+        const Json report = convert(arguments);
+        for (const Json& fact : report["dropped"]) all += fact["key"].get<std::string>() + ";";
+        return all;
+    };
+    std::string blocks = IesFile{.lamps = "2 -1"}.text();
+    blocks.replace(0, blocks.find("TILT"),
+                   "IESNA:LM-63-2002\n[TEST] 0\n[BLOCK]\n[LAMP]\n[ENDBLOCK]\n[LUMCAT] 10\n"
+                   "[OTHER] x\n[OTHER] y\n[OTHER] z\n");
+    folder.write("blocks.ies", blocks);
+    EXPECT_EQ(keys("blocks.ies out.ies"), "lamps;");
+    EXPECT_EQ(readBytes(folder.path() / "out.ies").find(blocks.substr(0, blocks.find("[LUMCAT]"))), 0U);
+    EXPECT_EQ(keys("blocks.ies out.cib"), "format;BLOCK;LAMP;ENDBLOCK;lamps;");
+    EXPECT_EQ(keys("blocks.ies out.nmb"), "format;BLOCK;LAMP;ENDBLOCK;OTHER;OTHER;OTHER;lamps;");
+    EXPECT_EQ(keys("blocks.ies out.tbt"), "format;TEST;BLOCK;LAMP;ENDBLOCK;LUMCAT;OTHER;OTHER;OTHER;lamps;");
+    folder.write("factors.cib", "CIBSE/1\n0\n\n\n\n\n\n\n1 1 0 0 0 2 0 3 0\n2 1\n0 90\n0\n100 50\n99 0 0 0\n");
+    EXPECT_EQ(keys("factors.cib out.cib"), "");
+    EXPECT_EQ(keys("factors.cib out.ies"), "factors;");
+    EXPECT_EQ(keys("factors.cib out.tbt"), "label 1;factors;");
+    for (const bool own : {false, true}) {
+        folder.write("in.tbt",
+                     std::string("t\n3\n1 1 1\n2000 1000 ") + (own ? "3" : "2") + " 1 5 0\n1 2 1\n9 8\n-1\n");
+        EXPECT_EQ(keys("in.tbt out.tbt"), "");
+        EXPECT_EQ(runTool("info --json out.tbt", folder).json().at(0)["facts"][5]["value"], own ? "3" : "2");
+        EXPECT_EQ(keys("in.tbt out.ies"), own ? "multiplier;" : "");
+    }
 }
 
 TEST_F(ToolConversion, ASaveThatItsReaderRefusesIsWrittenWithAWarning) {

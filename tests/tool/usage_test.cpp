@@ -150,7 +150,9 @@ TEST_F(ToolUsage, StandardInputAndOutputAreNamedByADash) {
 TEST_F(ToolUsage, WhatIsShownToPeopleActsOnNoTerminal) {
     if (windowsTool()) GTEST_SKIP() << "names there hold no control characters";
     std::string file = IesFile{.tilt = "a\x1b]0;x\x07"}.text();
-    file.replace(file.find("[TEST] one"), 10, "[TEST] \x1b[2J \x7f\t.");
+    file.replace(file.find("[TEST] one"), 10,
+                 "[TEST] \x1b[2J \xc2\x9b"
+                 "1m M\xc3\xbcller \xe2\x80\xae\x7f\t.");
     const std::string name =
         "n\nok       IES    \x1b[31m\x9b"
         "1m\xc2\x85\r.ies";
@@ -190,11 +192,13 @@ TEST_F(ToolUsage, WhatIsShownToPeopleActsOnNoTerminal) {
     }
     const ToolResult human = runTool("info " + in, folder);
     EXPECT_TRUE(human.says("in/n\\nok       IES    \\x1b[31m\\x9b1m\\x85\\r.ies\n")) << human.out;
-    EXPECT_TRUE(human.says("  \\x1b[2J \\x7f .\n")) << human.out;
+    EXPECT_TRUE(human.says("  \\x1b[2J \\x9b1m M\u00fcller \\u202e\\x7f .\n")) << human.out;
     // JSON is exact, but for the byte that is no text.
     const auto exact = runTool("info --json " + in, folder).json().at(0);
     EXPECT_EQ(exact["file"],
               "in/n\nok       IES    \x1b[31m\ufffd"
               "1m\u0085\r.ies");
-    EXPECT_EQ(exact["facts"][1]["value"], "\x1b[2J \x7f\t.");
+    EXPECT_EQ(exact["facts"][1]["value"],
+              "\x1b[2J \u009b"
+              "1m M\u00fcller \u202e\x7f\t.");
 }

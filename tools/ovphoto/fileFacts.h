@@ -19,9 +19,9 @@ std::optional<float> factNumber(const std::vector<Fact>& facts, std::wstring_vie
 /// Array of {"key", "value"}.
 Json factsToJson(const std::vector<Fact>& facts);
 
-/// What stands in a file and not in another that was made of it: label lines whose text is in none of the other's,
-/// and numbers and choices that it lacks. Left out is what a web carries, and what says nothing, such as a width
-/// of 0.
+/// What stands in a file and not in another that was made of it: label lines, each of which wants a line of its own
+/// in the other, and numbers and choices that it lacks. Left out is what a web carries, and what says nothing, such
+/// as a width of 0.
 std::vector<Fact> droppedFacts(const std::vector<Fact>& source, const std::vector<Fact>& output);
 
 }  // namespace OvTool

@@ -14,27 +14,29 @@ bool carryLabels(const FileFacts& facts, CibseRecord& rec) {
     for (std::size_t i = 0; i < rec.labels.size(); ++i) {
         const std::wstring* text = facts.find(labelKey(i));
         if (!text) continue;
-        rec.labels[i] = labelText(*text, cibseLabelLimit);
+        rec.labels[i] = facts.label(*text, cibseLabelLimit);
         any = true;
     }
     return any;
 }
 
-/// The name, unless a line holds it, and as many lines as there is room for.
+/// The name, unless a line holds it, and as many lines as there is room for; those that say least go first.
 void carryLines(const FileFacts& facts, const std::wstring& name, CibseRecord& rec) {
     std::vector<std::wstring> lines = facts.textLines();
     const bool named =
         std::any_of(lines.begin(), lines.end(), [&](const auto& line) { return line.find(name) != line.npos; });
     if (!named) lines.insert(lines.begin(), name);
+    if (lines.size() > rec.labels.size()) std::erase_if(lines, isBareKeyword);
     for (std::size_t i = 0; i < std::min(lines.size(), rec.labels.size()); ++i)
-        rec.labels[i] = labelText(lines[i], cibseLabelLimit);
+        rec.labels[i] = facts.label(lines[i], cibseLabelLimit);
 }
 
 }  // namespace
 
 void cibseDescribe(const CibseRecord& rec, FileFacts& facts) {
     for (std::size_t i = 0; i < rec.labels.size(); ++i)
-        if (rec.labels[i].find_first_not_of(L' ') != std::wstring::npos) facts.add(labelKey(i), rec.labels[i]);
+        if (rec.labels[i].find_first_not_of(L' ') != std::wstring::npos)
+            facts.add(labelKey(i), facts.decoded(rec.labels[i], cibseLabelLimit));
     facts.add(L"leadInteger", rec.leadInteger);
     facts.add(L"photometricType", static_cast<std::int32_t>(rec.photometricType));
     facts.add(L"leadValues", rec.leadValues);

@@ -85,8 +85,8 @@ bool iesRecordFromSampling(Ov::RnIntensityDist& dist, IesFileRecord& rec);
 /// A record to write as a file for other programs: absolute candela, on the web's own grid where type C, A or B
 /// can hold it with its orientation. Throws std::bad_alloc.
 bool iesRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, IesFileRecord& rec);
-/// What a file says beyond its web, and what of such facts a record to be written takes over: header lines, units,
-/// dimensions and watts. The name goes where nothing says which luminaire it is.
+/// What a file says beyond its web, and what of such facts a record to be written takes over: header lines, the
+/// edition in the first of them, units, dimensions and watts. The name goes where nothing says which luminaire it is.
 void iesDescribe(const IesFileRecord& rec, FileFacts& facts);
 void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& rec);
 /// Writes the record as text; a record without a grid as the smallest one, dark. True; a stream's failure raises.

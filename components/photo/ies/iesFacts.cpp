@@ -9,6 +9,7 @@ namespace {
 constexpr std::int32_t feet = 1;
 constexpr std::int32_t metres = 2;
 constexpr std::size_t lineLimit = 80;  // what every edition of the format allows
+constexpr std::wstring_view edition = L"IESNA";
 
 const wchar_t* typeName(IesPhotometricType type) {
     switch (type) {
@@ -44,7 +45,7 @@ std::size_t keywordLength(std::wstring_view line) {
                                                                                                 : keyword.size();
 }
 
-/// The line of index `next`, and what follows of a longer line that the reader has cut.
+/// The bytes of the line of index `next`, and what follows of a longer line that the reader has cut.
 std::wstring wholeLine(const IesLines& lines, std::size_t& next) {
     std::wstring line = lines[next];
     while (lines[next++].size() == lineLimit && next < lines.size() && !lines[next].starts_with(L'['))
@@ -52,22 +53,22 @@ std::wstring wholeLine(const IesLines& lines, std::size_t& next) {
     return line;
 }
 
-void describeLine(const std::wstring& line, bool first, FileFacts& facts) {
+void describeLine(const std::wstring& bytes, bool first, FileFacts& facts) {
+    const std::wstring line = facts.decoded(bytes);
     const std::size_t length = keywordLength(line);
     if (length > 0) {
         const std::size_t start = line.find_first_not_of(L" \t", length + 2);
         facts.add(line.substr(1, length), start == std::wstring::npos ? L"" : line.substr(start));
     } else {
-        facts.add(first && line.starts_with(L"IESNA") ? L"format" : L"line", line);
+        facts.add(first && line.starts_with(edition) ? L"format" : L"line", line);
     }
 }
 
 /// Adds a line; what goes beyond the limit follows as lines that continue it.
-void addLine(IesLines& lines, std::wstring_view line) {
+void addLine(IesLines& lines, std::wstring_view line, const FileFacts& facts) {
     static constexpr std::wstring_view more = L"[MORE] ";
-    lines.emplace_back(line.substr(0, lineLimit));
-    for (std::size_t next = lineLimit; next < line.size(); next += lineLimit - more.size())
-        lines.push_back(std::wstring(more).append(line.substr(next, lineLimit - more.size())));
+    lines.push_back(facts.take(line, lineLimit));
+    while (!line.empty()) lines.push_back(std::wstring(more) + facts.take(line, lineLimit - more.size()));
 }
 
 bool hasKeyword(const IesLines& lines, std::wstring_view start) {
@@ -86,7 +87,7 @@ void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
     facts.add(L"photometry", rec.lumensPerLamp < 0 ? L"absolute" : L"relative");
     facts.add(L"multiplier", rec.candelaMultiplier);
     facts.add(L"photometricType", typeName(rec.photometricType));
-    facts.add(L"tilt", tiltText(rec));
+    facts.add(L"tilt", facts.decoded(tiltText(rec), lineLimit - std::wstring_view(L"TILT=").size()));
     facts.add(L"units", rec.unitsType == feet ? L"feet" : L"metres");
     facts.add(L"width", rec.width);
     facts.add(L"length", rec.length);
@@ -99,10 +100,11 @@ void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
 void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& rec) {
     const IesLines unknown(rec.lines.begin() + 1, rec.lines.end());
     rec.lines.resize(1);
+    if (const std::wstring* format = facts.find(L"format"); format && format->starts_with(edition))
+        rec.lines[0] = facts.label(*format, lineLimit);
     for (const std::wstring& line : facts.textLines())
-        addLine(rec.lines, keywordLength(line) > 0 ? line : L"[OTHER] " + line);
-    if (!name.empty() && !hasKeyword(rec.lines, L"[LUMINAIRE]"))
-        addLine(rec.lines, L"[LUMINAIRE] " + labelText(name, name.size()));
+        addLine(rec.lines, keywordLength(line) > 0 ? line : L"[OTHER] " + line, facts);
+    if (!name.empty() && !hasKeyword(rec.lines, L"[LUMINAIRE]")) addLine(rec.lines, L"[LUMINAIRE] " + name, facts);
     // The format wants test and maker named.
     for (const std::wstring& line : unknown)
         if (!hasKeyword(rec.lines, line.substr(0, line.find(L']')))) rec.lines.push_back(line);

@@ -39,6 +39,9 @@ bool isKeyword(std::wstring_view key) {
     return !key.empty() && std::none_of(key.begin(), key.end(), [](wchar_t c) { return c >= L'a' && c <= L'z'; });
 }
 
+constexpr std::wstring_view encodingKey = L"encoding";
+constexpr std::wstring_view windows1252Name = L"Windows-1252";
+
 bool isLabel(std::wstring_view key) {
     return key == L"title" || key == L"line" || key.starts_with(L"line ") || key.starts_with(L"label ");
 }
@@ -55,6 +58,24 @@ void FileFacts::add(std::wstring key, std::span<const float> values) {
     std::wstring text;
     for (const float value : values) text += (text.empty() ? L"" : L" ") + numberText(value);
     add(std::move(key), std::move(text));
+}
+
+std::wstring FileFacts::decoded(std::wstring_view bytes, std::size_t limit) {
+    if (const auto encoding = encodingOf(bytes, limit); encoding && _encoding != LabelEncoding::utf8)
+        _encoding = encoding;
+    return textOfLabel(bytes, limit);
+}
+
+void FileFacts::addEncoding() {
+    if (_encoding)
+        add(std::wstring(encodingKey),
+            *_encoding == LabelEncoding::utf8 ? L"UTF-8" : std::wstring(windows1252Name));
+}
+
+std::wstring FileFacts::take(std::wstring_view& text, std::size_t limit) const {
+    const std::wstring* name = find(encodingKey);
+    return takeLabel(text, limit,
+                     name && *name == windows1252Name ? LabelEncoding::windows1252 : LabelEncoding::utf8);
 }
 
 const std::wstring* FileFacts::find(std::wstring_view key) const {
@@ -78,18 +99,18 @@ std::vector<std::wstring> FileFacts::textLines() const {
     std::vector<std::wstring> lines;
     for (const auto& [key, text] : _facts) {
         if (!isKeyword(key) && !isLabel(key)) continue;
-        std::wstring line = labelText(text, anyLength);
-        if (line.find_first_not_of(L' ') == std::wstring::npos) continue;
-        lines.push_back(isKeyword(key) ? L"[" + key + L"] " + line : line);
+        const std::wstring line = labelText(text, anyLength);
+        const bool bare = line.find_first_not_of(L' ') == std::wstring::npos;
+        if (isKeyword(key))
+            lines.push_back(L"[" + key + (bare ? L"]" : L"] " + line));
+        else if (!bare)
+            lines.push_back(line);
     }
     return lines;
 }
 
-std::wstring labelText(std::wstring_view text, std::size_t limit) {
-    std::wstring label(text.substr(0, limit));
-    std::replace_if(
-        label.begin(), label.end(), [](wchar_t c) { return c <= 0x1F || c == 0x7F; }, L' ');
-    return label;
+bool isBareKeyword(std::wstring_view line) {
+    return line.starts_with(L'[') && !line.empty() && line.find(L']') == line.size() - 1;
 }
 
 }  // namespace OvPhotometrics

@@ -6,12 +6,15 @@
 #include <string_view>
 #include <vector>
 
+#include "components/photo/lid/labelText.h"
+
 // What a file says beyond its web: label lines and the numbers of its header, as pairs of a key and a text.
 
 namespace OvPhotometrics {
 
 /// Pairs in the order of their file. Keys of label lines are header keywords ("MANUFAC"), "line", "line 1",
-/// "label 1" or "title"; every other key names a number or choice of the format.
+/// "label 1" or "title"; every other key names a number or choice of the format. "encoding" ("UTF-8" or
+/// "Windows-1252") stands behind them where a label has more than ASCII.
 class FileFacts {
 public:
     struct Fact {
@@ -26,6 +29,16 @@ public:
     /// Numbers with one blank between them.
     void add(std::wstring key, std::span<const float> values);
 
+    /// The text of a label's bytes, see `textOfLabel`; their encoding is remembered.
+    std::wstring decoded(std::wstring_view bytes, std::size_t limit = std::wstring::npos);
+    /// Adds the encoding of what has been decoded: UTF-8 where any of it was that.
+    void addEncoding();
+    /// @{
+    /// Bytes of a label in the encoding that these facts name, see `takeLabel`; without one in UTF-8.
+    std::wstring take(std::wstring_view& text, std::size_t limit) const;
+    std::wstring label(std::wstring_view text, std::size_t limit) const { return take(text, limit); }
+    /// @}
+
     /// The text of the first fact of a key, or null.
     const std::wstring* find(std::wstring_view key) const;
     /// The number, or numbers, of a key. False, and nothing changed, where the key is missing or its text is not
@@ -34,8 +47,8 @@ public:
     bool read(std::wstring_view key, float& value) const;
     bool read(std::wstring_view key, std::span<float> values) const;
 
-    /// The label lines as texts that any format can take: "[MANUFAC] Acme" for a keyword's, else as it stands.
-    /// None is empty, and control characters are blanks.
+    /// The label lines as texts that any format can take: "[MANUFAC] Acme" for a keyword's, "[BLOCK]" for one
+    /// without a text, else as it stands. None is empty, and control characters are blanks.
     std::vector<std::wstring> textLines() const;
 
     auto begin() const { return _facts.begin(); }
@@ -43,9 +56,10 @@ public:
 
 private:
     std::vector<Fact> _facts;
+    std::optional<LabelEncoding> _encoding;  // of what has been decoded
 };
 
-/// `text` with blanks for control characters, at most `limit` characters long.
-std::wstring labelText(std::wstring_view text, std::size_t limit);
+/// Whether one of the `textLines` is a keyword without a text.
+bool isBareKeyword(std::wstring_view line);
 
 }  // namespace OvPhotometrics

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "components/photo/lid/fileFacts.h"
+#include "host/componentManager/builder.h"
 #include "ovphoto/numberedExports.h"
 
 namespace OvPhotometrics {
@@ -21,5 +22,11 @@ public:
 protected:
     ~FileFormat() = default;
 };
+
+/// The format of a builder's webs; null for a builder of other objects.
+FileFormat* formatOf(Ov::RnComponentBuilder* builder);
+/// The format that an importer takes an input for: of those that recognise it the first by its builder's name. Null
+/// where there is none.
+FileFormat* recognise(Ov::RnBufferedIO& io);
 
 }  // namespace OvPhotometrics

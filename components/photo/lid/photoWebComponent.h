@@ -1,10 +1,14 @@
 #pragma once
 
+#include <span>
+
+#include "components/messageFile/messageIds.h"
 #include "components/photo/lid/fileFormat.h"
 #include "components/photo/lid/gridEvaluation.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/numberText.h"
 #include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/reportMessage.h"
 #include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/webEvaluation.h"
 #include "host/componentManager/castImpl.h"
@@ -34,6 +38,10 @@
 //         static bool fromDistributionFaithfully(RnIntensityDist&, Record&);
 //         static void describe(const Record&, FileFacts&);
 //         static void carry(const FileFacts&, const std::wstring& name, Record&);
+//         // Of a format whose texts can make its file look like one of another: these texts, as bytes, and how many
+//         // bytes one takes.
+//         static std::span<std::wstring> texts(Record&);
+//         static constexpr std::size_t textLimit;
 //     };
 //
 // The functions report what is wrong and answer false; the adapter turns that into the stream exception.
@@ -143,7 +151,7 @@ public:
         Ov::RnStream stream(&io, Ov::RnStream::Form::text);
         Record record;
         if (!readRecord<Format>(record, stream, basePath)) return false;
-        Format::describe(record, facts);
+        describe(record, facts);
         return true;
     }
 
@@ -153,7 +161,7 @@ public:
         Record record;
         const auto web = Ov::rnCreate<typename Format::Web>();
         loadWeb<Format>(record, stream, *web, name, basePath);
-        Format::describe(record, facts);
+        describe(record, facts);
         return web;
     }
 
@@ -162,11 +170,12 @@ public:
         Record record;
         if (isFaithful ? !takeFaithfully(dist, facts, record) : !Format::fromDistribution(dist, record))
             return false;
-        const auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
-        if (!Format::write(record, stream)) return false;
-        text->seek(0, 0);
-        if (isFaithful && !isReadBack(stream)) return false;
+        auto text = textOf(record);
+        if (isFaithful && text && !isOwn(*text)) {
+            setTextsOff(record, facts);
+            text = textOf(record);
+        }
+        if (!text || (isFaithful && !isReadBack(*text))) return false;
         writeText(text->bytes(), out);
         return true;
     }
@@ -181,10 +190,51 @@ private:
         return true;
     }
 
-    static bool isReadBack(Ov::RnStream& text) {
+    static void describe(const Record& record, FileFacts& facts) {
+        Format::describe(record, facts);
+        facts.addEncoding();
+    }
+
+    /// The file, to be read from its start; null after messages.
+    static RnRef<Ov::RnMemoryBuffer> textOf(const Record& record) {
+        auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
+        if (!Format::write(record, stream)) return {};
+        text->seek(0, 0);
+        return text;
+    }
+
+    /// Whether an importer takes the text for a file of this format.
+    bool isOwn(Ov::RnBufferedIO& text) { return recognise(text) == this; }
+
+    /// Puts a blank in front of those texts that let importers take the file for one of another format, and tells.
+    void setTextsOff(Record& record, const FileFacts& facts) {
+        if constexpr (requires { Format::texts(record); }) {
+            const auto isWell = [&] {
+                const auto text = textOf(record);
+                return text && isOwn(*text);
+            };
+            std::vector<std::pair<std::wstring*, std::wstring>> changed;  // with what else stands there
+            for (std::wstring& label : Format::texts(record)) {
+                if (isWell()) break;
+                changed.emplace_back(&label, facts.label(L" " + textOfLabel(label), Format::textLimit));
+                std::swap(label, changed.back().second);
+            }
+            for (auto& [label, other] : changed) {
+                std::swap(*label, other);
+                if (isWell()) continue;  // it was not this one
+                reportMessage(messages::textSetOff, textOfLabel(*label).c_str());
+                std::swap(*label, other);
+            }
+        }
+    }
+
+    bool isReadBack(Ov::RnMemoryBuffer& text) {
+        if (!isOwn(text)) return false;
+        Ov::RnStream stream(&text, Ov::RnStream::Form::text);
         Record again;
         const auto web = Ov::rnCreate<typename Format::Web>();
-        return readRecord<Format>(again, text, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
+        return readRecord<Format>(again, stream, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
     }
 };
 

@@ -73,17 +73,18 @@ bool isBlank(std::wstring_view text) { return text.find_first_not_of(L' ') == te
 /// Lines made of another format's label lines; what is not there stays.
 void carryLabels(const FileFacts& facts, const std::wstring& name, std::array<std::wstring, 4>& lines) {
     constexpr std::wstring_view keywords[] = {L"TEST", L"MANUFAC", L"LUMINAIRE"};
-    if (!isBlank(name)) lines[2] = labelText(name, nimbLineLength);
+    if (!isBlank(name)) lines[2] = facts.label(name, nimbLineLength);
     for (std::size_t k = 0; k < std::size(keywords); ++k)
         if (const std::wstring* text = facts.find(keywords[k]); text && !isBlank(*text))
-            lines[k] = labelText(*text, nimbLineLength);
+            lines[k] = facts.label(*text, nimbLineLength);
     for (const std::wstring& text : facts.textLines()) {
         const auto holds = [&](std::wstring_view keyword) {
             return text.starts_with(L'[') &&
                    text.compare(1, keyword.size() + 1, std::wstring(keyword) + L"]") == 0;
         };
-        if (std::any_of(std::begin(keywords), std::end(keywords), holds) || text == name) continue;
-        lines[3] = labelText(text, nimbLineLength);
+        if (std::any_of(std::begin(keywords), std::end(keywords), holds) || text == name || isBareKeyword(text))
+            continue;
+        lines[3] = facts.label(text, nimbLineLength);
         return;
     }
 }
@@ -95,7 +96,8 @@ void carryNumber(const FileFacts& facts, const wchar_t* key, bool (*fits)(std::i
 }  // namespace
 
 void nimbDescribe(const NimbRecord& rec, FileFacts& facts) {
-    for (std::size_t k = 0; k < rec.lines.size(); ++k) facts.add(lineKeys[k], rec.lines[k]);
+    for (std::size_t k = 0; k < rec.lines.size(); ++k)
+        facts.add(lineKeys[k], facts.decoded(rec.lines[k], nimbLineLength));
     facts.add(L"identifier", rec.identifier);
     facts.add(L"orientationAngle", rec.orientationAngle);
     facts.add(L"symmetryCode1", rec.symmetryCode1);
@@ -108,7 +110,7 @@ void nimbDescribe(const NimbRecord& rec, FileFacts& facts) {
 void nimbCarry(const FileFacts& facts, const std::wstring& name, NimbRecord& rec) {
     if (!facts.find(lineKeys[0])) carryLabels(facts, name, rec.lines);
     for (std::size_t k = 0; k < rec.lines.size(); ++k)
-        if (const std::wstring* own = facts.find(lineKeys[k])) rec.lines[k] = labelText(*own, nimbLineLength);
+        if (const std::wstring* own = facts.find(lineKeys[k])) rec.lines[k] = facts.label(*own, nimbLineLength);
     carryNumber(facts, L"identifier", fitsIdentifier, rec.identifier);
     carryNumber(facts, L"spare1", fitsField, rec.spare1);
     carryNumber(facts, L"spare2", fitsField, rec.spare2);

@@ -28,6 +28,8 @@ struct NimbFormat {
     static constexpr auto write = nimbWrite;
     static constexpr auto describe = nimbDescribe;
     static constexpr auto carry = nimbCarry;
+    static std::span<std::wstring> texts(NimbRecord& rec) { return rec.lines; }
+    static constexpr std::size_t textLimit = nimbLineLength;
 };
 
 /// A web read from a NIMB file.

@@ -28,6 +28,8 @@ struct TbtFormat {
     static constexpr auto write = tbtWrite;
     static constexpr auto describe = tbtDescribe;
     static constexpr auto carry = tbtCarry;
+    static std::span<std::wstring> texts(TbtFileRecord& rec) { return {&rec.title, 1}; }
+    static constexpr std::size_t textLimit = tbtTitleLength;
 };
 
 /// A web read from a TBT file.

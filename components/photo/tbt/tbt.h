@@ -84,7 +84,7 @@ bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out);
 /// The title and the numbers that no web holds.
 void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts);
 /// Takes over what another file said: its title, or another label line or `name` instead, and those numbers that
-/// the reader accepts.
+/// the reader accepts, a multiplier of its own among them.
 void tbtCarry(const FileFacts& facts, const std::wstring& name, TbtFileRecord& rec);
 
 }  // namespace OvPhotometrics

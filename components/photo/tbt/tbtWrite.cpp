@@ -47,9 +47,10 @@ std::wstring chooseTitle(const FileFacts& facts, const std::wstring& name) {
     for (const wchar_t* key : {L"title", L"LUMINAIRE"})
         if (const std::wstring* text = facts.find(key)) texts.push_back(*text);
     texts.push_back(name);
-    for (std::wstring& line : facts.textLines()) texts.push_back(std::move(line));
+    for (std::wstring& line : facts.textLines())
+        if (!isBareKeyword(line)) texts.push_back(std::move(line));
     for (const std::wstring& text : texts)
-        if (std::wstring title = labelText(text, tbtTitleLength); canBeTitle(title)) return title;
+        if (std::wstring title = facts.label(text, tbtTitleLength); canBeTitle(title)) return title;
     return {};
 }
 
@@ -64,6 +65,17 @@ void carryUnit(const FileFacts& facts, TbtFileRecord& rec) {
     if (std::round(reference * 100) / 100 != reference) return;  // is written with two decimals
     if (facts.read(L"flux", flux) && flux != 0) flux = rec.flux;
     tbtSetFlux(rec, flux, reference);
+}
+
+/// Carries a multiplier that says more than the quotient of the two fluxes, which a record to be written has.
+void carryMultiplier(const FileFacts& facts, TbtFileRecord& rec) {
+    float flux = 0, reference = 0, multiplier = 0;
+    if (!facts.read(L"flux", flux) || !facts.read(L"referenceFlux", reference) ||
+        !facts.read(L"multiplier", multiplier) || !isReadable(multiplier))
+        return;
+    constexpr double rounding = 0.005;  // of a flux with two decimals
+    const double said = widened(multiplier) * reference;
+    if (std::fabs(said - flux) > rounding + 1e-6 * flux) rec.multiplier = multiplier;
 }
 
 void carryValue(const FileFacts& facts, const wchar_t* key, float& value) {
@@ -85,7 +97,7 @@ bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out) {
 }
 
 void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts) {
-    facts.add(L"title", rec.title);
+    facts.add(L"title", facts.decoded(rec.title, tbtTitleLength));
     facts.add(L"kindCode", rec.kindCode);
     const int values = tbtKindValues(rec.kindCode);
     if (values >= 1) facts.add(L"kindValue1", rec.kindValue1);
@@ -106,6 +118,7 @@ void tbtCarry(const FileFacts& facts, const std::wstring& name, TbtFileRecord& r
     carryUnit(facts, rec);
     carryValue(facts, L"kindValue1", rec.kindValue1);
     carryValue(facts, L"kindValue2", rec.kindValue2);
+    carryMultiplier(facts, rec);
     carryValue(facts, L"auxValue1", rec.auxValue1);
     carryValue(facts, L"auxValue2", rec.auxValue2);
     carryValue(facts, L"auxValue3", rec.auxValue3);

@@ -26,6 +26,12 @@ protected:
         return io->bytes();
     }
 
+    static FileFacts describe(FileFormat& format, const std::string& text) {
+        FileFacts facts;
+        EXPECT_TRUE(format.readFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), nullptr, facts)) << text;
+        return facts;
+    }
+
     /// The largest difference of what a format's file gives, of the peak, over the sphere in the host frame. Where
     /// the source jumps to dark or back within `rim` degrees there is none.
     template <class Format>
@@ -201,15 +207,11 @@ TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
                                    std::string(72, 'x') + "yz\n"};
     const auto web = import(source.text(), L"lantern");
     const auto dist = distributionOf(*web);
-    const auto describe = []<class Format>(PhotoWebBuilder<Format>& builder, const std::string& text) {
-        FileFacts facts;
-        EXPECT_TRUE(builder.readFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), nullptr, facts));
-        return facts;
-    };
     const FileFacts facts = describe(immortal<IESBuilder>(), source.text());
     const std::string ies = written<IesFormat>(*dist, facts);
-    EXPECT_TRUE(ies.starts_with("IESNA91\n[TEST] 77\n[MANUFAC] Alder\n[LUMCAT] 5\n[OTHER] plain\n[LAMP] " +
-                                std::string(72, 'x') + "y\n[MORE] z\n[LUMINAIRE] lantern\nTILT=NONE\n"))
+    EXPECT_TRUE(
+        ies.starts_with("IESNA:LM-63-2002\n[TEST] 77\n[MANUFAC] Alder\n[LUMCAT] 5\n[OTHER] plain\n[LAMP] " +
+                        std::string(72, 'x') + "y\n[MORE] z\n[LUMINAIRE] lantern\nTILT=NONE\n"))
         << ies;
     const FileFacts cibse = describe(immortal<CIBSEBuilder>(), written<CibseFormat>(*dist, facts));
     EXPECT_EQ(*cibse.find(L"label 1"), L"lantern");
@@ -224,6 +226,97 @@ TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
     EXPECT_NE(written<IesFormat>(*dist, other).find("y\n[OTHER] a  ! z\n[LUMINAIRE]"), std::string::npos);
     // And back: the keywords are known again.
     EXPECT_NE(written<IesFormat>(*dist, cibse).find("\n[MANUFAC] Alder\n"), std::string::npos);
+}
+
+TEST_F(Faithful, LabelsKeepTheirTextAndTheirBytes) {
+    const std::wstring utf8 = L"UTF-8", windows = L"Windows-1252";
+    std::string umlauts;
+    for (int i = 0; i < 45; ++i) umlauts += "\xc3\xbc";
+    const struct {
+        std::string bytes;
+        std::wstring text, encoding;
+    } cases[] = {
+        {"plain", L"plain", L""},
+        {"M\xc3\xbcller", L"M\u00fcller", utf8},
+        {"M\xfcller", L"M\u00fcller", windows},
+        {"\x80\x81 \x93q\x94 \x9f", L"\u20ac\x81 \u201cq\u201d \u0178", windows},
+        {"\xc3\xbc \xfc", L"\u00c3\u00bc \u00fc", windows},
+        {"\xe7\x81\xaf", L"\u706f", utf8},
+        {"a\xc3", L"a\u00c3", windows},
+        {"\xed\xa0\xbe", L"\u00ed\u00a0\u00be", windows},
+        {"x" + umlauts, L"x" + std::wstring(45, L'\u00fc'), utf8},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.bytes);
+        const IesText source{.header = "IESNA91\n[LUMINAIRE] " + c.bytes + "\n[TEST] \x20\n"};
+        const auto web = import(source.text());
+        const auto dist = distributionOf(*web);
+        const FileFacts facts = describe(immortal<IESBuilder>(), source.text());
+        ASSERT_EQ(*facts.find(L"LUMINAIRE"), c.text);
+        ASSERT_EQ(c.encoding.empty() ? L"" : *facts.find(L"encoding"), c.encoding);
+        const auto keeps = [&](FileFormat& format, const std::string& file, const wchar_t* key,
+                               std::size_t limit) {
+            const FileFacts again = describe(format, file);
+            const std::wstring* text = again.find(key);
+            ASSERT_TRUE(text) << file;
+            EXPECT_TRUE((L"[LUMINAIRE] " + c.text).find(*text) != text->npos) << file;
+            EXPECT_TRUE(c.bytes.size() > limit || file.find(c.bytes) != file.npos) << file;
+            EXPECT_GE(text->size(), std::min<std::size_t>(c.text.size(), limit / 2 - 1)) << file;
+            EXPECT_EQ(c.encoding.empty() ? L"" : *again.find(L"encoding"), c.encoding);
+        };
+        keeps(immortal<IESBuilder>(), written<IesFormat>(*dist, facts), L"LUMINAIRE", 68);
+        keeps(immortal<CIBSEBuilder>(), written<CibseFormat>(*dist, facts), L"label 1", 48);
+        keeps(immortal<NIMBBuilder>(), written<NimbFormat>(*dist, facts), L"line 3", 72);
+        keeps(immortal<TBTBuilder>(), written<TbtFormat>(*dist, facts), L"title", 80);
+    }
+    // What only looks like UTF-8 in Windows-1252 is written as UTF-8; a character that the reader cut is left out.
+    FileFacts facts;
+    facts.add(L"title", L"\u00c3\u00bc");
+    facts.add(L"encoding", windows);
+    const auto light = Ov::rnCreate<Isotropic>();
+    light->setPeakIntensity(80);
+    EXPECT_TRUE(written<TbtFormat>(*light, facts).starts_with("\xc3\x83\xc2\xbc\n"));
+    std::string nimb = written<NimbFormat>(*light);
+    nimb.replace(nimb.find("Measurement unknown"), 19, std::string(35, '-') + umlauts.substr(0, 40));
+    EXPECT_EQ(*describe(immortal<NIMBBuilder>(), nimb).find(L"line 1"),
+              std::wstring(35, L'-') + std::wstring(18, L'\u00fc'));
+}
+
+TEST_F(Faithful, NoTextMakesAFileLookLikeOneOfAnotherFormat) {
+    const auto light = Ov::rnCreate<Isotropic>();
+    light->setPeakIntensity(80);
+    const std::wstring fine = L"TILT as it may stand",
+                       column = std::wstring(36, L'x') + L"NIMB" + std::wstring(32, L'x');
+    for (const std::wstring& text :
+         {std::wstring(L"IESNA91"), std::wstring(L"CIBSE/1"), std::wstring(L"TILT=NONE"), column}) {
+        FileFacts facts;
+        for (const wchar_t* key : {L"title", L"label 1", L"label 2", L"line 1", L"line 3", L"TEST"})
+            facts.add(key, text);
+        facts.add(L"line 2", fine);
+        const auto takenFor = [](const std::string& file) {
+            return recognise(*Ov::rnCreate<Ov::RnMemoryBuffer>(file));
+        };
+        const std::string narrow(text.begin(), text.end());
+        const auto told = [&](int times) {
+            std::string messages;
+            for (int i = 0; i < times; ++i) messages += (i > 0 ? "; 13082 " : "13082 ") + narrow;
+            return messages;
+        };
+        EXPECT_EQ(takenFor(written<IesFormat>(*light, facts)), &immortal<IESBuilder>());
+        EXPECT_EQ(takenFor(written<CibseFormat>(*light, facts)), &immortal<CIBSEBuilder>());
+        EXPECT_EQ(log.take(), "");
+        const std::string nimb = written<NimbFormat>(*light, facts);
+        EXPECT_EQ(takenFor(nimb), &immortal<NIMBBuilder>());
+        const bool tilt = text.starts_with(L"TILT=");
+        const std::string blank = tilt ? " " : "";
+        EXPECT_NE(nimb.find("\n" + blank + narrow + "\nTILT as it may stand\n" + blank + narrow + "\n"), nimb.npos)
+            << nimb;
+        EXPECT_EQ(log.take(), told(tilt ? 2 : 0));
+        const std::string tbt = written<TbtFormat>(*light, facts);
+        EXPECT_EQ(takenFor(tbt), &immortal<TBTBuilder>());
+        EXPECT_TRUE(tbt.starts_with(" " + narrow + "\n")) << tbt;
+        EXPECT_EQ(log.take(), told(1));
+    }
 }
 
 }  // namespace
