@@ -83,7 +83,7 @@ protected:
     static std::string written(const Record& record) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), Form::text);
-        return Format::write(record, stream) ? io->bytes() : "";
+        return writeRecord<Format>(record, stream, FileForm::asSaved) ? io->bytes() : "";
     }
 
     /// Each text is refused with its messages, and a web that was to load it stays as it was.

@@ -69,6 +69,7 @@ Json convert(const Conversion& conversion, const HostSession& session, const Rea
     const auto made = writeAnew(conversion, session, source, facts, light, messages);
     if (made && made->light) {
         report["dropped"] = droppedOf(source, *made);
+        if (const auto warning = lostTypeB(source, made->facts)) append(report["warnings"], {*warning});
         reportLoss(report, conversion, *light, *made);
     } else if (made) {
         // A save is what it is, readable or not.

@@ -14,8 +14,19 @@ using namespace Ov;
 
 namespace {
 
-/// Far enough from the rim of a dark range that rounding does not lead into it: 0.01 degree.
-constexpr float inward = static_cast<float>(std::numbers::pi / 18000);
+constexpr float degree = static_cast<float>(std::numbers::pi / 180);
+
+/// How far from the rim of a dark range another light is compared: so far that rounding does not lead into the dark
+/// and, where a file has even steps of a degree or so, behind the two steps that its light takes to fall off.
+float rimWidth(RnIntensityDist& output) {
+    const auto withWeb = rnQuery<RnWebIntensityDist>(&output);
+    const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
+    if (!web) return 0.01F * degree;
+    float step = 0;
+    if (web->getThetaCount() > 1) step = web->getTheta(1) - web->getTheta(0);
+    if (web->getPsiCount() > 1) step = std::max(step, web->getPsi(1) - web->getPsi(0));
+    return std::clamp(2.5F * step, 0.01F * degree, 2.5F * degree);
+}
 
 /// Two lights towards angles in the frame of the first.
 class Pair {
@@ -60,22 +71,26 @@ struct LitRange {
     AngleRange angles;
     bool firstIsRim;
     bool lastIsRim;
+    float rim;  // how wide
 
     /// The angle, moved off the rim where it lies there.
     float movedIn(float angle) const {
-        if (firstIsRim && angle <= angles.first) return angles.first + inward;
-        return lastIsRim && angle >= angles.last ? angles.last - inward : angle;
+        const float middle = (angles.first + angles.last) / 2;
+        const float first = std::min(angles.first + rim, middle);
+        const float last = std::max(angles.last - rim, middle);
+        if (firstIsRim && angle < first) return first;
+        return lastIsRim && angle > last ? last : angle;
     }
 };
 
-LitRange thetasOf(const RnPhotoWebData& web) {
+LitRange thetasOf(const RnPhotoWebData& web, float rim) {
     const AngleRange angles = web.getThetaRange();
-    return {angles, angles.first > 0, angles.last < static_cast<float>(std::numbers::pi)};
+    return {angles, angles.first > 0, angles.last < static_cast<float>(std::numbers::pi), rim};
 }
 
-LitRange psisOf(const RnPhotoWebData& web) {
+LitRange psisOf(const RnPhotoWebData& web, float rim) {
     const bool dark = web.isPsiTruncated();
-    return {web.getPsiRange(), dark && web.getSymmetry() == PhotoWebSymmetry::Full, dark};
+    return {web.getPsiRange(), dark && web.getSymmetry() == PhotoWebSymmetry::Full, dark, rim};
 }
 
 /// Where the horizontal range of a web ends that goes on behind its last plane; else its last plane.
@@ -135,9 +150,9 @@ double apartAtPole(const RnPhotoWebData& web, const Pair& lights, int thetaIndex
     return std::max({0.0, *least - output, output - *most});
 }
 
-double overGrid(const RnPhotoWebData& web, const Pair& lights) {
-    const LitRange thetas = thetasOf(web);
-    const LitRange psis = psisOf(web);
+double overGrid(const RnPhotoWebData& web, const Pair& lights, float rim) {
+    const LitRange thetas = thetasOf(web, rim);
+    const LitRange psis = psisOf(web, rim);
     const std::vector<float> allThetas = withMidpoints(thetaList(web));
     double largest = 0;
     for (const float psi : withMidpoints(psiList(web))) {
@@ -196,7 +211,7 @@ double percent(double part, double whole) { return whole > 0 ? part / whole * 10
 
 }  // namespace
 
-ConversionLoss measureLoss(RnIntensityDist& source, const RnIntensityDist& output) {
+ConversionLoss measureLoss(RnIntensityDist& source, RnIntensityDist& output) {
     const auto withWeb = rnQuery<RnWebIntensityDist>(&source);
     const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
     const Pair lights(source, output);
@@ -204,7 +219,7 @@ ConversionLoss measureLoss(RnIntensityDist& source, const RnIntensityDist& outpu
     const Pair::Candela sums =
         gaveOff(lights, web ? thetaList(*web) : std::vector{thetas.first, thetas.last}, web ? 2 : 64);
     ConversionLoss loss;
-    loss.candela = web ? overGrid(*web, lights) : fromAxis(lights);
+    loss.candela = web ? overGrid(*web, lights, rimWidth(output)) : fromAxis(lights);
     loss.candelaPercent = percent(loss.candela, source.getPeakIntensity());
     loss.fluxPercent = percent(sums.output - sums.source, sums.source);
     return loss;

@@ -13,6 +13,6 @@ struct ConversionLoss {
 
 /// Compares the candela of two lights, those of the source at the angles of its web and midway between them or,
 /// without a web, every half degree from the axis; and what both give off in all, integrated alike.
-ConversionLoss measureLoss(Ov::RnIntensityDist& source, const Ov::RnIntensityDist& output);
+ConversionLoss measureLoss(Ov::RnIntensityDist& source, Ov::RnIntensityDist& output);
 
 }  // namespace OvTool

@@ -48,10 +48,15 @@ bool hasTilt(const std::vector<Fact>& facts) {
     return tilt && *tilt != L"NONE";
 }
 
-/// Whether a type B file lies as its angles do, its axis not laid down: its horizontal angles start at 0.
-bool isUnturnedTypeB(const RnPhotoWebData& web, const std::vector<Fact>& facts) {
+bool isTypeB(const std::vector<Fact>& facts) {
     const std::wstring* type = findFact(facts, L"photometricType");
-    return type && *type == L"B" && web.hasIdentityOrientation() && web.getSymmetry() == PhotoWebSymmetry::Half;
+    return type && *type == L"B";
+}
+
+/// Whether a type B file lies as its angles do, its axis not laid down: its horizontal angles start at 0.
+bool isUnturnedTypeB(const ReadResult& file) {
+    return isTypeB(file.facts) && file.web->hasIdentityOrientation() &&
+           file.web->getSymmetry() == PhotoWebSymmetry::Half;
 }
 
 /// How far the light's last plane lies from where the symmetry wants it, beyond what a step may be.
@@ -83,6 +88,12 @@ std::optional<std::string> negativeFlux(RnPhotoWebData& web) {
     return "the flux of the luminaire is negative: the values integrate to " + shortNumber(lumens) + " lm";
 }
 
+std::optional<std::string> lostTypeB(const ReadResult& source, const std::vector<Fact>& output) {
+    if (!isUnturnedTypeB(source) || isTypeB(output)) return {};
+    return "type B with horizontal angles from 0 is written as it lies here, its axis at the host's +X: other "
+           "programs that read the source lay it down";
+}
+
 std::vector<std::string> webWarnings(const ReadResult& result) {
     std::vector<std::string> warnings;
     const auto add = [&warnings](std::optional<std::string> warning) {
@@ -92,7 +103,7 @@ std::vector<std::string> webWarnings(const ReadResult& result) {
     add(negativeFlux(*result.web));
     add(darkness(result));
     if (hasTilt(result.facts)) add("the tilt data is read but not applied");
-    if (isUnturnedTypeB(*result.web, result.facts))
+    if (isUnturnedTypeB(result))
         add("type B with horizontal angles from 0 stays unturned: its axis lies at the host's +X, not at -Y");
     add(earlyEnd(*result.web));
     return warnings;

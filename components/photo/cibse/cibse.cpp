@@ -119,19 +119,18 @@ bool cibseRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, CibseRecor
     return true;
 }
 
-bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out) {
-    const auto writeThree = [&](const std::array<float, 3>& values, const wchar_t* format, auto... before) {
-        writeLine(out, format, before..., values[0], values[1], values[2]);
-    };
+bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out, FileForm form) {
+    const auto three = [&](const std::array<float, 3>& v) { return numbersText({v[0], v[1], v[2]}, form); };
     writeLine(out, L"%s", signature);
     for (const std::wstring& label : rec.labels)
         writeLine(out, L"%s", label.empty() ? L" " : labelText(label, cibseLabelLimit).c_str());
-    writeThree(rec.leadValues, L"%d %d %.16g %.16g %.16g", rec.leadInteger, static_cast<int>(rec.photometricType));
-    writeThree(rec.factors, L"%.16g %.16g %.16g");
-    writeLine(out, L"%.2f", rec.singleValue);
+    writeLine(out, L"%d %d %s", rec.leadInteger, static_cast<int>(rec.photometricType),
+              three(rec.leadValues).c_str());
+    writeLine(out, L"%s", three(rec.factors).c_str());
+    writeLine(out, L"%s", numbersText({rec.singleValue}, form, 2).c_str());
     writeLine(out, L"%d %d", rec.grid.verticalCount, rec.grid.horizontalCount);
-    candelaGridWrite(rec.grid, out, valueLineLimit);
-    writeThree(rec.trailerValues, L"%d %.16g %.16g %.16g", rec.trailerInteger);
+    candelaGridWrite(rec.grid, out, valueLineLimit, form);
+    writeLine(out, L"%d %s", rec.trailerInteger, three(rec.trailerValues).c_str());
     return true;
 }
 

@@ -63,7 +63,7 @@ bool cibseResample(Ov::RnIntensityDist& dist, CibseRecord& rec, float scale);
 /// where type 1 or 2 can hold it with its orientation. Throws std::bad_alloc.
 bool cibseRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, CibseRecord& rec);
 /// Writes the record as text, labels cut at their 60 characters. True; a stream's failure raises.
-bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out);
+bool cibseWrite(const CibseRecord& rec, Ov::RnStream& out, FileForm form);
 
 /// Whether the input starts with "CIBSE/1". The position is kept.
 bool cibseCanRead(Ov::RnBufferedIO& io);

@@ -90,7 +90,7 @@ bool iesRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, IesFileRecor
 void iesDescribe(const IesFileRecord& rec, FileFacts& facts);
 void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& rec);
 /// Writes the record as text; a record without a grid as the smallest one, dark. True; a stream's failure raises.
-bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out);
+bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out, FileForm form);
 
 /// Whether the input looks like an IES file: it starts with "IESNA91" or has a line that starts with "TILT=". The
 /// position is kept.

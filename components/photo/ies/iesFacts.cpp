@@ -109,6 +109,12 @@ void iesCarry(const FileFacts& facts, const std::wstring& name, IesFileRecord& r
     for (const std::wstring& line : unknown)
         if (!hasKeyword(rec.lines, line.substr(0, line.find(L']')))) rec.lines.push_back(line);
 
+    // A web of type B whose horizontal angles start at 0 is as one of type A.
+    const std::wstring* type = facts.find(L"photometricType");
+    const bool oneSided = !rec.grid.horizontalAngles.empty() && rec.grid.horizontalAngles.front() >= -iesTolerance;
+    if (type && *type == typeName(IesPhotometricType::B) && rec.photometricType == IesPhotometricType::A &&
+        oneSided)
+        rec.photometricType = IesPhotometricType::B;
     if (const std::wstring* units = facts.find(L"units")) rec.unitsType = *units == L"feet" ? feet : metres;
     facts.read(L"width", rec.width);
     facts.read(L"length", rec.length);

@@ -9,13 +9,11 @@ namespace {
 
 constexpr int valueLineLimit = 133;  // no value line reaches this many characters
 
-double widened(float value) { return value; }
-
-void writeValues(const std::vector<float>& values, Ov::RnStream& out) {
-    writeValueList(values.size(), values.data(), out, valueLineLimit);
+void writeValues(const std::vector<float>& values, Ov::RnStream& out, FileForm form) {
+    writeValueList(values.size(), values.data(), out, valueLineLimit, form);
 }
 
-void writeTilt(const IesFileRecord& rec, Ov::RnStream& out) {
+void writeTilt(const IesFileRecord& rec, Ov::RnStream& out, FileForm form) {
     switch (rec.tiltKind) {
         case IesTiltKind::none:
             writeLine(out, L"TILT=NONE");
@@ -24,8 +22,8 @@ void writeTilt(const IesFileRecord& rec, Ov::RnStream& out) {
             writeLine(out, L"TILT=INCLUDE");
             writeLine(out, L" %d", rec.tilt.geometry);
             writeLine(out, L" %d", static_cast<int>(rec.tilt.tiltAngles.size()));
-            writeValues(rec.tilt.tiltAngles, out);
-            writeValues(rec.tilt.tiltFactors, out);
+            writeValues(rec.tilt.tiltAngles, out, form);
+            writeValues(rec.tilt.tiltFactors, out, form);
             break;
         case IesTiltKind::file:
             writeLine(out, L"TILT=%*s", 75, rec.tiltFile.c_str());
@@ -74,20 +72,20 @@ bool iesRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, IesFileRecor
     return true;
 }
 
-bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out) {
+bool iesWriteRecord(const IesFileRecord& rec, Ov::RnStream& out, FileForm form) {
     const CandelaGrid& grid = rec.grid;
     const bool real = grid.verticalCount >= 2 && grid.horizontalCount >= 1;
     for (const std::wstring& line : rec.lines) writeLine(out, L"%s", line.c_str());
-    writeTilt(rec, out);
-    writeLine(out, L"%d %.2f %.16g", rec.lampCount, widened(rec.lumensPerLamp), widened(rec.candelaMultiplier));
+    writeTilt(rec, out, form);
+    writeLine(out, L"%d %s %s", rec.lampCount, numbersText({rec.lumensPerLamp}, form, 2).c_str(),
+              numbersText({rec.candelaMultiplier}, form).c_str());
     writeLine(out, L"%d %d", real ? grid.verticalCount : 2, real ? grid.horizontalCount : 1);
     writeLine(out, L"%d", static_cast<int>(rec.photometricType));
     writeLine(out, L"%d", rec.unitsType);
-    writeLine(out, L"%.16g %.16g %.16g", widened(rec.width), widened(rec.length), widened(rec.height));
-    writeLine(out, L"%.16g %.16g %.16g", widened(rec.ballastFactor), widened(rec.ballastLampFactor),
-              widened(rec.inputWatts));
+    writeLine(out, L"%s", numbersText({rec.width, rec.length, rec.height}, form).c_str());
+    writeLine(out, L"%s", numbersText({rec.ballastFactor, rec.ballastLampFactor, rec.inputWatts}, form).c_str());
     if (real) {
-        candelaGridWrite(grid, out, valueLineLimit);
+        candelaGridWrite(grid, out, valueLineLimit, form);
     } else {
         for (const wchar_t* line : {L"0.0 180.0", L"0.0", L"0.0 0.0"}) writeLine(out, L"%s", line);
     }

@@ -82,12 +82,12 @@ bool candelaGridRead(CandelaGrid& grid, NumberText& in) {
     return false;
 }
 
-void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit) {
-    writeValueList(grid.verticalAngles.size(), grid.verticalAngles.data(), out, limit);
-    writeValueList(grid.horizontalAngles.size(), grid.horizontalAngles.data(), out, limit);
+void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit, FileForm form) {
+    writeValueList(grid.verticalAngles.size(), grid.verticalAngles.data(), out, limit, form);
+    writeValueList(grid.horizontalAngles.size(), grid.horizontalAngles.data(), out, limit, form);
     const auto row = static_cast<std::size_t>(grid.verticalCount);
     for (int j = 0; j < grid.horizontalCount; ++j)
-        writeValueList(row, &grid.candelas[grid.index(0, j)], out, limit);
+        writeValueList(row, &grid.candelas[grid.index(0, j)], out, limit, form);
 }
 
 GridFit gridFit(const Ov::RnPhotoWebData& web) {

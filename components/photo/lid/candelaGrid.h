@@ -39,7 +39,7 @@ bool candelaGridReadCounts(CandelaGrid& grid, NumberText& in);
 bool candelaGridRead(CandelaGrid& grid, NumberText& in);
 
 /// Writes vertical angles, horizontal angles and each row of candelas as value lists.
-void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit);
+void candelaGridWrite(const CandelaGrid& grid, Ov::RnStream& out, int limit, FileForm form);
 
 /// How a web's own grid can stand in a file: as planes through the vertical axis, as angles centred on 0 or to one
 /// side of it, or not at all.

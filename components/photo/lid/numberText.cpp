@@ -1,6 +1,8 @@
 #include "components/photo/lid/numberText.h"
 
 #include <algorithm>
+#include <charconv>
+#include <cmath>
 #include <utility>
 
 #include "components/messageFile/messageIds.h"
@@ -119,15 +121,37 @@ void writeText(std::string_view bytes, Ov::RnStream& out) {
     out.pendingSeparator = false;
 }
 
-void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit) {
-    Ov::FormatSpec twoDecimals;
-    twoDecimals.precision = 2;
-    twoDecimals.letter = L'f';
+void appendNumber(std::wstring& out, float value, FileForm form, int decimals) {
+    if (form == FileForm::faithful) {
+        const float size = std::fabs(value);
+        const bool isPlain = size == 0 || (size >= 1e-5f && size < 1e9f);
+        char text[64];
+        const auto end = std::to_chars(text, text + sizeof text, value,
+                                       isPlain ? std::chars_format::fixed : std::chars_format::scientific);
+        out.append(text, end.ptr);
+        return;
+    }
+    Ov::FormatSpec spec;
+    spec.precision = decimals < 0 ? 16 : decimals;
+    spec.letter = decimals < 0 ? L'g' : L'f';
+    Ov::appendDouble(out, spec, value);
+}
+
+std::wstring numbersText(std::initializer_list<float> values, FileForm form, int decimals) {
+    std::wstring text;
+    for (const float value : values) {
+        if (!text.empty()) text += L' ';
+        appendNumber(text, value, form, decimals);
+    }
+    return text;
+}
+
+void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit, FileForm form) {
     std::wstring item;
     int length = 0;
     for (std::size_t i = 0; i < count; ++i) {
         item.assign(1, L' ');
-        Ov::appendDouble(item, twoDecimals, values[i]);
+        appendNumber(item, values[i], form, 2);
         const int width = static_cast<int>(item.size());
         length += width;
         if (length >= limit) {

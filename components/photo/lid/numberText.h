@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <initializer_list>
 #include <limits>
 #include <optional>
 #include <string>
@@ -9,6 +10,7 @@
 
 #include "components/photo/lid/reportMessage.h"
 #include "host/componentManager/stream.h"
+#include "ovphoto/numberedExports.h"
 
 // Lines, free-form numbers and value lists of text formats.
 
@@ -73,7 +75,13 @@ void writeLine(Ov::RnStream& out, const wchar_t* format, Args... args) {
 /// not take it; throws std::bad_alloc before.
 void writeText(std::string_view bytes, Ov::RnStream& out);
 
-/// Writes values with two decimals, each behind a blank, as lines of less than `limit` characters.
-void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit);
+/// Appends a number. A save gives it `decimals`, or 16 digits in all where that is below 0; a faithful file the
+/// shortest text that reads back as the same float, with an exponent where it would be long otherwise.
+void appendNumber(std::wstring& out, float value, FileForm form, int decimals = -1);
+/// Numbers with a blank between them.
+std::wstring numbersText(std::initializer_list<float> values, FileForm form, int decimals = -1);
+
+/// Writes values, with two decimals in a save, each behind a blank, as lines of less than `limit` characters.
+void writeValueList(std::size_t count, const float* values, Ov::RnStream& out, int limit, FileForm form);
 
 }  // namespace OvPhotometrics

@@ -2,7 +2,8 @@
 
 #include "components/photo/lid/candelaGrid.h"
 
-// A web's own grid as candelas in a file for other programs, where the file can hold angles and orientation.
+// A light as candelas in a file for other programs, where the file can hold angles: on its web's own angles if it can
+// hold them and their orientation.
 
 namespace OvPhotometrics {
 
@@ -24,19 +25,21 @@ struct OwnGridRules {
 };
 
 /// Whether a web has the orientation that `turned`, a record's, gives it.
-bool isTurned(const Ov::RnPhotoWebData& web, const GeLinearMatrix3<float>& turned);
+bool isTurned(const Ov::RnPhotoWebData& web, const GeLinearMatrix3<float>& turned, float tolerance = 1e-5f);
 
-/// Copies the grid of the web that `dist` holds, shifted back to where the format's reader shifts it from; a full
-/// circle is closed with plane 360. False when there is no web, an angle is no multiple of 0.01 degree or the
-/// format cannot hold the web's layout or orientation. Throws std::bad_alloc.
-bool ownGrid(Ov::RnIntensityDist& dist, const OwnGridRules& rules, FileGrid& out);
+/// Copies a web's grid, its values times `peak`, so that the format's reader makes the same light of it: shifted back
+/// to where the reader shifts it from, each angle with as few decimals as give it back exactly. A full circle is
+/// closed with plane 360. Where the light ends at a rim within the range that the format wants, angles 0.001 degree
+/// apart lead into the dark; a rim at the end of that range moves inwards by 0.003. False when the format cannot hold
+/// the web's layout or orientation. Throws std::bad_alloc.
+bool ownGrid(const Ov::RnPhotoWebData& web, float peak, const OwnGridRules& rules, FileGrid& out);
 
-/// What a faithful file holds: the own grid where that can be, else the distribution sampled in the host frame.
-/// Throws std::bad_alloc.
+/// What a faithful file holds: the own grid where that can be; else the distribution in the host frame on even
+/// planes, with its own vertical angles if its axis stands upright. Throws std::bad_alloc.
 FileGrid faithfulGrid(Ov::RnIntensityDist& dist, const OwnGridRules& rules);
 
-/// Multiplies all candelas by `unit` and the least power of ten that gives the peak six digits or more with the
-/// two decimals that are written. What turns the values back into candela.
+/// Multiplies all candelas by `unit` and the least power of ten that gives the peak six digits or more with two
+/// decimals, which they are rounded to. What turns the values back into candela.
 float scaleForFile(CandelaGrid& grid, double unit);
 
 }  // namespace OvPhotometrics

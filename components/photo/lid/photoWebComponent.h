@@ -32,7 +32,7 @@
 //         static bool read(Record&, RnStream&, const wchar_t* basePath);
 //         static bool toWeb(const Record&, Web&, bool loaded, const wchar_t* name, const wchar_t* basePath);
 //         static bool fromDistribution(RnIntensityDist&, Record&);
-//         static bool write(const Record&, RnStream&);
+//         static bool write(const Record&, RnStream&, FileForm);  // or without a form, where it makes no odds
 //         // For files that other programs read: a record with absolute candela, the facts that a record holds
 //         // beyond its web, and the facts and name that a record to be written takes over.
 //         static bool fromDistributionFaithfully(RnIntensityDist&, Record&);
@@ -66,6 +66,14 @@ bool recordToWeb(const typename Format::Record& record, typename Format::Web& we
         return Format::toWeb(record, web, true, name, basePath);
     else
         return Format::toWeb(record, web, true, name);
+}
+
+template <class Format>
+bool writeRecord(const typename Format::Record& record, Ov::RnStream& out, FileForm form) {
+    if constexpr (requires { Format::write(record, out, form); })
+        return Format::write(record, out, form);
+    else
+        return Format::write(record, out);
 }
 
 /// Reads a text into `record` and makes it the content of `web`. Raises ExReadError where either is refused.
@@ -105,7 +113,8 @@ public:
     void save(Ov::RnStream& out) override {
         const auto distribution = makeWebDistribution(this->data());
         typename Format::Record record;
-        if (!Format::fromDistribution(*distribution, record) || !Format::write(record, out))
+        if (!Format::fromDistribution(*distribution, record) ||
+            !writeRecord<Format>(record, out, FileForm::asSaved))
             throw Ov::RnStreamEx::ExWriteError(Format::source, Format::saveLine, Format::streamName);
     }
 
@@ -170,10 +179,10 @@ public:
         Record record;
         if (isFaithful ? !takeFaithfully(dist, facts, record) : !Format::fromDistribution(dist, record))
             return false;
-        auto text = textOf(record);
+        auto text = textOf(record, form);
         if (isFaithful && text && !isOwn(*text)) {
             setTextsOff(record, facts);
-            text = textOf(record);
+            text = textOf(record, form);
         }
         if (!text || (isFaithful && !isReadBack(*text))) return false;
         writeText(text->bytes(), out);
@@ -196,10 +205,10 @@ private:
     }
 
     /// The file, to be read from its start; null after messages.
-    static RnRef<Ov::RnMemoryBuffer> textOf(const Record& record) {
+    static RnRef<Ov::RnMemoryBuffer> textOf(const Record& record, FileForm form) {
         auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
-        if (!Format::write(record, stream)) return {};
+        if (!writeRecord<Format>(record, stream, form)) return {};
         text->seek(0, 0);
         return text;
     }
@@ -211,7 +220,7 @@ private:
     void setTextsOff(Record& record, const FileFacts& facts) {
         if constexpr (requires { Format::texts(record); }) {
             const auto isWell = [&] {
-                const auto text = textOf(record);
+                const auto text = textOf(record, FileForm::faithful);
                 return text && isOwn(*text);
             };
             std::vector<std::pair<std::wstring*, std::wstring>> changed;  // with what else stands there

@@ -148,7 +148,7 @@ bool takeOwnGrid(const Ov::RnPhotoWebData& web, NimbRecord& rec) {
     return false;
 }
 
-void planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
+SamplingPlan planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
     const SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
     rec.orientationAngle = 90;
     rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
@@ -156,6 +156,7 @@ void planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
     rec.psiStep = static_cast<std::int32_t>(plan.psiStep);
     rec.psiMax = static_cast<std::int32_t>(plan.lastPsi());
     if (plan.symmetry == PhotoWebSymmetry::Full) rec.psiMax -= rec.psiStep;  // plane 360 is plane 0
+    return plan;
 }
 
 }  // namespace
@@ -186,14 +187,14 @@ bool nimbRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, NimbRecord&
     rec = recordToWrite();
     const auto web = webOf(dist);
     const bool own = web && takeOwnGrid(*web, rec);
-    if (!own) planGrid(dist, rec);
+    const SamplingPlan plan = own ? SamplingPlan() : planGrid(dist, rec);
     rec.symmetryCode1 = rec.symmetryCode2 = static_cast<std::int32_t>(symmetryOf(rec.psiMax));
     rec.values.reserve(static_cast<std::size_t>(rec.valueCount()));
     const HostView view(dist);
     for (int j = 0; j < rec.thetaCount(); ++j)
         for (int i = 0; i < rec.psiCount(); ++i)
             rec.values.push_back(whole(own ? dist.getPeakIntensity() * web->getCandela(i, j)
-                                           : view.intensity(j * rec.thetaStep, i * rec.psiStep)));
+                                           : view.overCell(j * rec.thetaStep, i * rec.psiStep, plan)));
     return true;
 }
 

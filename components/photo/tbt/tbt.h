@@ -9,6 +9,7 @@
 #include "components/photo/lid/photoWeb.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
+#include "ovphoto/numberedExports.h"
 
 // TBT: photometric webs of the QRT kind.
 //
@@ -79,7 +80,7 @@ bool tbtRecordFromDistributionFaithfully(Ov::RnIntensityDist& dist, TbtFileRecor
 /// a flux (0) values are candela.
 void tbtSetFlux(TbtFileRecord& rec, float flux, float referenceFlux);
 /// Writes the record, whose values must be as many as its counts say, as text. True; a stream's failure raises.
-bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out);
+bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out, FileForm form);
 
 /// The title and the numbers that no web holds.
 void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts);

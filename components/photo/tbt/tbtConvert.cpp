@@ -138,7 +138,7 @@ void fillFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     const HostView view(dist);
     for (int h = 0; h < rec.horizontalCount; ++h)
         for (int v = 0; v < rec.verticalCount; ++v)
-            rec.values.push_back(view.intensity(v * plan.thetaStep, plan.psi(h)));
+            rec.values.push_back(view.overCell(plan.theta(v), plan.psi(h), plan));
 }
 
 }  // namespace

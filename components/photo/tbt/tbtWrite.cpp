@@ -10,32 +10,43 @@ namespace OvPhotometrics {
 
 namespace {
 
-double widened(float value) { return value; }
+/// Rounds to two decimals, or as many as give six digits: those of another file are found again behind single
+/// precision.
+float roundedToSixDigits(float value) {
+    if (!(value > 0) || !std::isfinite(value)) return value;
+    const double parts = std::pow(10, std::max(2.0, 5 - std::floor(std::log10(double{value}))));
+    return static_cast<float>(std::round(value * parts) / parts);
+}
 
 /// Writes a row up to its last value that is not 0, but at least one; the zeros behind it in short.
-void writeRow(const float* row, int count, Ov::RnStream& out) {
+void writeRow(const float* row, int count, Ov::RnStream& out, FileForm form) {
     constexpr int fullLine = 68;  // a line of more characters takes no further value
     int written = count;
     while (written > 1 && row[written - 1] == 0) --written;
+    std::wstring item;
     int length = 0;
     for (int v = 0; v < written; ++v) {
         if (length > fullLine) {
             out.endLine();
             length = 0;
         }
-        length += out.formattedWrite(L" %.2f", widened(row[v]));
+        item.assign(1, L' ');
+        appendNumber(item, form == FileForm::faithful ? roundedToSixDigits(row[v]) : row[v], form, 2);
+        const int width = static_cast<int>(item.size());
+        out.writeItem(item.data(), width);
+        length += width;
     }
     const int zeros = count - written;
     writeLine(out, zeros == 0 ? L"" : zeros == 1 ? L" 0." : L" Z0");
 }
 
-void writeKind(const TbtFileRecord& rec, Ov::RnStream& out) {
+void writeKind(const TbtFileRecord& rec, Ov::RnStream& out, FileForm form) {
     writeLine(out, L"%d", rec.kindCode);
     const int values = tbtKindValues(rec.kindCode);
-    if (values == 1) out.formattedWrite(L"%.16g  ", widened(rec.kindValue1));
-    if (values == 2) out.formattedWrite(L"%.16g %.16g  ", widened(rec.kindValue1), widened(rec.kindValue2));
-    writeLine(out, L"%.4f %.4f %.4f", widened(rec.unitTriple[0]), widened(rec.unitTriple[1]),
-              widened(rec.unitTriple[2]));
+    if (values == 1) out.formattedWrite(L"%s  ", numbersText({rec.kindValue1}, form).c_str());
+    if (values == 2) out.formattedWrite(L"%s  ", numbersText({rec.kindValue1, rec.kindValue2}, form).c_str());
+    const auto& [first, second, third] = rec.unitTriple;
+    writeLine(out, L"%s", numbersText({first, second, third}, form, 4).c_str());
 }
 
 /// Whether the reader takes all of a line as the title.
@@ -62,7 +73,6 @@ void carryUnit(const FileFacts& facts, TbtFileRecord& rec) {
     float reference = 0;
     float flux = rec.flux;
     if (!facts.read(L"referenceFlux", reference) || !isReadable(reference) || reference == 0) return;
-    if (std::round(reference * 100) / 100 != reference) return;  // is written with two decimals
     if (facts.read(L"flux", flux) && flux != 0) flux = rec.flux;
     tbtSetFlux(rec, flux, reference);
 }
@@ -74,7 +84,7 @@ void carryMultiplier(const FileFacts& facts, TbtFileRecord& rec) {
         !facts.read(L"multiplier", multiplier) || !isReadable(multiplier))
         return;
     constexpr double rounding = 0.005;  // of a flux with two decimals
-    const double said = widened(multiplier) * reference;
+    const double said = double{multiplier} * reference;
     if (std::fabs(said - flux) > rounding + 1e-6 * flux) rec.multiplier = multiplier;
 }
 
@@ -84,14 +94,15 @@ void carryValue(const FileFacts& facts, const wchar_t* key, float& value) {
 
 }  // namespace
 
-bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out) {
+bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out, FileForm form) {
     writeLine(out, L"%s", rec.title.c_str());
-    writeKind(rec, out);
-    writeLine(out, L"%.2f %.2f %.16g %.16g %.16g %.16g", widened(rec.flux), widened(rec.referenceFlux),
-              widened(rec.multiplier), widened(rec.auxValue1), widened(rec.auxValue2), widened(rec.auxValue3));
+    writeKind(rec, out, form);
+    writeLine(out, L"%s %s", numbersText({rec.flux, rec.referenceFlux}, form, 2).c_str(),
+              numbersText({rec.multiplier, rec.auxValue1, rec.auxValue2, rec.auxValue3}, form).c_str());
     writeLine(out, L"%d %d %d", rec.symmetryCode, rec.verticalCount, rec.horizontalCount);
     const float* row = rec.values.data();
-    for (int h = 0; h < rec.horizontalCount; ++h, row += rec.verticalCount) writeRow(row, rec.verticalCount, out);
+    for (int h = 0; h < rec.horizontalCount; ++h, row += rec.verticalCount)
+        writeRow(row, rec.verticalCount, out, form);
     writeLine(out, L"-1");
     return true;
 }

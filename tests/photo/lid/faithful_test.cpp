@@ -63,9 +63,12 @@ protected:
 /// What stands in a file's grid.
 template <class Record>
 std::string gridOf(const Record& rec) {
-    return std::to_string(static_cast<int>(rec.photometricType)) + ": " +
-           joined({rec.grid.verticalAngles.begin(), rec.grid.verticalAngles.end()}) + "| " +
-           joined({rec.grid.horizontalAngles.begin(), rec.grid.horizontalAngles.end()});
+    std::ostringstream text;
+    text << static_cast<int>(rec.photometricType) << ": ";
+    for (const float angle : rec.grid.verticalAngles) text << angle << ' ';
+    text << "| ";
+    for (const float angle : rec.grid.horizontalAngles) text << angle << ' ';
+    return text.str();
 }
 
 std::string cibseText(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
@@ -96,15 +99,23 @@ TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
         {{.vertical = up, .horizontal = {0, 45, 90}}, "1" + v + "0 45 90 ", "1" + v + "0 45 90 "},
         {{.vertical = up, .horizontal = {90, 180, 270}}, "1" + v + "90 180 270 ", "1" + v + "90 180 270 "},
         {{.vertical = up, .horizontal = {0, 90, 210}}, "1" + v + "0 90 210 360 ", "1" + v + "0 90 210 360 "},
-        {{.vertical = {0, 45, 90.1}, .horizontal = {0}}, "1: 0 45 90.0999985 | 0 ", "1: 0 45 90 | 0 "},
-        {{.vertical = {0, 2.8125, 90}, .horizontal = {0}}, "1: 0 1 2 ", "1: 0 1 2 "},
-        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {0, 60}}, "3: -90 0 30 | 0 60 ", "1: 0 1 2 "},
+        {{.vertical = {0, 45, 90.1}, .horizontal = {0}},
+         "1: 0 45 90.1 | 0 ",
+         "1: 0 45 90.1 90.101 90.102 90.103 180 | 0 "},
+        {{.vertical = {0, 2.8125, 90}, .horizontal = {0}}, "1: 0 2.8125 90 | 0 ", "1: 0 2.8125 90 | 0 "},
+        {{.vertical = {0, 1.0 / 3, 90}, .horizontal = {0, 120.0625, 200}},
+         "1: 0 0.333333 90 | 0 120.062 200 360 ",
+         "1: 0 0.333333 90 | 0 120.062 200 360 "},
+        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {0, 60}},
+         "3: -90 0 30 | 0 60 ",
+         "1: 0 90 120 120.001 120.002 120.003 180 | 0 60 60.001 60.002 60.003 180 "},
         {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {-20, 0, 60}},
          "3: -90 0 30 | -20 0 60 ",
-         "1: 0 1 2 "},
-        {{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-45, 0, 90}},
-         "2: -90 0 90 | -45 0 90 ",
-         "1: 0 1 2 "},
+         "1: 0 90 120 120.001 120.002 120.003 180 | 270 339.997 339.998 339.999 340 0 60 60.001 60.002 60.003 "
+         "270 "},
+        {{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-45.0625, 0, 90}},
+         "2: -90 0 90 | -45.0625 0 90 ",
+         "2: -90 0 90 | -90 -45.0655 -45.0645 -45.0635 -45.0625 0 89.997 89.998 89.999 90 "},
     };
     for (const auto& c : cases) {
         const auto web = import(c.source.text());
@@ -115,19 +126,20 @@ TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
     const struct {
         int type;
         std::vector<double> vertical, horizontal;
-        std::string grid;
+        std::string grid, ies;
     } cibseCases[] = {
-        {1, {0, 90}, {270, 300, 0, 90}, "1: 0 90 | 270 300 0 90 "},
-        {1, {0, 90}, {270, 0, 90, 180, 270}, "1: 0 90 | 270 0 90 180 270 "},
-        {1, {0, 90}, {270, 0, 100}, "1: 0 90 | 270 0 100 270 "},
-        {2, {-90, 0, 90}, {0, 45, 90}, "2: -90 0 90 | 0 45 90 "},
-        {2, {-90, 0, 90}, {-30, 0, 60.5}, "2: -90 0 90 | -30 0 60.5 "},
+        // Planes from 270 are none of IES: sampled, the vertical angles kept.
+        {1, {0, 40, 90}, {270, 300, 0, 90}, "1: 0 40 90 | 270 300 0 90 ", "1: 0 40 90 | 0 "},
+        {1, {0, 40, 90}, {270, 0, 90, 180, 270}, "1: 0 40 90 | 270 0 90 180 270 ", "1: 0 40 90 | 0 "},
+        {1, {0, 40, 90}, {270, 0, 100}, "1: 0 40 90 | 270 0 100 270 ", "1: 0 40 90 | 0 "},
+        {2, {-90, 0, 90}, {0, 45, 90}, "2: -90 0 90 | 0 45 90 ", "1: 0 90 180 | 0 1 "},
+        {2, {-90, 0, 90}, {-30, 0, 60.5}, "2: -90 0 90 | -30 0 60.5 ", "1: 0 1 2 "},
     };
     for (const auto& c : cibseCases) {
         const auto web = import <CibseFormat>(cibseText(c.type, c.vertical, c.horizontal));
         ASSERT_TRUE(web) << c.grid << log.take();
         EXPECT_EQ(copied<CibseFormat>(*web), c.grid);
-        EXPECT_TRUE(copied<IesFormat>(*web).starts_with("1: ")) << copied<IesFormat>(*web);
+        EXPECT_TRUE(copied<IesFormat>(*web).starts_with(c.ies)) << copied<IesFormat>(*web);
     }
 }
 
@@ -155,6 +167,95 @@ TEST_F(Faithful, EveryFormatGivesTheSameLight) {
         EXPECT_LT(loss<NimbFormat>(*dist, peak), 0.003 + 0.75 / peak) << source.text();
         EXPECT_LT(loss<TbtFormat>(*dist, peak), 0.003 + 5e-6 * web->getLumens() / peak) << source.text();
     }
+}
+
+/// The text of a TBT circle.
+std::string tbtCircle(int verticalCount, int planes) {
+    std::string text =
+        "t\n3\n1 1 1\n1000 1000 1 1 5 0\n4 " + std::to_string(verticalCount) + " " + std::to_string(planes) + "\n";
+    for (int h = 0; h < planes; ++h)
+        for (int v = 0; v < verticalCount; ++v)
+            text += std::to_string(100 + 9 * v + 15 * (h % (planes - 1) * 7 % 4)) + " ";
+    return text + "-1\n";
+}
+
+TEST_F(Faithful, LightIsKeptBetweenTheAnglesAndUpToTheRim) {
+    const std::vector<double> fine{0, .125, .25, .375, .5, .625, .75, .875, 1, 1.125, 1.25, 45, 90};
+    const std::string beam = "1000 960 850 690 520 360 230 130 70 30 9 2 1 ";
+    const std::vector<double> lateral{-30, -10, 10, 30};
+    const std::vector<double> odd{-30.0625, -9.7, 1.0 / 3, 30};
+    const struct {
+        const char* name;
+        RnRef<Ov::RnPhotoWebData> web;
+    } sources[] = {
+        {"circle of 5 planes", import <TbtFormat>(tbtCircle(5, 5))},
+        {"circle of 12 planes", import <TbtFormat>(tbtCircle(8, 12))},
+        {"circle of 25 planes", import <TbtFormat>(tbtCircle(13, 25))},
+        {"fine beam", import(IesText{.vertical = fine, .horizontal = {0}, .values = beam}.text())},
+        {"A", import(IesText{.type = 3, .vertical = lateral, .horizontal = {-45, 0, 45}}.text())},
+        {"A, odd", import(IesText{.type = 3, .vertical = odd, .horizontal = odd}.text())},
+        {"A, one side", import(IesText{.type = 3, .vertical = lateral, .horizontal = {0, 30, 60}}.text())},
+        {"A, hemisphere", import(IesText{.type = 3, .vertical = lateral, .horizontal = {-90, 0, 90}}.text())},
+        {"B", import(IesText{.type = 2, .vertical = lateral, .horizontal = {-45, 0, 45}}.text())},
+        {"B, odd", import(IesText{.type = 2, .vertical = odd, .horizontal = odd}.text())},
+        {"B, hemisphere", import(IesText{.type = 2, .vertical = lateral, .horizontal = {-90, 0, 90}}.text())},
+        {"from 270", import <CibseFormat>(cibseText(1, {0, 40, 90}, {270, 320, 0, 40, 100}))},
+    };
+    for (const auto& [name, web] : sources) {
+        ASSERT_TRUE(web) << name << log.take();
+        const auto dist = distributionOf(*web);
+        EXPECT_LT(loss<IesFormat>(*dist, web->getMaxCandela(), 0.02), 0.001) << name;
+        EXPECT_LT(loss<CibseFormat>(*dist, web->getMaxCandela(), 0.02), 0.001) << name;
+    }
+}
+
+/// Sums over the middles of cells of a degree.
+double fluxOf(const Ov::RnIntensityDist& dist) {
+    double sum = 0;
+    for (double theta = 0.5; theta < 180; ++theta)
+        for (double psi = 0.5; psi < 360; ++psi)
+            sum += std::sin(inRadians(theta)) * dist.intensityAt(direction(theta, psi));
+    return sum * inRadians(1) * inRadians(1);
+}
+
+TEST_F(Faithful, RimsKeepTheirFluxOnEvenGrids) {
+    for (const int type : {2, 3})
+        for (const std::vector<double>& horizontal : {std::vector<double>{-45, 0, 45}, {0, 30, 60}}) {
+            const IesText text{.type = type,
+                               .vertical = {-30, 0, 30},
+                               .horizontal = horizontal,
+                               .values = "900 950 920 930 1000 990 940 960 910 "};
+            const auto web = import(text.text());
+            const auto dist = distributionOf(*web);
+            dist->setFlux(web->getLumens());
+            const double expected = fluxOf(*dist) / web->getMaxCandela();
+            for (const auto& again :
+                 {RnRef<Ov::RnPhotoWebData>(import <TbtFormat>(written<TbtFormat>(*dist))),
+                  RnRef<Ov::RnPhotoWebData>(import <NimbFormat>(written<NimbFormat>(*dist)))}) {
+                EXPECT_NEAR(fluxOf(*distributionOf(*again)) / again->getMaxCandela() / expected, 1, 0.002)
+                    << text.text();
+            }
+        }
+}
+
+TEST_F(Faithful, NumbersAreTheShortestThatReadBackAndTheFluxIsTheirs) {
+    for (const float lumens : {0.015f, 0.4f, 3.3f, 123456.7f}) {
+        const auto light = Ov::rnCreate<Isotropic>();
+        light->setFlux(lumens);
+        const auto tbt = import <TbtFormat>(written<TbtFormat>(*light));
+        EXPECT_EQ(tbt->getLumens(), light->getFlux());
+        EXPECT_NEAR(tbt->getMaxCandela() * lumens / 1000 / light->getPeakIntensity(), 1, 5e-6);
+        EXPECT_EQ(import(written<IesFormat>(*light))->getLumens(), light->getFlux());
+    }
+    const auto light = Ov::rnCreate<Isotropic>();
+    light->setPeakIntensity(250.5);
+    FileFacts facts;
+    facts.add(L"height", -0.094f);
+    facts.add(L"watts", 1234567.0f);
+    const std::string ies = written<IesFormat>(*light, facts);
+    EXPECT_NE(ies.find(" 0.1\n"), std::string::npos) << ies;
+    EXPECT_NE(ies.find("\n0 0 -0.094\n1 1 1234567\n"), std::string::npos) << ies;
+    EXPECT_NE(ies.find("\n 2505 2505"), std::string::npos) << ies;
 }
 
 TEST_F(Faithful, FormulasBecomeFiles) {
@@ -207,6 +308,15 @@ TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
                                    std::string(72, 'x') + "yz\n"};
     const auto web = import(source.text(), L"lantern");
     const auto dist = distributionOf(*web);
+    // A type that the web does not tell stays.
+    const IesText sided{.type = 2, .vertical = {-60, 0, 60}, .horizontal = {0, 45}};
+    const auto sidedDist = distributionOf(*import(sided.text()));
+    const FileFacts sidedFacts = describe(immortal<IESBuilder>(), sided.text());
+    EXPECT_EQ(
+        *describe(immortal<IESBuilder>(), written<IesFormat>(*sidedDist, sidedFacts)).find(L"photometricType"),
+        L"B");
+    EXPECT_EQ(*describe(immortal<IESBuilder>(), written<IesFormat>(*sidedDist)).find(L"photometricType"), L"A");
+
     const FileFacts facts = describe(immortal<IESBuilder>(), source.text());
     const std::string ies = written<IesFormat>(*dist, facts);
     EXPECT_TRUE(
