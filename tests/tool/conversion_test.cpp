@@ -213,6 +213,10 @@ TEST_F(ToolConversion, TellsWhichFactsAreDropped) {
     EXPECT_EQ(keys("factors.cib out.cib"), "");
     EXPECT_EQ(keys("factors.cib out.ies"), "factors;");
     EXPECT_EQ(keys("factors.cib out.tbt"), "label 1;factors;");
+    std::string twice = IesFile{}.text();
+    twice.replace(twice.find("[TEST] one"), 10, "[TEST] 7\n[LUMINAIRE] 7");
+    folder.write("twice.ies", twice);
+    EXPECT_EQ(keys("twice.ies out.tbt"), "LUMINAIRE;") << "one title stands for one line";
     for (const bool own : {false, true}) {
         folder.write("in.tbt",
                      std::string("t\n3\n1 1 1\n2000 1000 ") + (own ? "3" : "2") + " 1 5 0\n1 2 1\n9 8\n-1\n");
