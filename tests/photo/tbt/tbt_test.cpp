@@ -188,7 +188,7 @@ TEST_F(Tbt, FactsAreCarriedWhereTheReaderAcceptsThem) {
     rec = TbtFileRecord();
     tbtCarry(own, L"name", rec);
     EXPECT_EQ(written(rec),
-              "Spot\n5\n0.25 7  1.0000 0.5000 0.0000\n0.00 8.00 1 6 5 0.1000000014901161\n4 0 0\n-1\n");
+              "Spot\n5\n0.25 7  1.0000 0.5000 0.0000\n0.00 8.00 7 6 5 0.1000000014901161\n4 0 0\n-1\n");
 
     const auto title = [](const wchar_t* key, const wchar_t* text, const wchar_t* name) {
         FileFacts facts;
