@@ -14,18 +14,21 @@ using namespace Ov;
 
 namespace {
 
+constexpr double keptPercent = 0.1;  // of the peak, by every conversion that can
 constexpr float degree = static_cast<float>(std::numbers::pi / 180);
 
-/// How far from the rim of a dark range another light is compared: so far that rounding does not lead into the dark
-/// and, where a file has even steps of a degree or so, behind the two steps that its light takes to fall off.
-float rimWidth(RnIntensityDist& output) {
+/// So far from the rim of a dark range that rounding does not lead into the dark.
+constexpr float atRim = 0.01F * degree;
+
+/// Behind the steps, of a degree or so, that light takes to fall off at a rim on an even grid, in both directions.
+float behindRim(RnIntensityDist& output) {
     const auto withWeb = rnQuery<RnWebIntensityDist>(&output);
     const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
-    if (!web) return 0.01F * degree;
+    if (!web) return atRim;
     float step = 0;
     if (web->getThetaCount() > 1) step = web->getTheta(1) - web->getTheta(0);
     if (web->getPsiCount() > 1) step = std::max(step, web->getPsi(1) - web->getPsi(0));
-    return std::clamp(2.5F * step, 0.01F * degree, 2.5F * degree);
+    return std::clamp(3 * step, atRim, 3 * degree);
 }
 
 /// Two lights towards angles in the frame of the first.
@@ -219,8 +222,14 @@ ConversionLoss measureLoss(RnIntensityDist& source, RnIntensityDist& output) {
     const Pair::Candela sums =
         gaveOff(lights, web ? thetaList(*web) : std::vector{thetas.first, thetas.last}, web ? 2 : 64);
     ConversionLoss loss;
-    loss.candela = web ? overGrid(*web, lights, rimWidth(output)) : fromAxis(lights);
+    loss.candela = web ? overGrid(*web, lights, atRim) : fromAxis(lights);
     loss.candelaPercent = percent(loss.candela, source.getPeakIntensity());
+    if (web && loss.candelaPercent > keptPercent) {
+        const double inside = overGrid(*web, lights, behindRim(output));
+        if (inside < loss.candela) loss.rimCandela = loss.candela;
+        loss.candela = inside;
+        loss.candelaPercent = percent(inside, source.getPeakIntensity());
+    }
     loss.fluxPercent = percent(sums.output - sums.source, sums.source);
     return loss;
 }

@@ -64,6 +64,12 @@ std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFo
         warnings.push_back("the candela differ by up to " + shortNumber(loss.candela) + " cd, " +
                            shortNumber(loss.candelaPercent) + " % of the peak");
     }
+    if (loss.rimCandela > 0) {
+        warnings.push_back(
+            "at the rim of its range the light falls off within some steps: there the candela differ by up "
+            "to " +
+            shortNumber(loss.rimCandela) + " cd");
+    }
     if (std::abs(loss.fluxPercent) > tolerated)
         warnings.push_back("the flux of the luminaire differs by " + shortNumber(loss.fluxPercent) + " %");
     return warnings;
