@@ -34,7 +34,7 @@ struct Layout {
 /// The angle that a reader which adds `added` degrees takes as `radians`.
 double fileAngle(float radians, double added) {
     const double degrees = inDegrees(radians) - added;
-    for (double unit = 1; unit <= 1e7; unit *= 10) {
+    for (int unit = 1; unit <= 10'000'000; unit *= 10) {
         const auto angle = static_cast<float>(std::round(degrees * unit) / unit);
         if (toRadians(angle + added) == radians) return angle + 0.0;  // without a negative zero
     }
@@ -85,7 +85,7 @@ bool addRimBelow(Nodes& nodes, int beyond, double limit) {
 
 /// The turn of about so many degrees by which `matrixOf` gives the web's orientation, with as few decimals as will do.
 std::optional<float> turnOf(const Ov::RnPhotoWebData& web, double degrees, auto matrixOf) {
-    for (double unit = 1; unit <= 1e5; unit *= 10) {
+    for (int unit = 1; unit <= 100'000; unit *= 10) {
         const auto turn = static_cast<float>(std::round(degrees * unit) / unit);
         if (isTurned(web, matrixOf(turn), 2e-7f)) return turn;
     }
