@@ -17,7 +17,8 @@
     message(webRefused,       12935, "") \
     message(outOfMemory,      12936, "") \
     message(fileNotRead,      12945, "s" )  /* detail */ \
-    message(textSetOff,       13082, "s" )  /* the text */
+    message(textSetOff,       13082, "s" )  /* the text */ \
+    message(webNotSaved,      13083, "s" )  /* name of the web */
 
 // Natural light, text form: the line that is missing or malformed. Put into 12896 as they stand.
 #define OVPHOTO_MESSAGES_NATURAL_LIGHT(message) \

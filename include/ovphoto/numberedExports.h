@@ -4,6 +4,7 @@
 
 #include "host/componentManager/enumerator.h"
 #include "host/componentManager/stream.h"
+#include "host/platform/module.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/module.h"
 #include "ovphoto/numberedExportList.h"
@@ -118,7 +119,7 @@ struct NumberedFunctions {
     /// web distribution's web goes where no fact says what the luminaire is. A text that would make an importer take
     /// the file for one of another format is written behind a blank, after a message.
     /// False, and nothing has been written, after messages to the host's reporter; a stream that fails raises
-    /// RnStreamEx.
+    /// RnStreamEx. NIMB and TBT in the form that is saved raise ExBadCast for a web distribution without a web.
     bool (*writeIes)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,
                      std::int32_t count);
     bool (*writeCibse)(Ov::RnIntensityDist& distribution, Ov::RnStream& out, FileForm form, const FileFact* facts,

@@ -82,6 +82,9 @@ struct PhotoFormatTraits {
     PhotoValueUnit unit = PhotoValueUnit::candela;
     /// Whether its files say what the lamps give off, be it any number of lumens.
     bool holdsLampLumens = false;
+    /// Whether its files say how the light is turned, so that its webs can be saved faithfully
+    /// (ovphoto/saveForm.h).
+    bool holdsOrientation = false;
 };
 
 /// What the builder of a format's webs answers.

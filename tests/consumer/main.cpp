@@ -2,6 +2,7 @@
 #include <host/componentManager/importer.h>
 #include <host/platform/path.h>
 #include <ovphoto/classIds.h>
+#include <ovphoto/numberedExports.h>
 #include <ovphoto/photoWebData.h>
 
 #include <cstdio>
@@ -10,7 +11,8 @@
 int main(int count, char** arguments) {
     if (count != 2) return 2;
     const auto manager = Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager());
-    manager->loadModule(Ov::fromUtf8(MODULE).c_str());
+    const auto functions = OvPhotometrics::numberedFunctions(manager->loadModule(Ov::fromUtf8(MODULE).c_str()));
+    if (functions.getTimeZoneCount() == 0) return 1;
     const auto object = manager->createObject(OvPhotometrics::classIds::importer);
     const auto importer = Ov::rnCast<Ov::RnImporter>(object.get());
     const auto imported = importer->import(Ov::fromUtf8(arguments[1]).c_str(), nullptr);

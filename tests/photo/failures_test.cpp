@@ -202,17 +202,20 @@ TEST_F(Failures, OfObjects) {
             const std::string bytes = saved(*other, form);
             const auto whole = Ov::rnCreate<Ov::RnMemoryBuffer>();
             Ov::RnStream(whole.get(), form) << other.get();
-            atEveryPlace("save", *object, [&] {
-                const auto io = spared([] { return Ov::rnCreate<FailingDevice>(); });
-                Ov::RnStream stream(io.get(), form);
-                try {
-                    stream << object.get();
-                } catch (...) {
-                    EXPECT_EQ(&stream.device(), io.get());
-                    throw;
-                }
-                return true;
-            });
+            for (const bool faithful : {true, false}) {
+                lidComponent().setFaithful(faithful);
+                atEveryPlace("save", *object, [&] {
+                    const auto io = spared([] { return Ov::rnCreate<FailingDevice>(); });
+                    Ov::RnStream stream(io.get(), form);
+                    try {
+                        stream << object.get();
+                    } catch (...) {
+                        EXPECT_EQ(&stream.device(), io.get());
+                        throw;
+                    }
+                    return true;
+                });
+            }
             atEveryPlace("read", *object, [&] {
                 Ov::RnPostLoadList list;
                 return !!Ov::RnStream(Ov::rnCreate<FailingDevice>(whole->bytes()).get(), form, &list)

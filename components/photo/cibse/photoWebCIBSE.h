@@ -11,7 +11,7 @@ struct CibseFormat {
     using Record = CibseRecord;
     static constexpr BuilderFacts facts{classIds::cibseWeb, photometricWebCategory, L"CIBSE Web",
                                         L"CIBSE Photometric Web"};
-    static constexpr Ov::PhotoFormatTraits traits{};
+    static constexpr Ov::PhotoFormatTraits traits{.holdsOrientation = true};
     static constexpr const wchar_t* extension = L"cib";
     static constexpr const char* source = "components/photo/cibse/cibse";
     static constexpr int saveLine = 218;

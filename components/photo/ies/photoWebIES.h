@@ -13,7 +13,7 @@ struct IesFormat {
     using Record = IesFileRecord;
     static constexpr BuilderFacts facts{classIds::iesWeb, photometricWebCategory, L"IES Web",
                                         L"IES Photometric Web"};
-    static constexpr Ov::PhotoFormatTraits traits{.holdsLampLumens = true};
+    static constexpr Ov::PhotoFormatTraits traits{.holdsLampLumens = true, .holdsOrientation = true};
     static constexpr const wchar_t* extension = L"ies";
     static constexpr const char* source = "components/photo/ies/ies";
     static constexpr int saveLine = 246;

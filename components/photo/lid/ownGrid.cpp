@@ -83,8 +83,12 @@ bool addRimBelow(Nodes& nodes, int beyond, double limit) {
     return added;
 }
 
-/// The turn of about so many degrees by which `matrixOf` gives the web's orientation, with as few decimals as will do.
+/// The turn of about so many degrees by which `matrixOf` gives the web's orientation: that of its file, else with
+/// as few decimals as will do.
 std::optional<float> turnOf(const Ov::RnPhotoWebData& web, double degrees, auto matrixOf) {
+    if (const auto* const own = dynamic_cast<const RnBasePhotoWebData*>(&web))
+        if (const float turn = own->getFileInfo().horizontalShift; isTurned(web, matrixOf(turn), 2e-7f))
+            return turn;
     for (int unit = 1; unit <= 100'000; unit *= 10) {
         const auto turn = static_cast<float>(std::round(degrees * unit) / unit);
         if (isTurned(web, matrixOf(turn), 2e-7f)) return turn;

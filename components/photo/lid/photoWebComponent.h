@@ -3,12 +3,14 @@
 #include <span>
 
 #include "components/messageFile/messageIds.h"
+#include "components/photo/lid/component.h"
 #include "components/photo/lid/fileFormat.h"
 #include "components/photo/lid/gridEvaluation.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/numberText.h"
 #include "components/photo/lid/photoWeb.h"
 #include "components/photo/lid/reportMessage.h"
+#include "components/photo/lid/savedWeb.h"
 #include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/webEvaluation.h"
 #include "host/componentManager/castImpl.h"
@@ -84,6 +86,27 @@ void loadWeb(typename Format::Record& record, Ov::RnStream& in, typename Format:
         throw Ov::RnStreamEx::ExReadError(Format::source, Format::loadLine, Format::streamName);
 }
 
+/// A record's text, to be read from its start; null after messages.
+template <class Format>
+RnRef<Ov::RnMemoryBuffer> textOfRecord(const typename Format::Record& record, FileForm form) {
+    auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
+    Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
+    if (!writeRecord<Format>(record, stream, form)) return {};
+    text->seek(0, 0);
+    return text;
+}
+
+/// The web that the format's reader makes of a file; null after messages.
+template <class Format>
+RnRef<typename Format::Web> webOfText(Ov::RnBufferedIO& text) {
+    Ov::RnStream stream(&text, Ov::RnStream::Form::text);
+    typename Format::Record record;
+    auto web = Ov::rnCreate<typename Format::Web>();
+    const bool well =
+        readRecord<Format>(record, stream, nullptr) && recordToWeb<Format>(record, *web, L"", nullptr);
+    return well ? web : RnRef<typename Format::Web>();
+}
+
 /// Base of a format's web class `Self`.
 template <class Self, class Format>
 class PhotoWebOf : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData,
@@ -104,7 +127,8 @@ private:
     const Self& self() const { return static_cast<const Self&>(*this); }
 };
 
-/// Saves a web as its format's text, and loads it from there, on any kind of stream.
+/// Saves a web as its format's text, faithfully where that is set (ovphoto/saveForm.h), and loads it from there, on any
+/// kind of stream.
 template <class Format>
 class PhotoWebPersistant final : public Ov::RnTempObject<typename Format::Web> {
 public:
@@ -112,16 +136,33 @@ public:
 
     void save(Ov::RnStream& out) override {
         const auto distribution = makeWebDistribution(this->data());
-        typename Format::Record record;
-        if (!Format::fromDistribution(*distribution, record) ||
-            !writeRecord<Format>(record, out, FileForm::asSaved))
+        const bool isFaithful = Format::traits.holdsOrientation && lidComponent().isFaithful();
+        Record record;
+        if (!(isFaithful ? takeFaithfully(*distribution, record)
+                         : Format::fromDistribution(*distribution, record)) ||
+            !writeRecord<Format>(record, out, isFaithful ? FileForm::faithful : FileForm::asSaved))
             throw Ov::RnStreamEx::ExWriteError(Format::source, Format::saveLine, Format::streamName);
     }
 
     bool load(Ov::RnStream& in, int, const wchar_t* name, const wchar_t* basePath) override {
-        typename Format::Record record;
+        Record record;
         loadWeb<Format>(record, in, this->data(), name, basePath);
         return true;
+    }
+
+private:
+    using Record = typename Format::Record;
+
+    /// False after a message, also where the light would not come back the same.
+    bool takeFaithfully(Ov::RnWebIntensityDist& distribution, Record& record) {
+        const auto& web = this->data();
+        distribution.setPeakIntensity(web.getMaxCandela());  // what its lumens give only if they are above 0
+        if (!Format::fromDistributionFaithfully(distribution, record)) return false;
+        const auto text = textOfRecord<Format>(record, FileForm::faithful);
+        const auto again = text ? webOfText<Format>(*text) : RnRef<typename Format::Web>();
+        if (again && keepsLight(web, *again)) return true;
+        reportMessage(messages::webNotSaved, web.getName());
+        return false;
     }
 };
 
@@ -179,10 +220,10 @@ public:
         Record record;
         if (isFaithful ? !takeFaithfully(dist, facts, record) : !Format::fromDistribution(dist, record))
             return false;
-        auto text = textOf(record, form);
+        auto text = textOfRecord<Format>(record, form);
         if (isFaithful && text && !isOwn(*text)) {
             setTextsOff(record, facts);
-            text = textOf(record, form);
+            text = textOfRecord<Format>(record, form);
         }
         if (!text || (isFaithful && !isReadBack(*text))) return false;
         writeText(text->bytes(), out);
@@ -204,15 +245,6 @@ private:
         facts.addEncoding();
     }
 
-    /// The file, to be read from its start; null after messages.
-    static RnRef<Ov::RnMemoryBuffer> textOf(const Record& record, FileForm form) {
-        auto text = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(text.get(), Ov::RnStream::Form::text);
-        if (!writeRecord<Format>(record, stream, form)) return {};
-        text->seek(0, 0);
-        return text;
-    }
-
     /// Whether an importer takes the text for a file of this format.
     bool isOwn(Ov::RnBufferedIO& text) { return recognise(text) == this; }
 
@@ -220,7 +252,7 @@ private:
     void setTextsOff(Record& record, const FileFacts& facts) {
         if constexpr (requires { Format::texts(record); }) {
             const auto isWell = [&] {
-                const auto text = textOf(record, FileForm::faithful);
+                const auto text = textOfRecord<Format>(record, FileForm::faithful);
                 return text && isOwn(*text);
             };
             std::vector<std::pair<std::wstring*, std::wstring>> changed;  // with what else stands there
@@ -238,13 +270,7 @@ private:
         }
     }
 
-    bool isReadBack(Ov::RnMemoryBuffer& text) {
-        if (!isOwn(text)) return false;
-        Ov::RnStream stream(&text, Ov::RnStream::Form::text);
-        Record again;
-        const auto web = Ov::rnCreate<typename Format::Web>();
-        return readRecord<Format>(again, stream, nullptr) && recordToWeb<Format>(again, *web, L"", nullptr);
-    }
+    bool isReadBack(Ov::RnMemoryBuffer& text) { return isOwn(text) && webOfText<Format>(text); }
 };
 
 }  // namespace OvPhotometrics

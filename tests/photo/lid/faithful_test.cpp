@@ -429,5 +429,127 @@ TEST_F(Faithful, NoTextMakesAFileLookLikeOneOfAnotherFormat) {
     }
 }
 
+/// Saves scenes, with the setting of the module as it is wanted.
+class SavedLight : public Photo {
+protected:
+    ~SavedLight() override { form->setFaithful(false); }
+
+    /// A distribution, saved as a whole object and loaded; null when saving is refused.
+    RnRef<Ov::RnWebIntensityDist> again(Ov::RnCastable& dist, Form streamForm) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        try {
+            Ov::RnStream(io.get(), streamForm) << &dist;
+        } catch (const Ov::RnStreamEx::ExWriteError&) {
+            return {};
+        }
+        io->seek(0, 0);
+        Ov::RnStream stream(io.get(), streamForm);
+        return Ov::rnQuery<Ov::RnWebIntensityDist>(stream.readObject(nullptr).get());
+    }
+
+    /// The largest difference of two lights over the sphere in the host frame, of the peak.
+    static double difference(const Ov::RnWebIntensityDist& a, const Ov::RnWebIntensityDist& b) {
+        double worst = 0;
+        for (double theta = 0; theta <= 180; theta += 0.9)
+            for (double psi = 0; psi < 360; psi += 4.7) {
+                const auto d = direction(theta, psi);
+                worst = std::max(worst, std::fabs(double(a.intensityAt(d)) - b.intensityAt(d)));
+            }
+        return worst > 0 ? worst / a.getPeakIntensity() : 0;
+    }
+
+    static std::vector<double> anglesOf(const Ov::RnPhotoWebData& web) {
+        std::vector<double> angles;
+        for (int i = 0; i < web.getThetaCount(); ++i) angles.push_back(web.getTheta(i));
+        for (int j = 0; j < web.getPsiCount(); ++j) angles.push_back(web.getPsi(j));
+        return angles;
+    }
+
+    RnRef<Ov::RnWebSaveForm> form =
+        Ov::rnQuery<Ov::RnWebSaveForm>(static_cast<Ov::RnComponentRegistry*>(&lidComponent()));
+};
+
+TEST_F(SavedLight, AFaithfulSceneGivesTheSameLightWhenItIsLoaded) {
+    const std::vector<double> up{0, 22.5, 45.13, 61.876543, 90};
+    const std::vector<double> across{-90, -22.37, 0, 12.3456789, 90};
+    const auto ies = [&](const IesText& text) -> RnRef<Ov::RnPhotoWebData> { return import(text.text()); };
+    const auto cibse = [&](int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
+        return RnRef<Ov::RnPhotoWebData>(import <CibseFormat>(cibseText(type, vertical, horizontal)));
+    };
+    const struct {
+        const char* what;
+        RnRef<Ov::RnPhotoWebData> web;
+        bool lostAsSaved = false;  // what the form loses that is the default: a tenth of the peak, or little
+    } cases[] = {
+        {"one plane", ies({.vertical = up, .values = "1000.3 500.2 7 1 0"})},
+        {"a quarter", ies({.vertical = up, .horizontal = {0, 45, 90}})},
+        {"a wall-washer", ies({.vertical = up, .horizontal = {90, 180, 270}}), true},
+        {"planes to 210", ies({.vertical = up, .horizontal = {0, 90, 210}})},
+        {"type A",
+         ies({.type = 3, .vertical = across, .horizontal = {-23.4642376, 13, 26.395, 48.9110269, 87.8973593}}),
+         true},
+        {"type A, one side", ies({.type = 3, .vertical = {-90, 0, 30}, .horizontal = {0, 60}})},
+        {"type B", ies({.type = 2, .vertical = across, .horizontal = {-45.678901, 0, 77.7}}), true},
+        {"type B, one side", ies({.type = 2, .vertical = across, .horizontal = {0, 45, 90}}), true},
+        {"no lumens", ies({.lumens = -1, .vertical = up})},
+        {"weak", ies({.lumens = 0.003, .vertical = up, .values = "0.02 0.0123 0.004 0.001 0"})},
+        {"a flux below 0", ies({.lumens = -1, .vertical = up, .values = "10 -30 -30 -30 -30"})},
+        {"dark", ies({.vertical = up, .values = "0 0 0 -1 0"})},
+        {"type 1", cibse(1, up, {0, 45, 90})},
+        {"type 1 from 90", cibse(1, up, {90, 180, 270}), true},
+        {"type 1 from 270", cibse(1, up, {270, 0, 90}), true},
+        {"type 1 once around", cibse(1, {0, 45, 180}, {270, 0, 90, 180, 270}), true},
+        {"type 2", cibse(2, across, {-30.3, 0, 60.5}), true},
+        {"type 2, one side", cibse(2, {-90, 0, 90}, {0, 45, 90}), true},
+    };
+    for (const auto& [what, web, lostAsSaved] : cases) {
+        SCOPED_TRACE(what);
+        ASSERT_TRUE(web) << log.take();
+        const float peak = web->getMaxCandela();
+        for (const float factor : {1.0f, 0.31f})
+            for (const Form streamForm : {Form::text, Form::binary}) {
+                const auto dist = distributionOf(*web);
+                factor == 1 ? dist->setPeakIntensity(peak) : dist->setFlux(factor * web->getLumens());
+                form->setFaithful(true);
+                const auto loaded = again(*dist, streamForm);
+                ASSERT_TRUE(loaded) << log.take();
+                EXPECT_LT(difference(*dist, *loaded), 1e-5);
+                EXPECT_LT(difference(*dist, *again(*loaded, streamForm)), 1e-5) << "saved twice";
+                EXPECT_NEAR(loaded->getFlux(), dist->getFlux(), 1e-5 * std::fabs(dist->getFlux()));
+                const auto loadedWeb = webOf(*loaded);
+                EXPECT_NEAR(loadedWeb->getMaxCandela(), peak, 1e-5 * peak);
+                EXPECT_NEAR(loadedWeb->getLumens(), web->getLumens(), 1e-5 * std::fabs(web->getLumens()));
+                EXPECT_EQ(anglesOf(*loadedWeb), anglesOf(*web));
+                form->setFaithful(false);
+                EXPECT_EQ(difference(*dist, *again(*dist, streamForm)) > 0.1, lostAsSaved);
+            }
+    }
+    EXPECT_EQ(log.take(), "");
+}
+
+TEST_F(SavedLight, WhatAFormatCannotHoldIsToldAndOtherFormatsAreSavedAsTheyAre) {
+    // The reader takes 90.2 for being close to 90.
+    const auto beyond =
+        import(IesText{.type = 3, .vertical = {-90, 90}, .horizontal = {-90, 0, 90.2}}.text(), L"x");
+    const auto nimb = import <NimbFormat>("   1   0  90  90  45  90   0   0   0NIMB\n\n\n\n\n 100  90  10\n");
+    const auto tbt = import <TbtFormat>(tbtCircle(5, 5));
+    ASSERT_TRUE(beyond && nimb && tbt) << log.take();
+    const auto bytes = [](Ov::RnCastable& object) {
+        return std::pair(saved(object), saved(object, Form::binary));
+    };
+    const auto before = bytes(*beyond);
+    const auto nimbBefore = bytes(*nimb);
+    const auto tbtBefore = bytes(*tbt);
+    EXPECT_FALSE(form->isFaithful());
+    form->setFaithful(true);
+    EXPECT_TRUE(form->isFaithful());
+    EXPECT_THROW(saved(*beyond), Ov::RnStreamEx::ExWriteError);
+    EXPECT_EQ(log.take(), "13083 x");
+    EXPECT_EQ(bytes(*nimb), nimbBefore);
+    EXPECT_EQ(bytes(*tbt), tbtBefore);
+    form->setFaithful(false);
+    EXPECT_EQ(bytes(*beyond), before);
+}
+
 }  // namespace
 }  // namespace OvPhotometrics
