@@ -149,7 +149,7 @@ bool takeOwnGrid(const Ov::RnPhotoWebData& web, NimbRecord& rec) {
 }
 
 SamplingPlan planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
-    const SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
+    SamplingPlan plan = planSampling(dist, {.wholeDegrees = true, .fromPole = true});
     rec.orientationAngle = 90;
     rec.thetaStep = static_cast<std::int32_t>(plan.thetaStep);
     rec.thetaMax = static_cast<std::int32_t>(plan.lastTheta);
