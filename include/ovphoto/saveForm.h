@@ -4,10 +4,10 @@
 
 namespace Ov {
 
-/// How the module's webs save themselves into a host's streams, inside a distribution or alone. Its registry, which
-/// the entry point answers, has it:
+/// How the module's webs save themselves into a host's streams, inside a distribution or alone. The builder of its
+/// web distributions has it:
 ///
-///     rnQuery<RnWebSaveForm>(&manager->loadModule(path).registry())->setFaithful(true);
+///     rnCast<RnWebSaveForm>(manager->findBuilder(classIds::webDistribution).get())->setFaithful(true);
 ///
 /// Without it (as it is when the module is loaded) webs of IES and CIBSE are saved with two decimals and without their
 /// orientation and peak. With it, those of every format that has PhotoFormatTraits::holdsOrientation keep all angles and

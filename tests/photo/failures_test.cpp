@@ -203,7 +203,7 @@ TEST_F(Failures, OfObjects) {
             const auto whole = Ov::rnCreate<Ov::RnMemoryBuffer>();
             Ov::RnStream(whole.get(), form) << other.get();
             for (const bool faithful : {true, false}) {
-                lidComponent().setFaithful(faithful);
+                saveWebsFaithfully(faithful);
                 atEveryPlace("save", *object, [&] {
                     const auto io = spared([] { return Ov::rnCreate<FailingDevice>(); });
                     Ov::RnStream stream(io.get(), form);

@@ -4,9 +4,11 @@
 #include "components/photo/distributions/singlePrecision.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/savedWeb.h"
 #include "host/componentManager/castImpl.h"
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensityDist.h"
+#include "ovphoto/saveForm.h"
 
 namespace OvPhotometrics {
 
@@ -82,6 +84,13 @@ private:
     bool _identityOrientation = false;
 };
 
-using WebBuilder = ObjectBuilder<Web>;
+/// Builds web distributions, and has the setting of how the module's webs are saved.
+class WebBuilder final
+    : public FactsBuilder<
+          Web, Ov::RnCastImpl2<LidBuilder, Ov::RnWebSaveForm, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
+public:
+    bool isFaithful() const override { return websAreSavedFaithfully(); }
+    void setFaithful(bool faithful) override { saveWebsFaithfully(faithful); }
+};
 
 }  // namespace OvPhotometrics

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <array>
-#include <atomic>
 #include <cstddef>
 #include <memory_resource>
 #include <unordered_map>
@@ -9,7 +8,6 @@
 #include "host/base/immortal.h"
 #include "host/componentManager/builder.h"
 #include "host/componentManager/castImpl.h"
-#include "ovphoto/saveForm.h"
 
 namespace OvPhotometrics {
 
@@ -42,10 +40,8 @@ private:
 /// Made on first use.
 BuilderTable& builderTable();
 
-/// The registry that the module's entry point answers; all it says comes from the builder table. It keeps the module's
-/// settings, too.
-class LidComponent final
-    : public Ov::RnCastImpl2<Ov::RnComponentRegistry, Ov::RnWebSaveForm, Ov::RnComponentRegistry> {
+/// The registry that the module's entry point answers; all it says comes from the builder table.
+class LidComponent final : public Ov::RnCastImpl<Ov::RnComponentRegistry, Ov::RnComponentRegistry> {
 public:
     LidComponent() { builderTable(); }
 
@@ -55,11 +51,6 @@ public:
     const wchar_t* getVendor() const override;
     std::uint32_t getBuilderCount() const override;
     Ov::RnEnum::Action enumerateBuilders(Ov::RnEnumerator<Ov::RnPtr<Ov::RnComponentBuilder>>& visitor) override;
-    bool isFaithful() const override { return _faithful; }
-    void setFaithful(bool faithful) override { _faithful = faithful; }
-
-private:
-    std::atomic<bool> _faithful = false;
 };
 
 LidComponent& lidComponent();

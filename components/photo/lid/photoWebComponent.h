@@ -3,7 +3,6 @@
 #include <span>
 
 #include "components/messageFile/messageIds.h"
-#include "components/photo/lid/component.h"
 #include "components/photo/lid/fileFormat.h"
 #include "components/photo/lid/gridEvaluation.h"
 #include "components/photo/lid/lidBuilder.h"
@@ -136,7 +135,7 @@ public:
 
     void save(Ov::RnStream& out) override {
         const auto distribution = makeWebDistribution(this->data());
-        const bool isFaithful = Format::traits.holdsOrientation && lidComponent().isFaithful();
+        const bool isFaithful = Format::traits.holdsOrientation && websAreSavedFaithfully();
         Record record;
         if (!(isFaithful ? takeFaithfully(*distribution, record)
                          : Format::fromDistribution(*distribution, record)) ||

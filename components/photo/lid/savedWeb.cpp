@@ -1,11 +1,14 @@
 #include "components/photo/lid/savedWeb.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cmath>
 
 namespace OvPhotometrics {
 
 namespace {
+
+std::atomic<bool> isFaithful = false;
 
 constexpr double tolerance = 1e-5;
 constexpr double valueTolerance = 6e-6;  // of the peak: between samples, cubics make up to 1.5625 of it
@@ -33,6 +36,10 @@ bool sameValues(const WebGrid& a, const WebGrid& b) {
 }
 
 }  // namespace
+
+bool websAreSavedFaithfully() { return isFaithful; }
+
+void saveWebsFaithfully(bool faithful) { isFaithful = faithful; }
 
 bool keepsLight(const RnBasePhotoWebData& web, const RnBasePhotoWebData& again) {
     const double peak = web.getMaxCandela();

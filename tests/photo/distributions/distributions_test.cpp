@@ -180,7 +180,7 @@ TEST_F(Distributions, AWebGivesItsCandelas) {
     EXPECT_EQ(light->getFlux() + light->intensity(1, 1), 0);
     EXPECT_EQ(light->getSymmetry(), PhotoWebSymmetry::Axial);
     EXPECT_EQ(light->getPsiRange().last, 0);
-    light->setWeb(&immortal<WebBuilder>());  // no web
+    light->setWeb(&immortal<IsotropicBuilder>());  // no web
     EXPECT_EQ(light->getWeb(), nullptr);
 }
 

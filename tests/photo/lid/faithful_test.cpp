@@ -5,6 +5,7 @@
 #include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
 #include "components/photo/distributions/spotlight.h"
+#include "components/photo/distributions/web.h"
 #include "components/photo/nimb/photoWebNIMB.h"
 #include "components/photo/tbt/photoWebTBT.h"
 #include "tests/photo/photoFixture.h"
@@ -466,7 +467,7 @@ protected:
     }
 
     RnRef<Ov::RnWebSaveForm> form =
-        Ov::rnQuery<Ov::RnWebSaveForm>(static_cast<Ov::RnComponentRegistry*>(&lidComponent()));
+        Ov::rnQuery<Ov::RnWebSaveForm>(static_cast<Ov::RnComponentBuilder*>(&immortal<WebBuilder>()));
 };
 
 TEST_F(SavedLight, AFaithfulSceneGivesTheSameLightWhenItIsLoaded) {
