@@ -104,12 +104,21 @@ bool areAngles(int count, auto angleAt, auto expected) {
     return true;
 }
 
+/// Whether values bend the light between angles that no number of the format can: those have no sign.
+bool hasNegatives(const Ov::RnPhotoWebData& web) {
+    for (int j = 0; j < web.getPsiCount(); ++j)
+        for (int i = 0; i < web.getThetaCount(); ++i)
+            if (web.getCandela(j, i) < 0) return true;
+    return false;
+}
+
 /// The counts of a web's own grid. False when the format cannot hold that.
 bool takeOwnGrid(const Ov::RnPhotoWebData& web, TbtFileRecord& rec) {
     const int vertical = web.getThetaCount();
     const int horizontal = web.getPsiCount();
     const float range = rangeOf(web.getSymmetry());
     if (web.isPsiTruncated() || !web.hasIdentityOrientation() || vertical < 2) return false;
+    if (std::int64_t{vertical} * horizontal > tbtMostValues || hasNegatives(web)) return false;
     if (!areAngles(
             vertical, [&](int v) { return web.getTheta(v); }, [&](int v) { return verticalAngle(v, vertical); }) ||
         !areAngles(
@@ -128,7 +137,7 @@ void fillFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     if (web && takeOwnGrid(*web, rec)) {
         for (int h = 0; h < rec.horizontalCount; ++h)
             for (int v = 0; v < rec.verticalCount; ++v)
-                rec.values.push_back(dist.getPeakIntensity() * std::max(web->getCandela(h, v), 0.0f));
+                rec.values.push_back(dist.getPeakIntensity() * web->getCandela(h, v));
         return;
     }
     const SamplingPlan plan = planSampling(dist, {.wholeSphere = true, .planeKept = true});

@@ -13,7 +13,8 @@ namespace {
 /// Rounds to two decimals, or as many as give six digits: those of another file are found again behind single
 /// precision.
 float roundedToSixDigits(float value) {
-    if (!(value > 0) || !std::isfinite(value)) return value;
+    if (!(value > 0)) return 0;  // a negative zero would have a sign
+    if (!std::isfinite(value)) return value;
     const double parts = std::pow(10, std::max(2.0, 5 - std::floor(std::log10(double{value}))));
     return static_cast<float>(std::round(value * parts) / parts);
 }

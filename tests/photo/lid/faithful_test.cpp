@@ -151,6 +151,7 @@ TEST_F(Faithful, EveryFormatGivesTheSameLight) {
         {.lumens = 800, .vertical = down, .horizontal = {0, 45, 90}},
         {.lumens = -1, .vertical = down, .horizontal = {90, 180, 270}},
         {.lumens = 3000, .vertical = {90, 120, 180}, .horizontal = {0, 120, 240}},
+        {.lumens = 90, .vertical = {0, 45, 90, 135, 180}, .horizontal = {0}, .values = "60 90 -30 -30 20"},
         {.type = 3, .lumens = 500, .vertical = {-40, 0, 40}, .horizontal = {0, 30, 60}},
         {.type = 2,
          .lumens = 500,
@@ -301,6 +302,8 @@ TEST_F(Faithful, NothingIsWrittenThatItsReaderRefuses) {
     EXPECT_TRUE(import <CibseFormat>(written<CibseFormat>(*light, facts)));
     EXPECT_TRUE(import <NimbFormat>(written<NimbFormat>(*light, facts)));
     EXPECT_TRUE(import <TbtFormat>(written<TbtFormat>(*light, facts)));
+    const auto zeros = distributionOf(*import(IesText{.values = "5 -0 -0"}.text()));
+    EXPECT_TRUE(import <TbtFormat>(written<TbtFormat>(*zeros)));
     EXPECT_EQ(log.take(), "");
 }
 
