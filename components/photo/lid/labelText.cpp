@@ -15,8 +15,8 @@ constexpr wchar_t windows1252[] = {0x20ac, 0x81,   0x201a, 0x0192, 0x201e, 0x202
                                    0x90,   0x2018, 0x2019, 0x201c, 0x201d, 0x2022, 0x2013, 0x2014,
                                    0x02dc, 0x2122, 0x0161, 0x203a, 0x0153, 0x9d,   0x017e, 0x0178};
 
-bool isAscii(wchar_t c) { return c >= 0 && c < 0x80; }
-bool isByte(wchar_t c) { return c >= 0 && c <= 0xff; }
+bool isAscii(wchar_t c) { return static_cast<char32_t>(c) < 0x80; }
+bool isByte(wchar_t c) { return static_cast<char32_t>(c) <= 0xff; }
 bool isFirstHalf(wchar_t c) { return c >= 0xd800 && c < 0xdc00; }
 bool isSecondHalf(wchar_t c) { return c >= 0xdc00 && c < 0xe000; }
 
