@@ -56,7 +56,7 @@ TEST_F(ToolUsage, WrongArgumentsAreToldAndGiveStatus2) {
     expectStatus(1,
                  {"info good.ies --max-size 50|good.ies: is larger than 50 bytes", "check . --max-size 50|larger",
                   "convert good.ies --into o --to tbt --jobs 2 --max-size 50|larger",
-                  "plot good.ies -o a.svg --max-size 0|larger", "sun --from good.ies --max-size 9|larger"});
+                  "convert good.ies out.ies --max-size 0|larger", "sun --from good.ies --max-size 9|larger"});
     expectStatus(2, {"--max-size 9T formats|'9T'", "--max-size 99999999999G formats|--max-size",
                      "--max-size -1 formats|-1", "--max-size '' formats|--max-size"});
     EXPECT_EQ(runShell("yes | ovphoto info - --max-size 1M", folder).err,
@@ -97,7 +97,10 @@ TEST_F(ToolUsage, OutputThatCannotBeWrittenIsToldAndGivesStatus1) {
          {"yes 0,0 | { ovphoto intensity good.ies", "{ ovphoto check $(yes good.ies | head -n 999)",
           "{ ovphoto info $(yes good.ies | head -n 999)"}) {
         const ToolResult closed = runShell("{ " + many + "; echo status $? >&2; } | head -n 1; }", folder);
-        EXPECT_EQ(closed.err, "status 1\n") << many;
+        // Wine tells programs nothing of a closed pipe.
+        if (!windowsTool()) {
+            EXPECT_EQ(closed.err, "status 1\n") << many;
+        }
         EXPECT_NE(closed.out, "") << many;
     }
     EXPECT_EQ(runShell("ovphoto intensity good.ies <&-", folder).status, 1);
