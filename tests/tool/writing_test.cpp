@@ -71,8 +71,9 @@ TEST_F(ToolConvert, AFailureLeavesWhatWasThere) {
         EXPECT_TRUE(result.says(row.told)) << row.arguments << result.err;
     }
     // No room to write, which Wine does not survive itself.
-    if (!windowsTool())
+    if (!windowsTool()) {
         EXPECT_EQ(runShell("(ulimit -f 0; ovphoto convert in.ies old.ies 2>/dev/null)", folder).status, 1);
+    }
     EXPECT_EQ(bytes("old.ies") + bytes("locked.ies"), "oldold");
     EXPECT_EQ(fileCount(), before);
 }
