@@ -64,19 +64,21 @@ protected:
 /// What stands in a file's grid.
 template <class Record>
 std::string gridOf(const Record& rec) {
-    std::ostringstream text;
-    text << static_cast<int>(rec.photometricType) << ": ";
-    for (const float angle : rec.grid.verticalAngles) text << angle << ' ';
-    text << "| ";
-    for (const float angle : rec.grid.horizontalAngles) text << angle << ' ';
-    return text.str();
+    const auto list = [](const std::vector<float>& angles) {
+        std::string text;
+        for (const float angle : angles) text += Ov::toUtf8(numbersText({angle}, FileForm::faithful)) + " ";
+        return text;
+    };
+    return std::to_string(static_cast<int>(rec.photometricType)) + ": " + list(rec.grid.verticalAngles) + "| " +
+           list(rec.grid.horizontalAngles);
 }
 
-std::string cibseText(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
+std::string cibseText(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal,
+                      const std::string& values = "") {
     std::string text = "CIBSE/1\n\n\n\n\n\n\n\n1 " + std::to_string(type) + " 0 0 0 2 0 0 0 " +
                        joined({double(vertical.size()), double(horizontal.size())}) + joined(vertical) +
-                       joined(horizontal);
-    for (std::size_t k = 0; k < vertical.size() * horizontal.size(); ++k)
+                       joined(horizontal) + values;
+    for (std::size_t k = 0; values.empty() && k < vertical.size() * horizontal.size(); ++k)
         text += std::to_string(100 + 7 * k) + " ";
     return text + "99 0 0 0";
 }
@@ -103,20 +105,19 @@ TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
         {{.vertical = {0, 45, 90.1}, .horizontal = {0}},
          "1: 0 45 90.1 | 0 ",
          "1: 0 45 90.1 90.101 90.102 90.103 180 | 0 "},
-        {{.vertical = {0, 2.8125, 90}, .horizontal = {0}}, "1: 0 2.8125 90 | 0 ", "1: 0 2.8125 90 | 0 "},
-        {{.vertical = {0, 1.0 / 3, 90}, .horizontal = {0, 120.0625, 200}},
-         "1: 0 0.333333 90 | 0 120.062 200 360 ",
-         "1: 0 0.333333 90 | 0 120.062 200 360 "},
+        {{.vertical = {0, 1.0 / 3, 2.8125, 13.137, 45.3123, 63.62571, 90}, .horizontal = {0, 120.0625, 200.717}},
+         "1: 0 0.33333334 2.8125 13.137 45.3123 63.62571 90 | 0 120.0625 200.717 360 ",
+         "1: 0 0.33333334 2.8125 13.137 45.3123 63.62571 90 | 0 120.0625 200.717 360 "},
         {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {0, 60}},
          "3: -90 0 30 | 0 60 ",
          "1: 0 90 120 120.001 120.002 120.003 180 | 0 60 60.001 60.002 60.003 180 "},
-        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {-20, 0, 60}},
-         "3: -90 0 30 | -20 0 60 ",
-         "1: 0 90 120 120.001 120.002 120.003 180 | 270 339.997 339.998 339.999 340 0 60 60.001 60.002 60.003 "
+        {{.type = 3, .vertical = {-90, 0, 30}, .horizontal = {-20.317, 0, 60}},
+         "3: -90 0 30 | -20.317 0 60 ",
+         "1: 0 90 120 120.001 120.002 120.003 180 | 270 339.68 339.681 339.682 339.683 0 60 60.001 60.002 60.003 "
          "270 "},
-        {{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-45.0625, 0, 90}},
-         "2: -90 0 90 | -45.0625 0 90 ",
-         "2: -90 0 90 | -90 -45.0655 -45.0645 -45.0635 -45.0625 0 89.997 89.998 89.999 90 "},
+        {{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-45.137, 7.723, 90}},
+         "2: -90 0 90 | -45.137 7.723 90 ",
+         "2: -90 0 90 | -90 -45.14 -45.139 -45.138 -45.137 7.723 89.997 89.998 89.999 90 "},
     };
     for (const auto& c : cases) {
         const auto web = import(c.source.text());
@@ -127,7 +128,7 @@ TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
     const struct {
         int type;
         std::vector<double> vertical, horizontal;
-        std::string grid, ies;
+        std::string grid, ies, values = {};
     } cibseCases[] = {
         // Planes from 270 are none of IES: sampled, the vertical angles kept.
         {1, {0, 40, 90}, {270, 300, 0, 90}, "1: 0 40 90 | 270 300 0 90 ", "1: 0 40 90 | 0 "},
@@ -135,9 +136,10 @@ TEST_F(Faithful, GridsThatAFormatHoldsAreCopiedAndOthersSampled) {
         {1, {0, 40, 90}, {270, 0, 100}, "1: 0 40 90 | 270 0 100 270 ", "1: 0 40 90 | 0 "},
         {2, {-90, 0, 90}, {0, 45, 90}, "2: -90 0 90 | 0 45 90 ", "1: 0 90 180 | 0 1 "},
         {2, {-90, 0, 90}, {-30, 0, 60.5}, "2: -90 0 90 | -30 0 60.5 ", "1: 0 1 2 "},
+        {2, {-90, 90}, {-30, 0, 60}, "2: -90 90 | -30 0 60 ", "2: -90 90 | -30 0 60 ", "0 0 7 9 0 0 "},
     };
     for (const auto& c : cibseCases) {
-        const auto web = import <CibseFormat>(cibseText(c.type, c.vertical, c.horizontal));
+        const auto web = import <CibseFormat>(cibseText(c.type, c.vertical, c.horizontal, c.values));
         ASSERT_TRUE(web) << c.grid << log.take();
         EXPECT_EQ(copied<CibseFormat>(*web), c.grid);
         EXPECT_TRUE(copied<IesFormat>(*web).starts_with(c.ies)) << copied<IesFormat>(*web);
@@ -185,6 +187,9 @@ TEST_F(Faithful, LightIsKeptBetweenTheAnglesAndUpToTheRim) {
     const std::vector<double> fine{0, .125, .25, .375, .5, .625, .75, .875, 1, 1.125, 1.25, 45, 90};
     const std::string beam = "1000 960 850 690 520 360 230 130 70 30 9 2 1 ";
     const std::vector<double> lateral{-30, -10, 10, 30};
+    const std::string darkCircle =
+        "t\n3\n1 1 1\n1000 1000 1 1 5 0\n4 5 5 50 90 80 30 20 50 0 0 0 20 50 0 60 0 20 50 0 0 40 20 50 90 80 30 "
+        "20 -1";
     const std::vector<double> odd{-30.0625, -9.7, 1.0 / 3, 30};
     const struct {
         const char* name;
@@ -201,6 +206,7 @@ TEST_F(Faithful, LightIsKeptBetweenTheAnglesAndUpToTheRim) {
         {"B", import(IesText{.type = 2, .vertical = lateral, .horizontal = {-45, 0, 45}}.text())},
         {"B, odd", import(IesText{.type = 2, .vertical = odd, .horizontal = odd}.text())},
         {"B, hemisphere", import(IesText{.type = 2, .vertical = lateral, .horizontal = {-90, 0, 90}}.text())},
+        {"circle, dark in places", import <TbtFormat>(darkCircle)},
         {"from 270", import <CibseFormat>(cibseText(1, {0, 40, 90}, {270, 320, 0, 40, 100}))},
     };
     for (const auto& [name, web] : sources) {
@@ -258,6 +264,8 @@ TEST_F(Faithful, NumbersAreTheShortestThatReadBackAndTheFluxIsTheirs) {
     EXPECT_NE(ies.find(" 0.1\n"), std::string::npos) << ies;
     EXPECT_NE(ies.find("\n0 0 -0.094\n1 1 1234567\n"), std::string::npos) << ies;
     EXPECT_NE(ies.find("\n 2505 2505"), std::string::npos) << ies;
+    light->setPeakIntensity(0.12345678f);
+    EXPECT_NE(written<IesFormat>(*light).find("\n 12345.68"), std::string::npos);
 }
 
 TEST_F(Faithful, FormulasBecomeFiles) {
@@ -302,7 +310,7 @@ TEST_F(Faithful, NothingIsWrittenThatItsReaderRefuses) {
     EXPECT_TRUE(import <CibseFormat>(written<CibseFormat>(*light, facts)));
     EXPECT_TRUE(import <NimbFormat>(written<NimbFormat>(*light, facts)));
     EXPECT_TRUE(import <TbtFormat>(written<TbtFormat>(*light, facts)));
-    const auto zeros = distributionOf(*import(IesText{.values = "5 -0 -0"}.text()));
+    const auto zeros = distributionOf(*import(IesText{.values = "5 -0 7"}.text()));
     EXPECT_TRUE(import <TbtFormat>(written<TbtFormat>(*zeros)));
     EXPECT_EQ(log.take(), "");
 }
