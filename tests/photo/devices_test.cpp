@@ -29,6 +29,8 @@ struct DeviceKind {
     Device (*make)(std::string_view bytes);
 };
 
+void PrintTo(const DeviceKind& kind, std::ostream* out) { *out << kind.name; }
+
 Device memory(std::string_view bytes) { return Ov::rnCreate<Ov::RnMemoryBuffer>(bytes); }
 
 class Devices : public Photo, public testing::WithParamInterface<DeviceKind> {

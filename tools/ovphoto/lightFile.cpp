@@ -65,10 +65,8 @@ std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFo
                            shortNumber(loss.candelaPercent) + " % of the peak");
     }
     if (loss.rimCandela > 0) {
-        warnings.push_back(
-            "at the rim of its range the light falls off within some steps: there the candela differ by up "
-            "to " +
-            shortNumber(loss.rimCandela) + " cd");
+        const std::string apart = shortNumber(loss.rimCandela) + " cd";
+        warnings.push_back("at the rim of its range, where it falls off, the light differs by up to " + apart);
     }
     if (std::abs(loss.fluxPercent) > tolerated)
         warnings.push_back("the flux of the luminaire differs by " + shortNumber(loss.fluxPercent) + " %");

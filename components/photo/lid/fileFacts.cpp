@@ -109,8 +109,6 @@ std::vector<std::wstring> FileFacts::textLines() const {
     return lines;
 }
 
-bool isBareKeyword(std::wstring_view line) {
-    return line.starts_with(L'[') && !line.empty() && line.find(L']') == line.size() - 1;
-}
+bool isBareKeyword(std::wstring_view line) { return line.starts_with(L'[') && line.find(L']') == line.size() - 1; }
 
 }  // namespace OvPhotometrics
