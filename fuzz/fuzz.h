@@ -18,9 +18,9 @@ void demand(bool kept, const char* promise);
 /// The number of messages reported since the last call.
 int takeMessages();
 
-/// Whether the slow part `part` is tried with this input: by the engine with one input in 128, by the replay with
-/// all.
-bool isDue(std::string_view input, std::size_t part);
+/// Whether the slow part `part` is tried with this input, which gives a grid of so many values: by the engine with one
+/// input in 128 whose grid does not take it seconds, by the replay with all.
+bool isDue(std::string_view input, std::size_t part, std::size_t values);
 
 /// Does `work`, which reads `size` bytes. The replay holds it to the bounds of memory and time.
 void measured(std::size_t size, const std::function<void()>& work);

@@ -61,7 +61,7 @@ void replay(const fs::path& path) {
 
 #include "tests/support/replacedHeap.h"
 
-bool OvPhotometrics::fuzz::isDue(std::string_view, std::size_t) { return true; }
+bool OvPhotometrics::fuzz::isDue(std::string_view, std::size_t, std::size_t) { return true; }
 
 void OvPhotometrics::fuzz::measured(std::size_t size, const std::function<void()>& work) {
     const std::size_t before = mostHeld = held;

@@ -173,10 +173,12 @@ void tryFile(std::string_view bytes) {
         demand(builder.readFacts(*io, nullptr, all), "what is read has facts");
         return all;
     };
-    if (isDue(bytes, 0)) demandWritten<IesFormat>(*web, facts());
-    if (isDue(bytes, 1)) demandWritten<CibseFormat>(*web, facts());
-    if (isDue(bytes, 2)) demandWritten<NimbFormat>(*web, facts());
-    if (isDue(bytes, 3)) demandWritten<TbtFormat>(*web, facts());
+    const auto values =
+        static_cast<std::size_t>(web->getThetaCount()) * static_cast<std::size_t>(web->getPsiCount());
+    if (isDue(bytes, 0, values)) demandWritten<IesFormat>(*web, facts());
+    if (isDue(bytes, 1, values)) demandWritten<CibseFormat>(*web, facts());
+    if (isDue(bytes, 2, values)) demandWritten<NimbFormat>(*web, facts());
+    if (isDue(bytes, 3, values)) demandWritten<TbtFormat>(*web, facts());
 }
 
 }  // namespace OvPhotometrics::fuzz
