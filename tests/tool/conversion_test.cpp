@@ -33,7 +33,11 @@ TEST_F(ToolConversion, EveryFormatHoldsTheLightAndGivesItBackInCandela) {
         const char* target;
         double tolerance;
         const char* unit;
-    } cases[] = {{"ies", 1e-3, "cd"}, {"cib", 1e-3, "cd"}, {"nmb", 0.51, "cd"}, {"tbt", 0.011, "cd/klm"}};
+        double lamps;  // lumens that it gives an IES file, the luminaire's where it knows of no lamps
+    } cases[] = {{"ies", 1e-3, "cd", 2000},
+                 {"cib", 1e-3, "cd", 457.3},
+                 {"nmb", 0.51, "cd", 1000},
+                 {"tbt", 0.011, "cd/klm", 2000}};
     for (const auto& c : cases) {
         const std::string file = std::string("out.") + c.target;
         const Json there = convert("in.ies " + file);
@@ -44,6 +48,7 @@ TEST_F(ToolConversion, EveryFormatHoldsTheLightAndGivesItBackInCandela) {
         EXPECT_NEAR(found["maxCandela"].get<double>(), 201, c.tolerance);
         EXPECT_NEAR(found["luminaireLumens"].get<double>(), 457.3, 1) << file;
         convert(file + " back.IES");  // the extension in any letter case
+        EXPECT_NEAR(info("back.IES")["lampLumens"].get<double>(), c.lamps, 1) << file;
         for (const std::string& light : {file, std::string("back.IES")}) {
             const auto candela = runTool("intensity --json " + light + " 0,0 45,0 90,0", folder).json();
             for (const auto& [k, expected] : {std::pair{0U, 201.0}, {1, 100.0}, {2, 0.0}})
@@ -71,7 +76,7 @@ TEST_F(ToolConversion, FilesOfOneFormatKeepEveryValue) {
     folder.write("in.tbt",  // for 328 lm and a reference of 500, in a circle of 4 steps
                  "title\n3\n1 1 1\n328 500 1 1 5 0\n4 3 5\n1.25 20 3\n1.25 7 0.5\n1.25 31.75 3\n1.25 7 1\n"
                  "1.25 20 3\n-1\n");
-    folder.write("none.tbt", "title\n3\n1 1 1\n0 1000 1 1 5 0\n1 3 1\n60 50.25 0\n-1\n");
+    folder.write("none.tbt", "title\n3\n1 1 1\n0 1000 1 1 5 0\n1 6 1\n60 50.25 48 30 9 0\n-1\n");
     convert("in.nmb out.nmb");
     EXPECT_EQ(readBytes(folder.path() / "out.nmb"), nimb);
     for (const std::string name : {"in", "none"}) {

@@ -27,20 +27,12 @@ void tell(const char* text) noexcept {
     for (const char* part : {"ovphoto: ", text, "\n"}) std::fputs(part, stderr);
 }
 
-/// Tells of the exception that ends the run, cleaned as all that people read while there is memory for that.
-void tellException() {
-    try {
-        complain("ovphoto: " + currentExceptionText());
-    } catch (...) {
-        tellCurrentException(tell);
-    }
-}
-
-/// Where an exception cannot be caught, as in the destructors of libraries when memory is gone.
+/// Where an exception cannot be caught, as in the destructors of libraries when memory is gone, or not be told of.
 [[noreturn]] void breakOff() noexcept {
     std::set_terminate([] { std::_Exit(exitFailed); });
     std::current_exception() ? tellCurrentException(tell) : tell("broke off");
     removeUnfinishedFiles();
+    std::cout.flush();
     std::_Exit(exitFailed);
 }
 
@@ -123,7 +115,7 @@ int main(int argc, char** argv) {
         std::ios::sync_with_stdio(false);
         status = run(commandLine(argc, argv));
     } catch (...) {
-        tellException();
+        complain("ovphoto: " + currentExceptionText());
     }
     if (std::cout.flush()) return status;
     // Whoever closes a pipe has read enough.
