@@ -4,10 +4,10 @@
 #include <cstdio>
 #include <random>
 
+#include "components/photo/files/fileFormat.h"
+#include "components/photo/files/webDistribution.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/fileFormat.h"
-#include "components/photo/lid/webDistribution.h"
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
 
 namespace bench {
 

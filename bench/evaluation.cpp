@@ -3,7 +3,7 @@
 
 #include "bench/bench.h"
 #include "components/photo/distributions/manyIntensities.h"
-#include "components/photo/lid/webDistribution.h"
+#include "components/photo/files/webDistribution.h"
 
 // Intensities of a web towards random directions, one by one and many at once, beside a bare lookup. Times are
 // those of one direction.

@@ -1,7 +1,7 @@
 #include <charconv>
 
 #include "bench/bench.h"
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
 #include "tests/support/plainDevice.h"
 
 // Import of files, everything included, beside a bare loop of std::from_chars over the same bytes.

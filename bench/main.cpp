@@ -2,8 +2,8 @@
 #include <map>
 
 #include "bench/bench.h"
+#include "components/module/registration.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/registration.h"
 #include "host/componentManager/componentManager.h"
 
 namespace {

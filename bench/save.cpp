@@ -1,7 +1,7 @@
 #include <charconv>
 
 #include "bench/bench.h"
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
 #include "host/componentManager/persistant.h"
 #include "host/componentManager/stream.h"
 

@@ -2,7 +2,7 @@
 function(ovphoto_add_test_program source)
   string(REPLACE "/" "_" name ${source})
   add_executable(${name} ${source}.cpp ${ARGN})
-  target_link_libraries(${name} PRIVATE ovphoto_core ovphoto_test_support GTest::gmock GTest::gtest_main)
+  target_link_libraries(${name} PRIVATE ovphoto_builders ovphoto_test_support GTest::gmock GTest::gtest_main)
   target_compile_definitions(${name} PRIVATE _GLIBCXX_ASSERTIONS)
 endfunction()
 

@@ -20,9 +20,11 @@ set_target_properties(OVphoto PROPERTIES NO_SONAME ON INSTALL_RPATH $ORIGIN/..)
 
 # Who uses the installed library needs its language and its headers, not the flags that it was built with.
 set_target_properties(OVhost PROPERTIES INTERFACE_LINK_LIBRARIES $<BUILD_INTERFACE:ovphoto_flags>)
+set_target_properties(ovphoto_support PROPERTIES
+  EXPORT_NAME support INTERFACE_LINK_LIBRARIES "$<BUILD_INTERFACE:ovphoto_flags>;OVhost")
 target_compile_features(OVhost INTERFACE cxx_std_20)
 
-install(TARGETS OVhost EXPORT ovphoto
+install(TARGETS OVhost ovphoto_support EXPORT ovphoto
   RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR}
   LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
   ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR}
@@ -47,11 +49,14 @@ foreach(language ${languages})
   install(FILES ${CMAKE_LIBRARY_OUTPUT_DIRECTORY}/${folder}/libOVphotoRes.dll DESTINATION ${moduleFolder}/${folder})
 endforeach()
 
-# The host's headers go below ovphoto/, so that no other's "host" meets them.
+# The headers of host and support go below ovphoto/, so that no other's "host" meets them.
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/ovphoto DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
   FILES_MATCHING PATTERN *.h)
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/host DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/ovphoto
-  FILES_MATCHING PATTERN *.h PATTERN base/arguments.h EXCLUDE PATTERN base/text*.h EXCLUDE)
+  FILES_MATCHING PATTERN *.h PATTERN streamState.h EXCLUDE)
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/components/support
+  DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/ovphoto/components
+  FILES_MATCHING PATTERN *.h PATTERN arguments.h EXCLUDE PATTERN text*.h EXCLUDE)
 install(FILES ${PROJECT_SOURCE_DIR}/docs/man/ovphoto.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1)
 install(FILES ${PROJECT_SOURCE_DIR}/LICENSE DESTINATION ${CMAKE_INSTALL_DOCDIR})
 

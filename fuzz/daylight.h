@@ -1,8 +1,8 @@
 #pragma once
 
 #include "components/photo/naturallight/daylightData.h"
+#include "components/support/devices.h"
 #include "fuzz/fuzz.h"
-#include "host/componentManager/devices.h"
 #include "host/componentManager/stream.h"
 
 namespace OvPhotometrics::fuzz {

@@ -4,9 +4,9 @@
 #include <utility>
 #include <vector>
 
+#include "components/support/path.h"
 #include "fuzz/fuzz.h"
 #include "host/componentManager/stream.h"
-#include "host/platform/path.h"
 #include "tests/support/dripDevice.h"
 #include "tests/support/plainDevice.h"
 

@@ -5,11 +5,11 @@
 #include <cstdlib>
 
 #include "components/messageFile/message.h"
+#include "components/module/registration.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/registration.h"
+#include "components/support/path.h"
 #include "host/componentManager/componentManager.h"
 #include "host/componentManager/processController.h"
-#include "host/platform/path.h"
 
 namespace OvPhotometrics::fuzz {
 

@@ -2,8 +2,8 @@
 
 #include <utility>
 
+#include "components/support/path.h"
 #include "fuzz/fuzz.h"
-#include "host/platform/path.h"
 
 // A message text in UTF-8, around arguments of whatever kinds it asks for.
 

@@ -3,8 +3,8 @@
 #include <set>
 
 #include "components/messageFile/messageStore.h"
-#include "host/base/immortal.h"
-#include "host/platform/path.h"
+#include "components/support/immortal.h"
+#include "components/support/path.h"
 
 namespace Ov {
 

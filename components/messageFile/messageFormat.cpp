@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "components/messageFile/message.h"
-#include "host/base/textFormat.h"
+#include "components/support/textFormat.h"
 
 namespace Ov {
 
@@ -16,20 +16,20 @@ namespace {
 struct Piece {
     std::wstring_view text;
     std::size_t number = 0;  // the marker's, from 1; 0: no marker
-    FormatSpec spec;
+    Directive spec;
 };
 
 using Argument = std::variant<std::int32_t, double, const wchar_t*>;
 
 bool isOneOf(wchar_t c, std::wstring_view set) { return set.find(c) != set.npos; }
 bool isDigit(wchar_t c) { return c >= L'0' && c <= L'9'; }
-bool isInteger(const FormatSpec& spec) { return isOneOf(spec.letter, L"CXcdioux"); }
-bool isDouble(const FormatSpec& spec) { return isOneOf(spec.letter, L"EGefg"); }
+bool isInteger(const Directive& spec) { return isOneOf(spec.letter, L"CXcdioux"); }
+bool isDouble(const Directive& spec) { return isOneOf(spec.letter, L"EGefg"); }
 
 /// Reads the conversion between two exclamation marks.
-bool readConversion(std::wstring_view text, FormatSpec& spec) {
+bool readConversion(std::wstring_view text, Directive& spec) {
     const wchar_t* const end = text.data() + text.size();
-    if (parseFormatSpec(text.data(), end, spec) != end) return false;
+    if (parseDirective(text.data(), end, spec) != end) return false;
     if (spec.widthIsArgument || spec.precisionIsArgument) return false;
     if (isInteger(spec)) return isOneOf(spec.modifier, std::wstring_view(L"\0hl", 3));
     return spec.modifier == 0 && (isDouble(spec) || spec.letter == L's');
@@ -72,8 +72,8 @@ std::optional<std::vector<Piece>> cutText(std::wstring_view text) {
 }
 
 /// The markers in the order of their arguments; nothing unless each of 1 to the highest stands there once.
-std::optional<std::vector<const FormatSpec*>> orderMarkers(const std::vector<Piece>& pieces) {
-    std::vector<const FormatSpec*> order(pieces.size(), nullptr);
+std::optional<std::vector<const Directive*>> orderMarkers(const std::vector<Piece>& pieces) {
+    std::vector<const Directive*> order(pieces.size(), nullptr);
     std::size_t count = 0;
     for (const Piece& piece : pieces) {
         if (piece.number == 0) continue;
@@ -86,9 +86,9 @@ std::optional<std::vector<const FormatSpec*>> orderMarkers(const std::vector<Pie
     return order;
 }
 
-std::vector<Argument> fetchArguments(const std::vector<const FormatSpec*>& markers, std::va_list args) {
+std::vector<Argument> fetchArguments(const std::vector<const Directive*>& markers, std::va_list args) {
     std::vector<Argument> arguments;
-    for (const FormatSpec* spec : markers) {
+    for (const Directive* spec : markers) {
         if (isInteger(*spec))
             arguments.emplace_back(std::int32_t{va_arg(args, int)});
         else if (isDouble(*spec))
@@ -99,7 +99,7 @@ std::vector<Argument> fetchArguments(const std::vector<const FormatSpec*>& marke
     return arguments;
 }
 
-void appendArgument(std::wstring& out, const FormatSpec& spec, const Argument& argument) {
+void appendArgument(std::wstring& out, const Directive& spec, const Argument& argument) {
     if (const auto* integer = std::get_if<std::int32_t>(&argument))
         appendInteger(out, spec, *integer);
     else if (const auto* number = std::get_if<double>(&argument))

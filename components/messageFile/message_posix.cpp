@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "components/messageFile/messageStore.h"
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "host/sdk/util.h"
 
 namespace Ov {

@@ -5,7 +5,7 @@
 
 #include "components/messageFile/messageStore.h"
 #include "components/messageFile/resourceCheck_windows.h"
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "host/sdk/util.h"
 
 namespace Ov {

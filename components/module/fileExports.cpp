@@ -3,8 +3,8 @@
 #include <new>
 
 #include "components/messageFile/messageIds.h"
+#include "components/photo/files/fileFormat.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/fileFormat.h"
 #include "components/photo/lid/reportMessage.h"
 
 namespace OvPhotometrics {

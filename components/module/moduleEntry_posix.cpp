@@ -1,8 +1,8 @@
 #include <dlfcn.h>
 
+#include "components/module/moduleEntry.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/moduleEntry.h"
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "ovphoto/module.h"
 
 namespace {

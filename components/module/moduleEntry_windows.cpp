@@ -1,7 +1,7 @@
 #include <windows.h>
 
+#include "components/module/moduleEntry.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/moduleEntry.h"
 #include "ovphoto/module.h"
 
 namespace {

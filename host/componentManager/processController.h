@@ -10,14 +10,15 @@ namespace Ov {
 
 /// The host's services to whoever runs in it: a place to report messages, and a finder of files.
 ///
-/// Threads:  any number may call the host's own. One that stands in for it is asked for files by all threads that
-///           read; how it is called with messages, `RnReport` says.
+/// Threads:  any number may call the host's own. One that stands in for it is called by all threads that read or report.
 class OVHOST_API RnProcessController : public RnCastable {
 public:
     /// Id of the interface.
     [[gnu::used]] static constexpr RnUid iid{0xeb719621, 0xc02011d1, 0xaa7a00c0, 0x4fb1532a};
 
-    /// Shows a message to the user. Level 0 is an ordinary message.
+    /// Shows a message to the user. Level 0 is an ordinary message. The host's own does so for one thread at a time:
+    /// another waits until the reporter is done. The reporter may call back into the library: what that reports comes
+    /// to it at once, inside its call. It must not wait for other threads that may report. What it throws is passed on.
     virtual void report(int level, const wchar_t* text) = 0;
     /// Finds a file by name, blanks around the name ignored: as an absolute path, in the folder `basePath` (null:
     /// none), then in the folders of the path list `listName`. `result` is its path, or empty. A folder counts as
@@ -32,13 +33,7 @@ OVHOST_API RnCastable* RnGetProcessController();
 OVHOST_API RnCastable* RnGetThreadProcessController();
 /// @}
 
-/// Reports to the controller of the process on the calling thread, and raises ExBadCast without one. One thread at a
-/// time: another waits until the controller, and the reporter that it calls, is done. These may call back into the
-/// library: what that reports comes to them at once, inside their call. They must not wait for other threads that
-/// may report. What they throw is passed on.
-OVHOST_API void RnReport(int level, const wchar_t* text);
-
-/// Receives the messages of the process, as `RnReport` says. The text is valid during the call.
+/// Receives the messages of the process, as `RnProcessController::report` says. The text is valid during the call.
 using MessageReporter = std::function<void(int level, const wchar_t* text)>;
 
 // Host side. All of this belongs to the process: set it while nothing is being imported, but for the reporter.

@@ -1,10 +1,10 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <string>
-#include <string_view>
 
-#include "host/componentManager/charInput.h"
+#include "host/componentManager/bufferedIO.h"
 #include "host/componentManager/postLoadList.h"
 #include "host/componentManager/streamEx.h"
 
@@ -97,7 +97,7 @@ public:
                                  const wchar_t* basePath = nullptr);
 
     /// The device, without a new reference.
-    RnBufferedIO& device() const { return _input.device(); }
+    RnBufferedIO& device() const;
 
     /// @{
     /// Characters on the current output line, and whether the last item leaves a separator due. The text readers
@@ -106,36 +106,16 @@ public:
     bool pendingSeparator = false;
     /// @}
 
-    /// The characters of the device. A pending separator is skipped first.
-    RnCharInput& input() {
-        if (pendingSeparator) skipPendingSeparator();
-        return _input;
-    }
-    /// @{
-    /// Its operations on single characters.
-    int getChar() { return input().getChar(); }
-    int peekChar() { return input().peekChar(); }
-    void ungetChar(int c) { _input.ungetChar(c); }
-    /// @}
-    /// Writes bytes as they are, a character each and all at once. Raises ExWriteError where the device does not take
-    /// all of them.
-    void writeBytes(std::string_view bytes);
-    /// Ends the current output line.
-    void endLine();
-    /// Writes a run of characters that stands for one item of a list, after the separator that is due (a line
-    /// end where the line is past column 70).
-    void writeItem(const wchar_t* text, int count);
+    /// @cond
+    struct State;
+    State& state() const { return *_state; }
+    /// @endcond
 
 private:
-    void skipPendingSeparator();
     void saveContent(RnPersistant& adapter);
     bool loadContent(RnPersistant& adapter, const wchar_t* name, const wchar_t* basePath);
 
-    RnCharInput _input;
-    Form _form;
-    RnPostLoadList* _postLoad;
-    int _depth = 0;      // objects being read or written in one another
-    std::wstring _text;  // what goes to the device as characters, kept for its memory
+    std::unique_ptr<State> _state;
 };
 
 }  // namespace Ov

@@ -3,8 +3,8 @@
 #include <cstdint>
 
 #include "host/componentManager/enumerator.h"
+#include "host/componentManager/module.h"
 #include "host/componentManager/stream.h"
-#include "host/platform/module.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/module.h"
 #include "ovphoto/numberedExportList.h"

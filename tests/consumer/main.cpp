@@ -1,6 +1,6 @@
+#include <components/support/path.h>
 #include <host/componentManager/componentManager.h>
 #include <host/componentManager/importer.h>
-#include <host/platform/path.h>
 #include <ovphoto/classIds.h>
 #include <ovphoto/numberedExports.h>
 #include <ovphoto/photoWebData.h>

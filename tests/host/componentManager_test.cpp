@@ -3,7 +3,7 @@
 #include <gmock/gmock.h>
 
 #include "host/componentManager/importer.h"
-#include "host/platform/module.h"
+#include "host/componentManager/module.h"
 #include "ovphoto/classIds.h"
 #include "support/paths.h"
 #include "support/tempFolder.h"

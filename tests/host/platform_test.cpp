@@ -2,9 +2,9 @@
 
 #include <cstdlib>
 
+#include "components/support/file.h"
+#include "components/support/path.h"
 #include "host/componentManager/processController.h"
-#include "host/platform/file.h"
-#include "host/platform/path.h"
 #include "host/sdk/util.h"
 #include "support/tempFolder.h"
 #include "testObjects.h"

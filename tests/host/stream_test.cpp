@@ -8,6 +8,7 @@
 #include <random>
 #include <sstream>
 
+#include "components/support/streamText.h"
 #include "host/componentManager/componentManager.h"
 #include "testObjects.h"
 
@@ -75,7 +76,7 @@ TEST(Devices, MemoryIsOverwrittenAndGrowsAndASinkGetsAllAtOnce) {
     const std::wstring text = L"\u20AC" + std::wstring(3000, L'\u00E9');
     for (const RnRef<RnBufferedIO>& device : {RnRef<RnBufferedIO>(memory), RnRef<RnBufferedIO>(out)}) {
         EXPECT_EQ(device->writeChars(text.c_str(), 3001), 3001);
-        RnStream(device.get(), Form::binary).writeBytes("\0\n\x80"s);
+        EXPECT_EQ(device->writeChars(L"\0\n\x80", 3), 3);
         device->endLine();
         device->writeSeparator();
         EXPECT_EQ(device->seek(0, 1), 3006);
@@ -189,7 +190,7 @@ TEST(StreamValues, ItemsAndLinesKeepColumnAndSeparator) {
     const auto device = rnCreate<RnMemoryBuffer>();
     RnStream stream(device.get(), Form::text);
     const auto state = [&] { return std::tuple{stream.column, stream.pendingSeparator, stream.computeLineNb()}; };
-    stream.writeItem(L" 1.00", 5);
+    writeItem(stream, L" 1.00", 5);
     EXPECT_EQ(state(), std::tuple(5, false, 1));
     stream << 23 << 4;
     EXPECT_EQ(state(), std::tuple(9, true, 1));
@@ -197,17 +198,18 @@ TEST(StreamValues, ItemsAndLinesKeepColumnAndSeparator) {
     stream << 5;
     EXPECT_EQ(state(), std::tuple(72, true, 1));
     stream << 67;
-    stream.endLine();
+    endLine(stream);
     EXPECT_EQ(state(), std::tuple(0, false, 3));
     // Read, an item leaves exactly one separator due.
     device->seek(0, 0);
     float values[3];
     stream.read(values[0], 3);
     EXPECT_EQ(state(), std::tuple(0, true, 1));
-    EXPECT_EQ(stream.getChar(), '6');
+    RnStreamInput chars(stream);
+    EXPECT_EQ(chars.getChar(), '6');
     EXPECT_EQ(state(), std::tuple(0, false, 2));
-    stream.ungetChar('9');
-    stream.ungetChar(-1);
+    chars.ungetChar('9');
+    chars.ungetChar(-1);
     EXPECT_EQ(readRest(*device), "97\n");
     EXPECT_EQ(device->bytes(), " 1.0023 4 5\n97\n");
     EXPECT_THROW(RnStream(RnPtr<RnBufferedIO>(), Form::text), ExBadCast);
@@ -300,7 +302,7 @@ TEST_P(StreamObjects, AreLoadedAsFarAsTheyAreWantedAndStandInOneAnother) {
     const RnUid& id = NoteData::classId;
     for (int level = 0; level < 40000; ++level) {
         levels << id.w0 << id.w1 << id.w2 << id.w3 << 1;
-        GetParam() == Form::text ? levels.endLine() : void(levels << 1000U);
+        GetParam() == Form::text ? endLine(levels) : void(levels << 1000U);
         levels.formattedWrite(L"x\n");
     }
     for (int again = 0; again < 2; ++again) {

@@ -5,10 +5,10 @@
 #include <string>
 #include <vector>
 
+#include "components/support/devices.h"
+#include "components/support/path.h"
 #include "host/componentManager/builder.h"
-#include "host/componentManager/devices.h"
 #include "host/componentManager/stream.h"
-#include "host/platform/path.h"
 #include "support/dripDevice.h"
 #include "support/plainDevice.h"
 

@@ -9,7 +9,7 @@
 
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "host/sdk/util.h"
 #include "support/paths.h"
 

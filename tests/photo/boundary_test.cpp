@@ -5,11 +5,11 @@
 #include <iostream>
 #include <sstream>
 
+#include "components/support/devices.h"
 #include "host/componentManager/componentManager.h"
-#include "host/componentManager/devices.h"
+#include "host/componentManager/module.h"
 #include "host/componentManager/processController.h"
 #include "host/componentManager/stream.h"
-#include "host/platform/module.h"
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"

@@ -145,6 +145,10 @@ protected:
         return made;
     }
 
+    static std::unique_ptr<Ov::RnStream> textStream(Ov::RnBufferedIO& io) {
+        return spared([&] { return std::make_unique<Ov::RnStream>(&io, Form::text); });
+    }
+
     template <class Interface>
     static bool clones(Ov::RnCastable& object) {
         const auto original = Ov::rnQuery<Interface>(&object);
@@ -264,8 +268,8 @@ TEST_F(Failures, OfPartsOfFilesAreTold) {
             [&] {
                 const auto io = spared([&] { return Ov::rnCreate<FailingDevice>(numbers); });
                 auto record = spared([] { return IesFileRecord(); });
-                Ov::RnStream stream(io.get(), Form::text);
-                return work(record, stream);
+                const auto stream = textStream(*io);
+                return work(record, *stream);
             },
             true);
     CandelaGrid grid;
@@ -288,8 +292,8 @@ TYPED_TEST(FailuresOfFiles, AreToldAndLeaveNothing) {
         [&] {
             const auto io = this->spared([&] { return Ov::rnCreate<FailingDevice>(text); });
             auto record = this->spared([] { return typename TypeParam::Record(); });
-            Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-            return readRecord<TypeParam>(record, stream, L"") &&
+            const auto stream = this->textStream(*io);
+            return readRecord<TypeParam>(record, *stream, L"") &&
                    recordToWeb<TypeParam>(record, *web, L"a name too long for its own place", L"");
         },
         true);
@@ -311,8 +315,8 @@ TYPED_TEST(FailuresOfFiles, AreToldAndLeaveNothing) {
             "write", *light,
             [&] {
                 const auto io = this->spared([] { return Ov::rnCreate<FailingDevice>(); });
-                Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-                const bool well = writeFile(TypeParam::Web::classId, *light, stream, form, facts, 2);
+                const auto stream = this->textStream(*io);
+                const bool well = writeFile(TypeParam::Web::classId, *light, *stream, form, facts, 2);
                 EXPECT_EQ(well, !io->bytes().empty());
                 return well;
             },

@@ -2,13 +2,13 @@
 
 #include <set>
 
-#include "components/photo/lid/moduleEntry.h"
+#include "components/module/moduleEntry.h"
+#include "components/support/devices.h"
 #include "host/componentManager/componentManager.h"
-#include "host/componentManager/devices.h"
+#include "host/componentManager/module.h"
 #include "host/componentManager/persistant.h"
 #include "host/componentManager/processController.h"
 #include "host/componentManager/streamEx.h"
-#include "host/platform/module.h"
 #include "host/sdk/util.h"
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensities.h"

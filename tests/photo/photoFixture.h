@@ -7,11 +7,11 @@
 #include <sstream>
 #include <string>
 
+#include "components/module/registration.h"
 #include "components/photo/ies/photoWebIES.h"
 #include "components/photo/lid/component.h"
-#include "components/photo/lid/registration.h"
+#include "components/support/devices.h"
 #include "host/componentManager/componentManager.h"
-#include "host/componentManager/devices.h"
 #include "tests/support/messageLog.h"
 
 namespace OvPhotometrics {

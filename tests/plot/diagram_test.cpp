@@ -3,14 +3,14 @@
 #include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
 #include "components/photo/ies/photoWebIES.h"
+#include "plot/axis.h"
+#include "plot/caption.h"
+#include "plot/curve.h"
+#include "plot/isolines.h"
+#include "plot/picture.h"
+#include "plot/solid.h"
 #include "tests/photo/photoFixture.h"
 #include "tests/plot/svgPath.h"
-#include "tools/plot/axis.h"
-#include "tools/plot/caption.h"
-#include "tools/plot/curve.h"
-#include "tools/plot/isolines.h"
-#include "tools/plot/picture.h"
-#include "tools/plot/solid.h"
 
 // The geometry of what is drawn, not its pixels.
 

@@ -3,7 +3,7 @@
 #include <regex>
 #include <string>
 
-#include "tools/plot/geometry.h"
+#include "plot/geometry.h"
 
 /// Every point of the picture's longest path of lines: letters are curves.
 inline OvPlot::Path longestPath(const std::string& svg) {

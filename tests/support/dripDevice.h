@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
 
 /// Memory that shows its bytes one at a time, so that no token lies wholly in its window.
 class DripDevice : public Ov::RnMemoryBuffer {

@@ -4,8 +4,8 @@
 #include <stdexcept>
 #include <string>
 
-#include "host/componentManager/castImpl.h"
-#include "host/componentManager/charInput.h"
+#include "components/support/castImpl.h"
+#include "components/support/charInput.h"
 
 /// Bytes behind the operations that every device has and nothing else: no window, raw bytes only a few at a time, and
 /// no more pushed back than was read, two characters at most.

@@ -9,7 +9,7 @@
 #include <stdexcept>
 #include <vector>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "support/paths.h"
 
 namespace fs = std::filesystem;

@@ -6,7 +6,7 @@
 #include <string>
 #include <string_view>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tests/support/platform.h"
 
 /// A folder for one test, deleted with the object.

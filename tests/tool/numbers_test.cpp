@@ -1,4 +1,4 @@
-#include "tools/ovphoto/numbers.h"
+#include "tools/numbers/numbers.h"
 
 #include <gtest/gtest.h>
 

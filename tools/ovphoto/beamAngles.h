@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "ovphoto/intensityDist.h"
-#include "tools/plot/lightFrame.h"
+#include "plot/lightFrame.h"
 
 namespace OvTool {
 

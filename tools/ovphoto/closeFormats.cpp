@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <sstream>
 
-#include "tools/ovphoto/numbers.h"
+#include "tools/numbers/numbers.h"
 
 namespace OvTool {
 

@@ -4,9 +4,9 @@
 #include <cmath>
 #include <iostream>
 
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/lightFile.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webTexts.h"

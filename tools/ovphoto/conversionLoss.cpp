@@ -5,8 +5,8 @@
 #include <numbers>
 #include <vector>
 
-#include "host/componentManager/castImpl.h"
-#include "tools/ovphoto/numbers.h"
+#include "components/support/castImpl.h"
+#include "tools/numbers/numbers.h"
 
 namespace OvTool {
 

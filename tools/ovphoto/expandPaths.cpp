@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <filesystem>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/targetFormat.h"

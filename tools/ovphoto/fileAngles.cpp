@@ -1,6 +1,6 @@
 #include "tools/ovphoto/fileAngles.h"
 
-#include "tools/ovphoto/numbers.h"
+#include "tools/numbers/numbers.h"
 
 namespace OvTool {
 

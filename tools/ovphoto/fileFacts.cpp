@@ -6,8 +6,8 @@
 #include <set>
 #include <utility>
 
-#include "host/platform/path.h"
-#include "tools/ovphoto/numbers.h"
+#include "components/support/path.h"
+#include "tools/numbers/numbers.h"
 
 namespace OvTool {
 

@@ -4,10 +4,10 @@
 #include <filesystem>
 #include <iterator>
 
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
+#include "components/support/file.h"
+#include "components/support/path.h"
 #include "host/componentManager/streamEx.h"
-#include "host/platform/file.h"
-#include "host/platform/path.h"
 #include "ovphoto/classIds.h"
 #include "tools/ovphoto/closeFormats.h"
 #include "tools/ovphoto/language.h"

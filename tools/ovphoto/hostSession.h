@@ -5,7 +5,7 @@
 #include <vector>
 
 #include "host/componentManager/componentManager.h"
-#include "host/platform/module.h"
+#include "host/componentManager/module.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
 #include "ovphoto/photoFile.h"

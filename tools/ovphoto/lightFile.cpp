@@ -2,10 +2,10 @@
 
 #include <cmath>
 
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/messageCollector.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

@@ -6,7 +6,7 @@
 #include <cmath>
 #include <numbers>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/language.h"
 
 namespace OvTool {

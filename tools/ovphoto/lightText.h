@@ -6,7 +6,7 @@
 #include <string_view>
 
 #include "ovphoto/numberedExports.h"
-#include "tools/ovphoto/numbers.h"
+#include "tools/numbers/numbers.h"
 
 // Places and times between people and numbers. West and north are positive. Texts are in the user's language.
 

@@ -4,8 +4,8 @@
 #include <utility>
 #include <vector>
 
+#include "components/support/path.h"
 #include "host/componentManager/processController.h"
-#include "host/platform/path.h"
 
 namespace OvTool {
 

@@ -2,13 +2,14 @@
 
 #include <algorithm>
 
-#include "host/componentManager/devices.h"
+#include "components/support/charInput.h"
+#include "components/support/devices.h"
 #include "host/componentManager/persistant.h"
 #include "ovphoto/classIds.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/messageCollector.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

@@ -8,7 +8,7 @@
 #include <algorithm>
 #include <mutex>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 
 /// The C library's way to the wide arguments, with wildcards expanded.
 extern "C" int __wgetmainargs(int* argc, wchar_t*** argv, wchar_t*** environment, int expand, int* newMode);

@@ -3,7 +3,7 @@
 #include <iostream>
 #include <utility>
 
-#include "host/componentManager/devices.h"
+#include "components/support/devices.h"
 
 namespace OvTool {
 

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "tools/ovphoto/numbers.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/terminal.h"
 
 namespace OvTool {

@@ -1,6 +1,6 @@
 #include "tools/ovphoto/targetFormat.h"
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 
 namespace OvTool {
 

@@ -5,7 +5,7 @@
 #include <cstdio>
 #include <iostream>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/standardStreams.h"
 
 namespace OvTool {

@@ -4,9 +4,9 @@
 #include <cmath>
 #include <limits>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <optional>
 
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

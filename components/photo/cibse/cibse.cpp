@@ -4,8 +4,8 @@
 
 #include "components/messageFile/messageIds.h"
 #include "components/photo/cibse/photoWebCIBSE.h"
-#include "components/photo/lid/gridLayout.h"
-#include "components/photo/lid/ownGrid.h"
+#include "components/photo/files/gridLayout.h"
+#include "components/photo/files/ownGrid.h"
 #include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {

@@ -4,8 +4,8 @@
 #include <cstdint>
 #include <string>
 
-#include "components/photo/lid/candelaGrid.h"
-#include "components/photo/lid/fileFacts.h"
+#include "components/photo/files/candelaGrid.h"
+#include "components/photo/files/fileFacts.h"
 
 // CIBSE TM14 photometric files.
 //

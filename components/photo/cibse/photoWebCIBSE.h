@@ -1,7 +1,7 @@
 #pragma once
 
 #include "components/photo/cibse/cibse.h"
-#include "components/photo/lid/photoWebComponent.h"
+#include "components/photo/files/photoWebComponent.h"
 #include "ovphoto/classIds.h"
 
 namespace OvPhotometrics {

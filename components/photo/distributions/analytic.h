@@ -1,7 +1,7 @@
 #pragma once
 
 #include "components/photo/distributions/singlePrecision.h"
-#include "host/componentManager/castImpl.h"
+#include "components/support/castImpl.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
 

@@ -2,10 +2,10 @@
 
 #include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/distributions/singlePrecision.h"
+#include "components/photo/files/savedWeb.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/photoWeb.h"
-#include "components/photo/lid/savedWeb.h"
-#include "host/componentManager/castImpl.h"
+#include "components/support/castImpl.h"
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/saveForm.h"

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "components/photo/lid/candelaGrid.h"
-#include "components/photo/lid/fileFacts.h"
+#include "components/photo/files/candelaGrid.h"
+#include "components/photo/files/fileFacts.h"
 
 // IES LM-63 photometric files (1986, 1991, 1995 and 2002).
 //

@@ -1,7 +1,7 @@
 #include "components/messageFile/messageIds.h"
+#include "components/photo/files/gridLayout.h"
 #include "components/photo/ies/ies.h"
 #include "components/photo/ies/photoWebIES.h"
-#include "components/photo/lid/gridLayout.h"
 #include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {

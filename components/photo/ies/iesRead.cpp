@@ -6,8 +6,8 @@
 #include "components/messageFile/messageIds.h"
 #include "components/photo/ies/ies.h"
 #include "components/photo/lid/withinMemory.h"
+#include "components/support/file.h"
 #include "host/componentManager/processController.h"
-#include "host/platform/file.h"
 
 namespace OvPhotometrics {
 

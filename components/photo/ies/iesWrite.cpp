@@ -1,6 +1,6 @@
+#include "components/photo/files/ownGrid.h"
+#include "components/photo/files/webDistribution.h"
 #include "components/photo/ies/ies.h"
-#include "components/photo/lid/ownGrid.h"
-#include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/withinMemory.h"
 
 namespace OvPhotometrics {

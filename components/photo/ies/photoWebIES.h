@@ -2,8 +2,8 @@
 
 #include <string>
 
+#include "components/photo/files/photoWebComponent.h"
 #include "components/photo/ies/ies.h"
-#include "components/photo/lid/photoWebComponent.h"
 #include "ovphoto/classIds.h"
 
 namespace OvPhotometrics {

@@ -5,9 +5,9 @@
 #include <memory_resource>
 #include <unordered_map>
 
-#include "host/base/immortal.h"
+#include "components/support/castImpl.h"
+#include "components/support/immortal.h"
 #include "host/componentManager/builder.h"
-#include "host/componentManager/castImpl.h"
 
 namespace OvPhotometrics {
 

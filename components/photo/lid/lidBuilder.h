@@ -1,7 +1,7 @@
 #pragma once
 
+#include "components/support/castImpl.h"
 #include "host/componentManager/builder.h"
-#include "host/componentManager/castImpl.h"
 
 namespace OvPhotometrics {
 

@@ -9,7 +9,10 @@ namespace {
 
 std::wstring numberOf(unsigned id) { return L"Message " + std::to_wstring(id) + L"."; }
 
-void postText(const std::wstring& text) { Ov::RnReport(0, text.c_str()); }
+void postText(const std::wstring& text) {
+    constexpr int ordinary = 0;
+    Ov::rnCast<Ov::RnProcessController>(Ov::RnGetThreadProcessController())->report(ordinary, text.c_str());
+}
 
 }  // namespace
 

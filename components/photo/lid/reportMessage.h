@@ -12,8 +12,7 @@ namespace OvPhotometrics {
 /// is its number, "Message 12960.". Arguments are ints, doubles and wide strings, as the text of the message says.
 ///
 /// Errors:   std::bad_alloc; ExBadCast in a host without a controller; what the host's reporter throws.
-/// Threads:  any number; the host's reporter is called on the reporting one, by one at a time (`Ov::RnReport`), with
-///           a text that nobody else changes.
+/// Threads:  any number; the host's controller is called on the reporting one, with a text that nobody else changes.
 class Report {
 public:
     /// The formatted text of a message.

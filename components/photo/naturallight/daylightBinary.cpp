@@ -3,7 +3,8 @@
 #include "components/messageFile/messageIds.h"
 #include "components/photo/naturallight/daylightForms.h"
 #include "components/photo/naturallight/formParts.h"
-#include "host/componentManager/devices.h"
+#include "components/support/charInput.h"
+#include "components/support/devices.h"
 
 namespace OvPhotometrics {
 

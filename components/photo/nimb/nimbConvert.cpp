@@ -1,11 +1,11 @@
 #include <algorithm>
 #include <cmath>
 
+#include "components/photo/files/gridLayout.h"
+#include "components/photo/files/ownGrid.h"
+#include "components/photo/files/sampling.h"
+#include "components/photo/files/webDistribution.h"
 #include "components/photo/lid/angleSearch.h"
-#include "components/photo/lid/gridLayout.h"
-#include "components/photo/lid/ownGrid.h"
-#include "components/photo/lid/sampling.h"
-#include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/nimb/nimb.h"
 

@@ -6,6 +6,7 @@
 #include "components/messageFile/messageIds.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/nimb/nimb.h"
+#include "components/support/streamText.h"
 
 namespace OvPhotometrics {
 
@@ -137,7 +138,8 @@ bool nimbCanRead(Ov::RnBufferedIO& io) {
 int nimbReadLine(wchar_t* buffer73, Ov::RnStream& s) {
     int length = 0;
     bool isThere = false;
-    Ov::RnCharInput& in = s.input();
+    Ov::RnStreamInput chars(s);
+    Ov::RnCharInput& in = chars.chars();
     in.takeWhile([&](int c) {
         isThere = true;
         const bool ends = c == '\n' || c == '\r';

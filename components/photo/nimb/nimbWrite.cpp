@@ -3,7 +3,7 @@
 #include <string_view>
 
 #include "components/messageFile/messageIds.h"
-#include "components/photo/lid/numberText.h"
+#include "components/photo/files/numberText.h"
 #include "components/photo/lid/reportMessage.h"
 #include "components/photo/nimb/nimb.h"
 
@@ -47,7 +47,7 @@ void writeHeader(const NimbRecord& rec, Ov::RnStream& s) {
     writeField(s, large, 8, rec.identifier);
     writeField(s, rec.symmetryCode1 >= 0, 4, rec.symmetryCode1);
     writeField(s, rec.symmetryCode2 >= 0, 4, rec.symmetryCode2);
-    s.endLine();
+    endLine(s);
 }
 
 void writeText(std::wstring line, Ov::RnStream& s) {
@@ -60,10 +60,10 @@ void writeText(std::wstring line, Ov::RnStream& s) {
 void writeValues(const std::vector<std::int16_t>& values, Ov::RnStream& s) {
     constexpr std::size_t valuesPerLine = 17;
     for (std::size_t k = 0; k < values.size(); ++k) {
-        if (k > 0 && k % valuesPerLine == 0) s.endLine();
+        if (k > 0 && k % valuesPerLine == 0) endLine(s);
         s.formattedWrite(L"%4d", std::clamp<int>(values[k], -999, largestField));
     }
-    s.endLine();
+    endLine(s);
 }
 
 constexpr const wchar_t* lineKeys[] = {L"line 1", L"line 2", L"line 3", L"line 4"};

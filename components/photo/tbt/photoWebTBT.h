@@ -1,6 +1,6 @@
 #pragma once
 
-#include "components/photo/lid/photoWebComponent.h"
+#include "components/photo/files/photoWebComponent.h"
 #include "components/photo/tbt/tbt.h"
 #include "ovphoto/classIds.h"
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "components/photo/lid/fileFacts.h"
+#include "components/photo/files/fileFacts.h"
 #include "components/photo/lid/photoWeb.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"

@@ -2,9 +2,9 @@
 #include <cmath>
 #include <limits>
 
+#include "components/photo/files/sampling.h"
+#include "components/photo/files/webDistribution.h"
 #include "components/photo/lid/angleSearch.h"
-#include "components/photo/lid/sampling.h"
-#include "components/photo/lid/webDistribution.h"
 #include "components/photo/lid/withinMemory.h"
 #include "components/photo/tbt/tbt.h"
 

@@ -5,8 +5,8 @@
 #include <limits>
 
 #include "components/photo/tbt/tbt.h"
-#include "host/base/textClass.h"
-#include "host/base/textNumber.h"
+#include "components/support/textClass.h"
+#include "components/support/textNumber.h"
 
 namespace OvPhotometrics {
 
@@ -84,7 +84,7 @@ bool TbtTokenizer::takeIf(char c) {
 /// Takes a number without an exponent at once where the device holds it and what follows ready. False, and nothing
 /// is consumed, where it does not.
 bool TbtTokenizer::takeReadyNumber() {
-    Ov::RnCharInput& in = _in.input();
+    Ov::RnCharInput& in = _in.chars();
     const char* const limit = in.limit();
     const char* end = in.next();
     while (end != limit && Ov::isDigit(*end)) ++end;
@@ -100,7 +100,7 @@ bool TbtTokenizer::takeReadyNumber() {
 TbtToken TbtTokenizer::takeNumber() {
     if (takeReadyNumber()) return TbtToken::number;
     enum { digits, fraction, sign, exponent } part = digits;
-    _in.input().takeWhile([&](int c) {
+    _in.chars().takeWhile([&](int c) {
         if (c == '.' && part == digits) {
             part = fraction;
         } else if ((c == 'e' || c == 'E') && part <= fraction) {
@@ -131,7 +131,7 @@ int TbtTokenizer::skipBlank() {
         return Ov::isWhiteSpace(c);
     };
     for (;;) {
-        const int c = _in.input().takeWhile(takeWhiteSpace);
+        const int c = _in.chars().takeWhile(takeWhiteSpace);
         if (c != '/' || !skipComment()) return c;
     }
 }

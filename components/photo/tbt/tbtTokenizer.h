@@ -4,7 +4,7 @@
 #include <string>
 
 #include "components/messageFile/messageIds.h"
-#include "host/componentManager/stream.h"
+#include "components/support/streamText.h"
 
 namespace OvPhotometrics {
 
@@ -50,7 +50,7 @@ private:
     int skipBlank();
     bool skipComment();
 
-    Ov::RnStream& _in;
+    Ov::RnStreamInput _in;
     std::int64_t _lineFeeds = 0;
     TbtToken _kind = TbtToken::endOfFile;
     std::string _text;

@@ -2,9 +2,9 @@
 #include <cmath>
 #include <string_view>
 
-#include "components/photo/lid/numberText.h"
+#include "components/photo/files/numberText.h"
 #include "components/photo/tbt/tbt.h"
-#include "host/base/textClass.h"
+#include "components/support/textClass.h"
 
 namespace OvPhotometrics {
 
@@ -28,13 +28,13 @@ void writeRow(const float* row, int count, Ov::RnStream& out, FileForm form) {
     int length = 0;
     for (int v = 0; v < written; ++v) {
         if (length > fullLine) {
-            out.endLine();
+            endLine(out);
             length = 0;
         }
         item.assign(1, L' ');
         appendNumber(item, form == FileForm::faithful ? roundedToSixDigits(row[v]) : row[v], form, 2);
         const int width = static_cast<int>(item.size());
-        out.writeItem(item.data(), width);
+        writeItem(out, item.data(), width);
         length += width;
     }
     const int zeros = count - written;

@@ -1,7 +1,7 @@
 #include <CLI/CLI.hpp>
 #include <memory>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"

@@ -7,7 +7,7 @@
 #include <memory>
 #include <sstream>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/conversion.h"
 #include "tools/ovphoto/expandPaths.h"

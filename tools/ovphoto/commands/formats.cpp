@@ -2,7 +2,7 @@
 #include <cstdio>
 #include <memory>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/table.h"

@@ -3,13 +3,13 @@
 #include <memory>
 #include <utility>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/beamAngles.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/fileFacts.h"
 #include "tools/ovphoto/json.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/table.h"
 #include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webTexts.h"

@@ -3,10 +3,10 @@
 #include <memory>
 #include <optional>
 
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/json.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/terminal.h"
 

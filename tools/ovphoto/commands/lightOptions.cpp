@@ -2,10 +2,10 @@
 
 #include <algorithm>
 
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/terminal.h"
 
 namespace OvTool {

@@ -3,10 +3,10 @@
 #include <memory>
 
 #include "ovphoto/classIds.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/lightFile.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
 

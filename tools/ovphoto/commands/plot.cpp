@@ -3,9 +3,9 @@
 #include <charconv>
 #include <memory>
 
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

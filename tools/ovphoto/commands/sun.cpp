@@ -2,7 +2,7 @@
 #include <memory>
 #include <numbers>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
 #include "tools/ovphoto/commands/lightOptions.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"

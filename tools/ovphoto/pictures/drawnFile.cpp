@@ -1,8 +1,8 @@
 #include "tools/ovphoto/pictures/drawnFile.h"
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
-#include "tools/ovphoto/numbers.h"
 
 namespace OvTool {
 

@@ -2,9 +2,9 @@
 
 #include <span>
 
+#include "plot/diagram.h"
 #include "tools/ovphoto/beamAngles.h"
 #include "tools/ovphoto/lightFile.h"
-#include "tools/plot/diagram.h"
 
 namespace OvTool {
 

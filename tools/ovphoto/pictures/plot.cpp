@@ -2,7 +2,9 @@
 #include <algorithm>
 #include <numbers>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "plot/picture.h"
+#include "plot/skyDiagram.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
 #include "tools/ovphoto/language.h"
 #include "tools/ovphoto/lightText.h"
@@ -10,8 +12,6 @@
 #include "tools/ovphoto/pictures/drawnFile.h"
 #include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/terminal.h"
-#include "tools/plot/picture.h"
-#include "tools/plot/skyDiagram.h"
 
 namespace OvTool {
 

@@ -5,7 +5,7 @@
 #include <utility>
 #include <vector>
 
-#include "tools/plot/picture.h"
+#include "plot/picture.h"
 
 // Pieces of pages. What comes from files passes `escaped` on its way in.
 

@@ -3,14 +3,14 @@
 #include <algorithm>
 #include <cmath>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "plot/solid.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/json.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/report/html.h"
 #include "tools/ovphoto/webTexts.h"
 #include "tools/ovphoto/webWarnings.h"
-#include "tools/plot/solid.h"
 
 namespace OvTool {
 

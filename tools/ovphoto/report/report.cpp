@@ -5,11 +5,11 @@
 #include <future>
 #include <thread>
 
-#include "host/platform/path.h"
+#include "components/support/path.h"
+#include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
 #include "tools/ovphoto/expandPaths.h"
 #include "tools/ovphoto/fileAngles.h"
-#include "tools/ovphoto/numbers.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/progress.h"
 #include "tools/ovphoto/report/html.h"

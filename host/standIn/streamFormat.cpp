@@ -1,0 +1,85 @@
+#include <algorithm>
+#include <cwchar>
+
+#include "components/support/arguments.h"
+#include "components/support/textFormat.h"
+#include "host/standIn/streamState.h"
+
+namespace Ov {
+
+namespace {
+
+void fetchWidth(Directive& spec, Arguments& arguments) {
+    if (spec.widthIsArgument) {
+        const int width = std::clamp(arguments.next<int>(), -maxFormatWidth, maxFormatWidth);
+        spec.left |= width < 0;
+        spec.width = width < 0 ? -width : width;
+    }
+    if (spec.precisionIsArgument) spec.precision = std::clamp(arguments.next<int>(), -1, maxFormatWidth);
+}
+
+/// Appends the conversion of the next argument; false for a letter that is none.
+bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
+    if (spec.modifier == L'L') return false;
+    fetchWidth(spec, arguments);
+    switch (spec.letter) {
+        case L'd':
+        case L'i':
+        case L'u':
+        case L'x':
+        case L'X':
+        case L'o':
+        case L'c':
+        case L'C':
+            appendInteger(out, spec, arguments.next<int>());
+            return true;
+        case L'e':
+        case L'E':
+        case L'f':
+        case L'F':
+        case L'g':
+        case L'G':
+            appendDouble(out, spec, arguments.next<double>());
+            return true;
+        case L's':
+            appendText(out, spec, arguments.next<const wchar_t*>());
+            return true;
+        case L'n':
+            *arguments.next<int*>() = static_cast<int>(out.size());
+            return true;
+        default:
+            return false;
+    }
+}
+
+/// Appends the text of a whole format; it ends before a conversion that is none.
+void appendFormatted(std::wstring& out, const wchar_t* format, Arguments& arguments) {
+    const wchar_t* const end = format + std::wcslen(format);
+    while (format != end) {
+        const wchar_t* percent = std::find(format, end, L'%');
+        out.append(format, percent);
+        if (percent == end) return;
+        format = percent + 1;
+        if (format != end && *format == L'%') {
+            out.push_back(*format++);
+            continue;
+        }
+        Directive spec;
+        format = parseDirective(format, end, spec);
+        if (!format || !appendArgument(out, spec, arguments)) return;
+    }
+}
+
+}  // namespace
+
+int RnStream::formattedWrite(const wchar_t* format, ...) {
+    std::wstring& text = _state->text;
+    text.clear();
+    Arguments arguments;
+    va_start(arguments.list, format);
+    appendFormatted(text, format, arguments);
+    va_end(arguments.list);
+    return device().writeChars(text.data(), static_cast<int>(text.size()));
+}
+
+}  // namespace Ov
