@@ -5,16 +5,24 @@
 #include "components/support/path.h"
 #include "fuzz/fuzz.h"
 
-// A message text in UTF-8, around arguments of whatever kinds it asks for.
+// A message text in UTF-8, around 99 arguments of all kinds.
 
 namespace {
 
-/// Each general argument is a text, each floating one a number: the calling conventions of the machines that fuzz
-/// keep the two apart, and beyond the registers the address of a text is a number, too.
+/// Arguments 1, 4, 7 ... are texts, 2, 5, 8 ... integers, 3, 6, 9 ... doubles.
+template <std::size_t k>
+auto argument() {
+    if constexpr (k % 3 == 0)
+        return L"text";
+    else if constexpr (k % 3 == 1)
+        return k % 2 == 0 ? -1 - static_cast<int>(k) : 0x7fffffff;
+    else
+        return k % 2 == 0 ? -1e300 : 5e-324;
+}
+
 template <std::size_t... k>
 std::wstring formatted(const std::wstring& text, std::index_sequence<k...>) {
-    return Ov::formatMessage(text.c_str(), 0.5, -1e300, 2.0, -0.0, 5e-324, 1e21, 123456.75, -7.0,
-                             (static_cast<void>(k), L"text")...);
+    return Ov::formatMessage(text.c_str(), argument<k>()...);
 }
 
 }  // namespace

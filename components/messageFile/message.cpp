@@ -52,19 +52,6 @@ std::wstring RnMessageFile::getText(unsigned id) {
     throw RnMessageFileEx::ExNoCatalogue(name);
 }
 
-std::wstring RnMessageFile::format(unsigned id, ...) {
-    const std::wstring text = getText(id);
-    std::va_list args;
-    va_start(args, id);
-    std::wstring result = formatMessageV(text.c_str(), args);
-    va_end(args);
-    return result;
-}
-
-std::wstring RnMessageFile::formatV(unsigned id, std::va_list args) {
-    return formatMessageV(getText(id).c_str(), args);
-}
-
 RnMessageFileEx::RnMessageFileEx(const std::string& reason, int line)
     : ExBase(reason.c_str(), line), std::runtime_error(reason) {}
 
@@ -83,8 +70,8 @@ RnMessageFileEx::ExNoCatalogue::~ExNoCatalogue() = default;
 
 RnMessageFile& messageFile() { return immortal<RnMessageFile>(); }
 
-const wchar_t* keptText(unsigned id) {
-    std::wstring text = messageFile().format(id);
+const wchar_t* keptText(Message<> message) {
+    std::wstring text = messageFile().format(message);
     auto& kept = immortal<KeptTexts>();
     const std::lock_guard guard(kept.lock);
     return kept.texts.insert(std::move(text)).first->c_str();

@@ -1,10 +1,11 @@
 #pragma once
 
-#include <cstdarg>
+#include <initializer_list>
 #include <memory>
 #include <mutex>
 #include <string>
 
+#include "components/messageFile/typedMessage.h"
 #include "host/base/exBase.h"
 
 namespace Ov {
@@ -18,7 +19,8 @@ namespace Ov {
 ///   "%1!5.2f!"               the same, printed with flags, width, precision and letter of printf; letters
 ///                            d i u o x c C X (32 bits; with h, 16 bits), e f g E G (double), s (flags unused)
 ///   A text without markers stands as it is, escapes included. Numbers run from 1 to the highest without gaps or
-///   repeats; anything else gives "MALFORMED FORMATTING STRING: " and the text.
+///   repeats, and an argument is of the kind that its letter prints; anything else gives "MALFORMED FORMATTING
+///   STRING: " and the text.
 ///
 /// Errors:   RnMessageFileEx before a file name is set or when the file cannot be opened; a number without a text
 ///           gives the empty text.
@@ -40,9 +42,9 @@ public:
     std::shared_ptr<const Store> store();
     /// The raw text of a message.
     std::wstring getText(unsigned id);
-    /// The text with its arguments put in. They must be what the text's markers say.
-    std::wstring format(unsigned id, ...);
-    std::wstring formatV(unsigned id, std::va_list args);
+    /// The text with its arguments put in.
+    template <class... Arguments>
+    std::wstring format(unsigned id, const Arguments&... arguments);
 
 private:
     mutable std::mutex _lock;  // of all below
@@ -50,9 +52,17 @@ private:
     std::shared_ptr<const Store> _store;
 };
 
-/// The formatting language on its own.
-std::wstring formatMessage(const wchar_t* text, ...);
-std::wstring formatMessageV(const wchar_t* text, std::va_list args);
+/// The formatting language on its own. Arguments that a text does not ask for are left out.
+std::wstring formatMessageV(const wchar_t* text, std::initializer_list<MessageArgument> arguments);
+template <class... Arguments>
+std::wstring formatMessage(const wchar_t* text, const Arguments&... arguments) {
+    return formatMessageV(text, {messageArgument(arguments)...});
+}
+
+template <class... Arguments>
+std::wstring RnMessageFile::format(unsigned id, const Arguments&... arguments) {
+    return formatMessage(getText(id).c_str(), arguments...);
+}
 
 /// A message cannot be looked up. Also caught as std::runtime_error.
 class RnMessageFileEx : public ExBase, public std::runtime_error {
@@ -82,7 +92,7 @@ RnMessageFile& messageFile();
 
 /// A text of it that takes no arguments, valid as long as the module is loaded. Errors and threads are those of
 /// RnMessageFile.
-const wchar_t* keptText(unsigned id);
+const wchar_t* keptText(Message<> message);
 
 /// Closes the catalogue, forgets its name and lets go of the kept texts: the module is about to be unloaded.
 void releaseTexts();

@@ -19,8 +19,6 @@ struct Piece {
     Directive spec;
 };
 
-using Argument = std::variant<std::int32_t, double, const wchar_t*>;
-
 bool isOneOf(wchar_t c, std::wstring_view set) { return set.find(c) != set.npos; }
 bool isDigit(wchar_t c) { return c >= L'0' && c <= L'9'; }
 bool isInteger(const Directive& spec) { return isOneOf(spec.letter, L"CXcdioux"); }
@@ -86,20 +84,18 @@ std::optional<std::vector<const Directive*>> orderMarkers(const std::vector<Piec
     return order;
 }
 
-std::vector<Argument> fetchArguments(const std::vector<const Directive*>& markers, std::va_list args) {
-    std::vector<Argument> arguments;
-    for (const Directive* spec : markers) {
-        if (isInteger(*spec))
-            arguments.emplace_back(std::int32_t{va_arg(args, int)});
-        else if (isDouble(*spec))
-            arguments.emplace_back(va_arg(args, double));
-        else
-            arguments.emplace_back(static_cast<const wchar_t*>(va_arg(args, const wchar_t*)));
-    }
-    return arguments;
+/// Whether each marker prints the kind of its argument.
+bool fit(const std::vector<const Directive*>& markers, std::initializer_list<MessageArgument> arguments) {
+    if (markers.size() > arguments.size()) return false;
+    return std::equal(markers.begin(), markers.end(), arguments.begin(),
+                      [](const auto* spec, const auto& argument) {
+                          if (isInteger(*spec)) return std::holds_alternative<std::int32_t>(argument);
+                          if (isDouble(*spec)) return std::holds_alternative<double>(argument);
+                          return std::holds_alternative<const wchar_t*>(argument);
+                      });
 }
 
-void appendArgument(std::wstring& out, const Directive& spec, const Argument& argument) {
+void appendArgument(std::wstring& out, const Directive& spec, const MessageArgument& argument) {
     if (const auto* integer = std::get_if<std::int32_t>(&argument))
         appendInteger(out, spec, *integer);
     else if (const auto* number = std::get_if<double>(&argument))
@@ -110,26 +106,17 @@ void appendArgument(std::wstring& out, const Directive& spec, const Argument& ar
 
 }  // namespace
 
-std::wstring formatMessageV(const wchar_t* text, std::va_list args) {
+std::wstring formatMessageV(const wchar_t* text, std::initializer_list<MessageArgument> arguments) {
     const auto pieces = cutText(text);
     const auto markers = pieces ? orderMarkers(*pieces) : std::nullopt;
-    if (!markers) return std::wstring(L"MALFORMED FORMATTING STRING: ") + text;
+    if (!markers || !fit(*markers, arguments)) return std::wstring(L"MALFORMED FORMATTING STRING: ") + text;
     if (markers->empty()) return text;
 
-    const std::vector<Argument> arguments = fetchArguments(*markers, args);
     std::wstring result;
     for (const Piece& piece : *pieces) {
         result += piece.text;
-        if (piece.number > 0) appendArgument(result, piece.spec, arguments[piece.number - 1]);
+        if (piece.number > 0) appendArgument(result, piece.spec, arguments.begin()[piece.number - 1]);
     }
-    return result;
-}
-
-std::wstring formatMessage(const wchar_t* text, ...) {
-    std::va_list args;
-    va_start(args, text);
-    std::wstring result = formatMessageV(text, args);
-    va_end(args);
     return result;
 }
 

@@ -52,6 +52,13 @@ TEST(MessageFormat, MalformedTextsStandUnformatted) {
         EXPECT_EQ(formatMessage(text), std::wstring(L"MALFORMED FORMATTING STRING: ") + text);
 }
 
+TEST(MessageFormat, MarkersThatDoNotFitTheirArgumentAreMalformed) {
+    for (const wchar_t* text :
+         {L"%1 %2!d! %3!g! %4", L"%1!d!", L"%1!g!", L"%1 %2", L"%1 %2!f!", L"%1 %2!d! %3!c!"})
+        EXPECT_EQ(formatMessage(text, L"a", 7, 0.5), std::wstring(L"MALFORMED FORMATTING STRING: ") + text);
+    EXPECT_EQ(formatMessage(L"%1", L"a", 7, 0.5), L"a");  // a text need not show all
+}
+
 TEST(MessageFormat, LongArgumentsAreNotCut) {
     const std::wstring text(100000, L'x');
     EXPECT_EQ(formatMessage(L"%1%2", text.c_str(), text.c_str()), text + text);

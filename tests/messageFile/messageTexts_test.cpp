@@ -9,6 +9,7 @@
 
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
+#include "components/photo/lid/reportMessage.h"
 #include "components/support/path.h"
 #include "host/sdk/util.h"
 #include "support/paths.h"
@@ -16,7 +17,7 @@
 // The texts of every language against the numbers and arguments of messageIds.h.
 
 namespace messages = OvPhotometrics::messages;
-using messages::Message;
+using Ov::MessageEntry;
 
 class MessageTexts : public testing::TestWithParam<const wchar_t*> {
 protected:
@@ -56,7 +57,7 @@ std::string argumentsOf(const std::wstring& text) {
 
 /// Formats a message with one argument for each letter of `types`; each is added to `shown` as it should appear.
 template <class... Arguments>
-std::wstring formatAs(const Message& message, const char* types, Ov::RnMessageFile& catalogue,
+std::wstring formatAs(const MessageEntry& message, const char* types, Ov::RnMessageFile& catalogue,
                       std::set<std::wstring>& shown, Arguments... arguments) {
     if constexpr (sizeof...(Arguments) < 3) {
         const int number = static_cast<int>(1234 + sizeof...(Arguments));
@@ -73,8 +74,25 @@ std::wstring formatAs(const Message& message, const char* types, Ov::RnMessageFi
     return catalogue.format(message.id, arguments...);
 }
 
+/// Whether a message can be reported with these arguments.
+template <auto message, class... Given>
+constexpr bool takes = requires(const OvPhotometrics::Report& report, Given... given) {
+    report.post(message, given...);
+    report.text(message, given...);
+};
+static_assert(takes<messages::tbtTripleRange, float, double, float> && takes<messages::webRefused>);
+static_assert(takes<messages::tbtSyntaxError, int, std::wstring, const wchar_t*>);
+static_assert(takes<messages::integerExpected, wchar_t> && takes<messages::lampCount, std::int32_t>);
+static_assert(!takes<messages::webRefused, int> && !takes<messages::tbtTripleRange, float, float>);
+static_assert(!takes<messages::lampCount> && !takes<messages::lampCount, int, int>);
+static_assert(!takes<messages::lampCount, double> && !takes<messages::lampCount, unsigned>);
+static_assert(!takes<messages::lampCount, const wchar_t*> && !takes<messages::lampCount, std::int64_t>);
+static_assert(!takes<messages::tbtFlux, std::wstring> && !takes<messages::tbtFlux, int>);
+static_assert(!takes<messages::fileNotRead, int> && !takes<messages::fileNotRead, std::string>);
+static_assert(!takes<messages::naturalLightLine, int, std::wstring>);  // in the other order
+
 TEST_P(MessageTexts, EveryNumberHasATextThatShowsItsArguments) {
-    for (const Message& message : messages::all) {
+    for (const MessageEntry& message : messages::all) {
         SCOPED_TRACE(message.id);
         const std::wstring text = catalogue.getText(message.id);
         ASSERT_FALSE(text.empty());
@@ -88,7 +106,7 @@ TEST_P(MessageTexts, EveryNumberHasATextThatShowsItsArguments) {
 
 TEST_P(MessageTexts, EveryTextHasANumber) {
     std::set<unsigned> numbers;
-    for (const Message& message : messages::all) EXPECT_TRUE(numbers.insert(message.id).second) << message.id;
+    for (const MessageEntry& message : messages::all) EXPECT_TRUE(numbers.insert(message.id).second) << message.id;
     for (unsigned id = 1; id <= 0xFFFF; ++id)
         EXPECT_EQ(catalogue.getText(id).empty(), !numbers.contains(id)) << id;
 }

@@ -21,8 +21,8 @@ constexpr PolarRules type1{cibseTolerance, messages::cibseType1VerticalRange,
 constexpr LateralRules type2{cibseTolerance, messages::cibseType2VerticalRange,
                              messages::cibseType2HorizontalCount, messages::cibseType2HorizontalRange};
 
-bool refuse(unsigned id) {
-    reportParseMessage(id);
+bool refuse(Ov::Message<> message) {
+    reportParseMessage(message);
     return false;
 }
 
@@ -36,7 +36,7 @@ bool readLabels(CibseRecord& rec, Ov::RnStream& in) {
     return true;
 }
 
-bool readGroup(NumberText& in, std::span<float> values, unsigned failure) {
+bool readGroup(NumberText& in, std::span<float> values, Ov::Message<> failure) {
     for (float& value : values) in.readFloat(value);
     return !in.failed() || refuse(failure);
 }

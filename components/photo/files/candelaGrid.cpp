@@ -23,7 +23,7 @@ std::vector<float> evenAngles(int count, double last) {
     return angles;
 }
 
-bool readGroup(NumberText& in, int count, std::vector<float>& values, unsigned failure) {
+bool readGroup(NumberText& in, int count, std::vector<float>& values, Ov::Message<> failure) {
     if (in.readFloats(static_cast<std::size_t>(count), values)) return true;
     reportParseMessage(failure);
     return false;

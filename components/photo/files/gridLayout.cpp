@@ -16,13 +16,9 @@ struct Tolerance {
     bool about(float a, float b) const { return a + t >= b && a <= b + t; }
 };
 
-bool refuse(unsigned id) {
-    reportMessage(id);
-    return false;
-}
-
-bool refuse(unsigned id, float angle) {
-    reportMessage(id, static_cast<double>(angle));
+template <class... Types>
+bool refuse(Ov::Message<Types...> message, Ov::ArgumentFor<Types>... arguments) {
+    reportMessage(message, arguments...);
     return false;
 }
 

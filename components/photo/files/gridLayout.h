@@ -1,5 +1,6 @@
 #pragma once
 
+#include "components/messageFile/typedMessage.h"
 #include "components/photo/files/candelaGrid.h"
 #include "components/photo/lid/photoWeb.h"
 
@@ -20,16 +21,16 @@ struct WebLayout {
 /// The tolerance of a format, in degrees, and the messages for what its layouts refuse.
 struct PolarRules {
     float tolerance;
-    unsigned verticalRange;
-    unsigned lastHorizontal;   // argument: the angle
-    unsigned firstHorizontal;  // argument: the angle
-    bool from270 = false;      // planes may start at 270 and run on through 0
+    Ov::Message<> verticalRange;
+    Ov::Message<double> lastHorizontal;   // the angle
+    Ov::Message<double> firstHorizontal;  // the angle
+    bool from270 = false;                 // planes may start at 270 and run on through 0
 };
 struct LateralRules {
     float tolerance;
-    unsigned verticalRange;
-    unsigned horizontalCount;
-    unsigned horizontalRange;
+    Ov::Message<> verticalRange;
+    Ov::Message<> horizontalCount;
+    Ov::Message<> horizontalRange;
 };
 
 // Angles must not decrease (12943, 12944), but for planes from 270.

@@ -40,26 +40,26 @@ bool matchesAt(Ov::RnBufferedIO& io, const wchar_t* text) {
     return *text == 0;
 }
 
-template <class... Arguments>
-bool NumberText::fail(unsigned id, Arguments... arguments) {
+template <class... Types>
+bool NumberText::fail(Ov::Message<Types...> message, Ov::ArgumentFor<Types>... arguments) {
     _failed = true;
     if (!_report) _report.emplace();
-    _report->postParseMessage(id, arguments...);
+    _report->postParseMessage(message, arguments...);
     return false;
 }
 
 /// Goes to the start of the next number. Without one that is reported, and `instead` is what the number gives.
-bool NumberText::findNumber(unsigned unexpected, std::int32_t& instead) {
+bool NumberText::findNumber(Ov::Message<wchar_t> unexpected, std::int32_t& instead) {
     const int c = _chars.chars().takeWhile(isBetween);
     if (startsNumber(c)) return true;
     instead = 0;
     if (c >= 0) {
         _chars.getChar();
-        return fail(unexpected, c == 0 ? ' ' : c);  // a NUL would end the message
+        return fail(unexpected, c == 0 ? L' ' : static_cast<wchar_t>(c));  // a NUL would end the message
     }
     const bool first = !_ended;
     _ended = true;
-    if (_atEnd == AtEnd::unexpectedBlank) return first && fail(unexpected, ' ');
+    if (_atEnd == AtEnd::unexpectedBlank) return first && fail(unexpected, L' ');
     instead = -1;
     return first && fail(messages::numberNotConverted);
 }
@@ -86,7 +86,8 @@ bool NumberText::readInteger(std::int32_t& value) {
     return fail(messages::numberNotConverted);
 }
 
-bool NumberText::readInteger(std::int32_t& value, unsigned failure, std::int32_t least, std::int32_t most) {
+bool NumberText::readInteger(std::int32_t& value, Ov::Message<int> failure, std::int32_t least,
+                             std::int32_t most) {
     readInteger(value);
     return (value >= least && value <= most) || fail(failure, value);
 }

@@ -39,7 +39,7 @@ public:
     /// A fraction of zeros ("73.0") counts as part of an integer.
     bool readInteger(std::int32_t& value);
     /// An integer from `least` to `most`; another value is reported through `failure`, its argument.
-    bool readInteger(std::int32_t& value, unsigned failure, std::int32_t least,
+    bool readInteger(std::int32_t& value, Ov::Message<int> failure, std::int32_t least,
                      std::int32_t most = std::numeric_limits<std::int32_t>::max());
     bool readFloat(float& value);
     /// Reads a group to its end, even when a number fails; only the end of the input ends it. Memory is taken as
@@ -51,11 +51,11 @@ public:
     bool ended() const { return _ended; }
 
 private:
-    bool findNumber(unsigned unexpected, std::int32_t& instead);
+    bool findNumber(Ov::Message<wchar_t> unexpected, std::int32_t& instead);
     bool atNumberEnd();
     void skipZeroFraction();
-    template <class... Arguments>
-    bool fail(unsigned id, Arguments... arguments);
+    template <class... Types>
+    bool fail(Ov::Message<Types...> message, Ov::ArgumentFor<Types>... arguments);
 
     Ov::RnStream& _in;
     Ov::RnStreamInput _chars;

@@ -15,13 +15,11 @@ namespace {
 
 constexpr std::wstring_view tiltKey = L"TILT=";
 
-template <class... Arguments>
-bool refuse(unsigned id, Arguments... arguments) {
-    reportParseMessage(id, arguments...);
+template <class... Types>
+bool refuse(Ov::Message<Types...> message, Ov::ArgumentFor<Types>... arguments) {
+    reportParseMessage(message, arguments...);
     return false;
 }
-
-double widened(float value) { return value; }
 
 /// Header lines up to the TILT= line, whose value is `tiltValue`.
 bool readHeader(IesFileRecord& rec, Ov::RnStream& in, std::wstring& tiltValue) {
@@ -48,7 +46,7 @@ bool isWord(std::wstring_view text, std::wstring_view word) {
 bool readTiltFile(IesFileRecord& rec, const wchar_t* basePath) {
     const std::wstring path = iesFindTiltFile(rec.tiltFile, basePath);
     if (path.empty()) {
-        reportMessage(messages::tiltFileNotFound, rec.tiltFile.c_str());
+        reportMessage(messages::tiltFileNotFound, rec.tiltFile);
         return false;
     }
     try {
@@ -58,7 +56,7 @@ bool readTiltFile(IesFileRecord& rec, const wchar_t* basePath) {
         }
     } catch (const Ov::RnStreamEx::ExReadError&) {  // it is not the device of the stream that fails
     }
-    reportMessage(messages::tiltFileNotOpened, path.c_str());
+    reportMessage(messages::tiltFileNotOpened, path);
     return false;
 }
 
@@ -80,13 +78,13 @@ bool readTiltAngles(NumberText& in, int pairs, std::vector<float>& angles) {
     for (int i = 0; i < pairs && !in.ended(); ++i) {
         const bool previousComparable = comparable;
         comparable = in.readFloat(angle);
-        if (comparable && i == 0 && angle != 0) return refuse(messages::tiltFirstAngle, widened(angle));
+        if (comparable && i == 0 && angle != 0) return refuse(messages::tiltFirstAngle, angle);
         if (comparable && previousComparable && i > 0 && !(angle > angles.back()))
-            return refuse(messages::tiltAngleOrder, widened(angles.back()), widened(angle));
+            return refuse(messages::tiltAngleOrder, angles.back(), angle);
         angles.push_back(angle);
     }
-    const auto about = [&](float limit) { return std::fabs(widened(angle) - limit) <= 0.1; };
-    if (comparable && !about(90) && !about(180)) return refuse(messages::tiltLastAngle, widened(angle));
+    const auto about = [&](float limit) { return std::fabs(double{angle} - limit) <= 0.1; };
+    if (comparable && !about(90) && !about(180)) return refuse(messages::tiltLastAngle, angle);
     return !in.failed() || refuse(messages::tiltAngles, pairs);
 }
 

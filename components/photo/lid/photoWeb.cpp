@@ -5,6 +5,7 @@
 #include <cmath>
 #include <limits>
 #include <new>
+#include <optional>
 #include <vector>
 
 #include "components/messageFile/messageIds.h"
@@ -155,23 +156,25 @@ bool canBeHeld(float lumens, float maxCandela) {
     return std::isfinite(factor) && std::isfinite(candela) && std::isfinite(candela * factor);
 }
 
-/// The message that refuses the last psi for the symmetry, or 0.
-unsigned refusedPsiRange(const PhotoWebRecord& rec) {
-    const auto outside = [&](float limit) {
+/// The message that refuses the last psi for the symmetry, if any.
+std::optional<Ov::Message<>> refusedPsiRange(const PhotoWebRecord& rec) {
+    const auto refusedOutside = [&](float limit, Ov::Message<> message) -> std::optional<Ov::Message<>> {
         const float last = rec.psis[rec.npsis - 1];
-        return compareAngles(last, 0) <= 0 || compareAngles(last, limit) > 0;
+        if (compareAngles(last, 0) <= 0 || compareAngles(last, limit) > 0) return message;
+        return std::nullopt;
     };
     switch (rec.symmetry) {
         case PhotoWebSymmetry::Full:
-            return outside(twoPi) ? messages::fullRange : 0;
+            return refusedOutside(twoPi, messages::fullRange);
         case PhotoWebSymmetry::Half:
-            return outside(pi) ? messages::halfRange : 0;
+            return refusedOutside(pi, messages::halfRange);
         case PhotoWebSymmetry::Quarter:
-            return outside(halfPi) ? messages::quarterRange : 0;
+            return refusedOutside(halfPi, messages::quarterRange);
         case PhotoWebSymmetry::Axial:
-            return rec.npsis != 1 ? messages::axialCount : 0;
+            if (rec.npsis != 1) return messages::axialCount;
+            break;
     }
-    return 0;
+    return std::nullopt;
 }
 
 /// The value, or the nearest that is finite; 0 for none.
@@ -180,7 +183,7 @@ float held(float value) {
     return value == value ? std::clamp(value, -most, most) : 0;
 }
 
-unsigned refusedAngles(const PhotoWebRecord& rec) {
+std::optional<Ov::Message<>> refusedAngles(const PhotoWebRecord& rec) {
     if (!ascends(rec.thetas.get(), rec.nthetas)) return messages::verticalAnglesNotAscending;
     if (!ascends(rec.psis, rec.npsis)) return messages::horizontalAnglesNotAscending;
     if (compareAngles(rec.psis[0], 0) != 0) return messages::firstHorizontalAngleNotZero;
@@ -259,8 +262,8 @@ float photoWebIntegrate(int n, const float* angles, const float* values) {
 
 bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     if (rec.nthetas <= 0 || rec.npsis <= 0) return false;
-    if (const unsigned refused = refusedAngles(rec)) {
-        reportMessage(refused);
+    if (const auto refused = refusedAngles(rec)) {
+        reportMessage(*refused);
         return false;
     }
 

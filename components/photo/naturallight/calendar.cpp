@@ -10,8 +10,8 @@ namespace OvPhotometrics {
 namespace {
 
 struct Month {
-    std::int32_t name;  // numbers of messages
-    std::int32_t shortName;
+    Ov::Message<> name;
+    Ov::Message<> shortName;
     std::int32_t days;
     std::int32_t daysBefore;
 };
@@ -34,9 +34,9 @@ constexpr Month months[monthsInYear] = {
 /// The row of a month 1..12, or null.
 const Month* findMonth(int month) { return month >= 1 && month <= monthsInYear ? &months[month - 1] : nullptr; }
 
-const wchar_t* monthText(int month, std::int32_t Month::*message) {
+const wchar_t* monthText(int month, Ov::Message<> Month::*message) {
     const Month* row = findMonth(month);
-    return row ? Ov::keptText(static_cast<unsigned>(row->*message)) : L"";
+    return row ? Ov::keptText(row->*message) : L"";
 }
 
 }  // namespace

@@ -72,30 +72,30 @@ public:
 
     /// Reads `count` fields; `message` when there are fewer.
     template <class... Targets>
-    bool fields(int count, unsigned message, const wchar_t* format, Targets*... targets) {
+    bool fields(int count, Ov::Message<> message, const wchar_t* format, Targets*... targets) {
         return _in.formattedRead(format, targets...) == count || fail(message);
     }
 
-    bool number(unsigned message, const wchar_t* format, float& value) {
+    bool number(Ov::Message<> message, const wchar_t* format, float& value) {
         double read = 0;
         if (!fields(1, message, format, &read)) return false;
         value = static_cast<float>(read);
         return isWritable(value, message);
     }
 
-    bool degrees(unsigned message, const wchar_t* format, float& radians) {
+    bool degrees(Ov::Message<> message, const wchar_t* format, float& radians) {
         double read = 0;
         if (!fields(1, message, format, &read)) return false;
         radians = toRadians(read);
         return isWritable(static_cast<float>(inDegrees(radians)), message);
     }
 
-    bool color(unsigned message, const wchar_t* format, std::array<float, 3>& c) {
+    bool color(Ov::Message<> message, const wchar_t* format, std::array<float, 3>& c) {
         return fields(3, message, format, &c[0], &c[1], &c[2]);
     }
 
     /// A word that starts with one of two others; `wordMessage` when it starts with neither.
-    bool word(unsigned message, unsigned wordMessage, const wchar_t* format, const wchar_t* whenFalse,
+    bool word(Ov::Message<> message, Ov::Message<> wordMessage, const wchar_t* format, const wchar_t* whenFalse,
               const wchar_t* whenTrue, bool& value) {
         wchar_t word[4] = {};
         if (!fields(1, message, format, word)) return false;
@@ -104,14 +104,14 @@ public:
     }
 
     /// "Yes", or any other word for no.
-    bool yes(unsigned message, const wchar_t* format, bool& value) {
+    bool yes(Ov::Message<> message, const wchar_t* format, bool& value) {
         wchar_t word[4] = {};
         if (!fields(1, message, format, word)) return false;
         value = startsWith(word, L"Yes");
         return true;
     }
 
-    bool flags(unsigned message, const wchar_t* format, void (*set)(Settings&, unsigned), Settings& s) {
+    bool flags(Ov::Message<> message, const wchar_t* format, void (*set)(Settings&, unsigned), Settings& s) {
         unsigned short word = 0;
         if (!fields(1, message, format, &word)) return false;
         set(s, word);
@@ -123,8 +123,8 @@ private:
         return std::wcsncmp(word, start, std::wcslen(start)) == 0;
     }
     /// A number that no float holds is none: it could not be written.
-    bool isWritable(float number, unsigned message) { return std::isfinite(number) || fail(message); }
-    bool fail(unsigned message) {
+    bool isWritable(float number, Ov::Message<> message) { return std::isfinite(number) || fail(message); }
+    bool fail(Ov::Message<> message) {
         reportFormError(message, _in.computeLineNb());
         return false;
     }
@@ -199,7 +199,7 @@ bool writeDaylightText(RnStream& out, const Settings& s) {
     TextWriter trial(nullptr);
     writeLines(trial, s);
     if (!trial.notFinite().empty()) {
-        reportMessage(m::lightNotFinite, trial.notFinite().c_str());
+        reportMessage(m::lightNotFinite, trial.notFinite());
         return false;
     }
     TextWriter text(&out);

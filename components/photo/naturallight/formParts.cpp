@@ -33,10 +33,10 @@ std::uint16_t skyFlagWord(const Settings& s) { return flagWord(s.skyCastsShadows
 void setSunFlags(Settings& s, unsigned word) { setFlags(word, s.sunCastsShadows, s.sunFlag2, s.sunFlag3); }
 void setSkyFlags(Settings& s, unsigned word) { setFlags(word, s.skyCastsShadows, s.skyFlag2, s.skyFlag3); }
 
-void reportFormError(unsigned message, int line) {
+void reportFormError(Ov::Message<> message, int line) {
     const Report report;
     const std::wstring detail = report.rawText(message);
-    report.postWrapped(detail, messages::naturalLightLine, detail.c_str(), line);
+    report.postWrapped(detail, messages::naturalLightLine, detail, line);
 }
 
 }  // namespace OvPhotometrics

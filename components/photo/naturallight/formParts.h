@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "components/messageFile/typedMessage.h"
 #include "ovphoto/naturalLight.h"
 
 // What the text and the binary form of natural light share.
@@ -20,6 +21,6 @@ void setSkyFlags(Ov::NaturalLightSettings& settings, unsigned word);
 
 /// Reports a message's text as it stands, and the line, inside message 12896. Without a catalogue the report is
 /// the message's number.
-void reportFormError(unsigned message, int line);
+void reportFormError(Ov::Message<> message, int line);
 
 }  // namespace OvPhotometrics

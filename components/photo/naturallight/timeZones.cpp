@@ -12,7 +12,7 @@ namespace OvPhotometrics {
 namespace {
 
 struct TimeZone {
-    std::uint32_t name;  // number of the message; 0 ends the table
+    Ov::Message<> name;
     float offset;        // hours, west positive
     float lower, upper;  // bounds of the longitude in degrees, west positive; upper <= lower: across 180 degrees
     std::int32_t flag;
@@ -50,16 +50,9 @@ constexpr TimeZone zones[] = {
     {messages::zoneAzores, 1, -15, 45, 0},
     {messages::zoneMidAtlantic, 2, 0, 60, 0},
     {messages::zoneBrasilia, 3, 0, 90, 0},
-    {0, 0, 0, 0, 0},
 };
 
-constexpr int countZones() {
-    int count = 0;
-    while (zones[count].name != 0) ++count;
-    return count;
-}
-
-constexpr int zoneCount = countZones();
+constexpr int zoneCount = std::size(zones);
 constexpr float pi = 3.1415927F;
 
 /// The row of a valid index, or null.

@@ -31,11 +31,11 @@ public:
     }
 
     /// Reports what is wrong with the current line; false.
-    template <class... Arguments>
-    bool refuse(unsigned id, Arguments... arguments) const {
+    template <class... Types>
+    bool refuse(Ov::Message<Types...> message, Ov::ArgumentFor<Types>... arguments) const {
         const Report report;
-        const std::wstring detail = report.text(id, arguments...);
-        report.postWrapped(detail, messages::nimbLine, _number, detail.c_str());
+        const std::wstring detail = report.text(message, arguments...);
+        report.postWrapped(detail, messages::nimbLine, _number, detail);
         return false;
     }
 
@@ -95,7 +95,7 @@ bool isSymmetryCode(int code) { return code >= -1 && code <= 3; }
 bool checkHeader(const NimbRecord& rec, const Lines& lines) {
     const struct {
         bool valid;
-        unsigned message;
+        Ov::Message<int> message;
         std::int32_t value;
     } checks[] = {
         {rec.psiMax == 0 || rec.psiMax == 90 || rec.psiMax == 180 || rec.psiMax == 360 - rec.psiStep,

@@ -12,22 +12,43 @@ namespace {
 
 constexpr std::int32_t anyCount = std::numeric_limits<std::int32_t>::max();
 
+/// What the current token is, for people; empty where that is too long to show.
+std::wstring description(const Report& report, const TbtTokenizer& in) {
+    constexpr std::size_t longest = 63;
+    std::wstring text;
+    switch (in.kind()) {
+        case TbtToken::number:
+            text = report.text(messages::tbtTokenNumber, in.text());
+            break;
+        case TbtToken::zeroFill:
+            text = report.text(messages::tbtTokenZeroFill, in.text());
+            break;
+        case TbtToken::end:
+            text = report.text(messages::tbtTokenEnd, in.text());
+            break;
+        case TbtToken::endOfFile:
+            text = report.text(messages::tbtTokenEndOfFile);
+            break;
+        case TbtToken::other:
+            text = report.text(messages::tbtTokenOther, in.text());
+            break;
+    }
+    return text.size() <= longest ? text : std::wstring();
+}
+
 /// Something else stands where a number, fill or end marker must stand.
-bool syntaxError(const TbtTokenizer& in, unsigned id) {
-    constexpr std::size_t longestDescription = 63;
+bool syntaxError(const TbtTokenizer& in, Ov::Message<> message) {
     const Report report;
-    const std::wstring detail = report.text(id);
-    const std::wstring found = report.text(static_cast<unsigned>(in.kind()), in.text().c_str());
-    report.postWrapped(detail, messages::tbtSyntaxError, in.lineFeeds(), detail.c_str(),
-                       found.size() <= longestDescription ? found.c_str() : nullptr);
+    const std::wstring detail = report.text(message);
+    report.postWrapped(detail, messages::tbtSyntaxError, in.lineFeeds(), detail, description(report, in));
     return false;
 }
 
-template <class... Values>
-bool valueError(const TbtTokenizer& in, unsigned id, Values... values) {
+template <class... Types>
+bool valueError(const TbtTokenizer& in, Ov::Message<Types...> message, Ov::ArgumentFor<Types>... values) {
     const Report report;
-    const std::wstring detail = report.text(id, values...);
-    report.postWrapped(detail, messages::tbtValueError, in.lineFeeds(), detail.c_str());
+    const std::wstring detail = report.text(message, values...);
+    report.postWrapped(detail, messages::tbtValueError, in.lineFeeds(), detail);
     return false;
 }
 
@@ -38,15 +59,13 @@ bool outOfMemory() {
     return false;
 }
 
-double widened(float value) { return value; }
-
-bool readFloat(TbtTokenizer& in, float& value, unsigned missing) {
+bool readFloat(TbtTokenizer& in, float& value, Ov::Message<> missing) {
     in.next();
     return in.number(value) || syntaxError(in, missing);
 }
 
-bool readInteger(TbtTokenizer& in, std::int32_t& value, unsigned missing, std::int32_t least, std::int32_t most,
-                 unsigned wrong) {
+bool readInteger(TbtTokenizer& in, std::int32_t& value, Ov::Message<> missing, std::int32_t least,
+                 std::int32_t most, Ov::Message<int> wrong) {
     if (in.next() != TbtToken::number) return syntaxError(in, missing);
     return (in.integer(value) && value >= least && value <= most) || valueError(in, wrong, value);
 }
@@ -70,14 +89,14 @@ bool readTriple(TbtTokenizer& in, std::array<float, 3>& triple) {
     for (float& value : triple)
         if (!readFloat(in, value, messages::tbtTripleMissing)) return false;
     return std::all_of(triple.begin(), triple.end(), [](float value) { return value >= 0 && value <= 1; }) ||
-           valueError(in, messages::tbtTripleRange, widened(triple[0]), widened(triple[1]), widened(triple[2]));
+           valueError(in, messages::tbtTripleRange, triple[0], triple[1], triple[2]);
 }
 
 bool readScalars(TbtTokenizer& in, TbtFileRecord& rec) {
     if (!readFloat(in, rec.flux, messages::tbtFluxMissing)) return false;
-    if (rec.flux < 0) return valueError(in, messages::tbtFlux, widened(rec.flux));
+    if (rec.flux < 0) return valueError(in, messages::tbtFlux, rec.flux);
     if (!readFloat(in, rec.referenceFlux, messages::tbtReferenceFluxMissing)) return false;
-    if (rec.referenceFlux <= 0) return valueError(in, messages::tbtReferenceFlux, widened(rec.referenceFlux));
+    if (rec.referenceFlux <= 0) return valueError(in, messages::tbtReferenceFlux, rec.referenceFlux);
     return readFloat(in, rec.multiplier, messages::tbtMultiplierMissing) &&
            readFloat(in, rec.auxValue1, messages::tbtAuxValue1Missing) &&
            readFloat(in, rec.auxValue2, messages::tbtAuxValue2Missing) &&

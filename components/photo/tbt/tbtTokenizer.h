@@ -3,18 +3,16 @@
 #include <cstdint>
 #include <string>
 
-#include "components/messageFile/messageIds.h"
 #include "components/support/streamText.h"
 
 namespace OvPhotometrics {
 
-/// The kinds of tokens, valued as the messages that describe one.
-enum class TbtToken : unsigned {
-    number = messages::tbtTokenNumber,      // digits, fraction and exponent, no sign
-    zeroFill = messages::tbtTokenZeroFill,  // "Z0" or "z0"
-    end = messages::tbtTokenEnd,            // "-1"
-    endOfFile = messages::tbtTokenEndOfFile,
-    other = messages::tbtTokenOther,  // any other character, or a number of more than 80
+enum class TbtToken {
+    number,    // digits, fraction and exponent, no sign
+    zeroFill,  // "Z0" or "z0"
+    end,       // "-1"
+    endOfFile,
+    other,  // any other character, or a number of more than 80
 };
 
 /// Takes TBT text apart: a title line, then tokens between white space and /* comments */. A comment that is not
