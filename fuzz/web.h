@@ -43,12 +43,9 @@ inline void demandInstalled(const Ov::RnPhotoWebData& web) {
     demand(!psis.empty() && isWhole(psis) && compareAngles(psis.front(), 0) == 0,
            "horizontal angles ascend from 0");
     const auto symmetry = web.getSymmetry();
-    const float circle = symmetry == PhotoWebSymmetry::Full   ? twoPi
-                         : symmetry == PhotoWebSymmetry::Half ? pi
-                                                              : halfPi;
-    demand(symmetry == PhotoWebSymmetry::Axial
-               ? psis.size() == 1
-               : psis.size() >= 2 && compareAngles(psis.back(), 0) > 0 && compareAngles(psis.back(), circle) <= 0,
+    demand(symmetry == PhotoWebSymmetry::Axial ? psis.size() == 1
+                                               : psis.size() >= 2 && compareAngles(psis.back(), 0) > 0 &&
+                                                     compareAngles(psis.back(), psiExtent(symmetry)) <= 0,
            "horizontal angles fit the symmetry");
 
     const float peak = web.getMaxCandela();

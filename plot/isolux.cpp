@@ -38,9 +38,9 @@ Grid sampledPlane(const Subject& subject, double height, double half) {
             };
             const double x = place(column);
             const double y = -place(row);
-            const double gamma = std::atan2(std::hypot(x, y), height) * 180 / std::numbers::pi;
+            const double gamma = degrees(std::atan2(std::hypot(x, y), height));
             grid.values.push_back(
-                horizontalIlluminance(subject, gamma, std::atan2(y, x) * 180 / std::numbers::pi, height));
+                horizontalIlluminance(subject, gamma, degrees(std::atan2(y, x)), height));
         }
     }
     return grid;

@@ -10,6 +10,7 @@ namespace OvPlot {
 using Vector = Ov::GeVector3<double>;
 
 inline double radians(double degrees) { return degrees * std::numbers::pi / 180; }
+inline double degrees(double radians) { return radians * 180 / std::numbers::pi; }
 
 /// The intensity of a light towards a direction of its local frame.
 inline float intensityTowards(const Ov::RnIntensityDist& light, const Vector& direction) {

@@ -31,6 +31,4 @@ inline std::array<CompassPoint, 4> compassPoints(const char* east) {
     return {{{"N", 180}, {east, -90}, {"S", 0}, {"W", 90}}};
 }
 
-inline double degrees(double radian) { return radian * 180 / std::numbers::pi; }
-
 }  // namespace OvPlot

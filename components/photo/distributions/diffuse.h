@@ -1,6 +1,7 @@
 #pragma once
 
 #include "components/photo/distributions/analytic.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "ovphoto/classIds.h"
 
@@ -19,10 +20,7 @@ public:
     float law(float cosine) const { return cosine > 0 ? orDark(cosine * candela) : 0; }
     float getFlux() const override { return orDark(candela * pi); }
     void setFlux(float lumens) override { candela = lumens / pi; }
-    AngleRange getThetaRange() const override { return {0, 1.5707964f}; }
-
-private:
-    static constexpr float pi = 3.1415927f;
+    AngleRange getThetaRange() const override { return {0, halfPi}; }
 };
 
 using DiffuseBuilder = ObjectBuilder<Diffuse>;

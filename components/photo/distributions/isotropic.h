@@ -1,6 +1,7 @@
 #pragma once
 
 #include "components/photo/distributions/analytic.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "ovphoto/classIds.h"
 
@@ -21,10 +22,7 @@ public:
     float intensityAtUnit(const GeVector3<float>&) const override { return orDark(candela); }
     float getFlux() const override { return orDark(candela * fourPi); }
     void setFlux(float lumens) override { candela = lumens / fourPi; }
-    AngleRange getThetaRange() const override { return {0, 3.1415927f}; }
-
-private:
-    static constexpr float fourPi = 12.566371f;
+    AngleRange getThetaRange() const override { return {0, pi}; }
 };
 
 using IsotropicBuilder = ObjectBuilder<Isotropic>;

@@ -2,13 +2,15 @@
 
 #include <algorithm>
 
+#include "components/photo/lid/angles.h"
+
 namespace OvPhotometrics {
 
 namespace {
 
 /// The integral of cosine^exponent over the cone; over the whole hemisphere where `cosFalloff` is not above 0.
 float coneFlux(float exponent, float cosFalloff) {
-    float flux = static_cast<float>(6.283185307179586 / (static_cast<double>(exponent) + 1));
+    float flux = static_cast<float>(2 * exactPi / (static_cast<double>(exponent) + 1));
     if (cosFalloff > 0) flux *= 1 - single::power(cosFalloff, exponent + 1);
     return flux;
 }

@@ -128,17 +128,7 @@ GeVector3<float> Web::toLocalNormalized(const GeVector3<float>& direction) const
 AngleRange Web::getPsiRange() const {
     if (!_web) return {};
     if (_web->isPsiTruncated()) return _web->getPsiRange();
-    switch (_web->getSymmetry()) {
-        case PhotoWebSymmetry::Full:
-            return {0, twoPi};
-        case PhotoWebSymmetry::Half:
-            return {0, pi};
-        case PhotoWebSymmetry::Quarter:
-            return {0, halfPi};
-        case PhotoWebSymmetry::Axial:
-            break;
-    }
-    return {};
+    return {0, psiExtent(_web->getSymmetry())};
 }
 
 void Web::setWeb(Ov::RnCastable* web) { hold(Ov::rnQuery<Ov::RnPhotoWebData>(web)); }

@@ -29,19 +29,12 @@ bool readGroup(NumberText& in, int count, std::vector<float>& values, Ov::Messag
     return false;
 }
 
+constexpr int samplingStep = 10;  // degrees
+
 int sampledPlanes(PhotoWebSymmetry symmetry, LastPlane lastPlane) {
-    const int last = lastPlane == LastPlane::with ? 1 : 0;
-    switch (symmetry) {
-        case PhotoWebSymmetry::Full:
-            return 36;
-        case PhotoWebSymmetry::Half:
-            return 18 + last;
-        case PhotoWebSymmetry::Quarter:
-            return 9 + last;
-        case PhotoWebSymmetry::Axial:
-            break;
-    }
-    return 1;
+    if (symmetry == PhotoWebSymmetry::Axial) return 1;
+    const bool closes = symmetry == PhotoWebSymmetry::Full;  // its last plane is the first
+    return psiExtentInDegrees(symmetry) / samplingStep + (lastPlane == LastPlane::with && !closes ? 1 : 0);
 }
 
 }  // namespace
@@ -121,12 +114,13 @@ bool candelaGridFromWeb(CandelaGrid& grid, const Ov::RnPhotoWebData& web, GridFi
 
 bool candelaGridFromSampling(CandelaGrid& grid, const Ov::RnIntensityDist& dist, LastPlane lastPlane,
                              float factor) {
-    constexpr int step = 10;  // degrees
-    if (!candelaGridAlloc(grid, 180 / step + 1, sampledPlanes(dist.getSymmetry(), lastPlane))) return false;
+    if (!candelaGridAlloc(grid, 180 / samplingStep + 1, sampledPlanes(dist.getSymmetry(), lastPlane)))
+        return false;
     for (int j = 0; j < grid.horizontalCount; ++j) {
-        grid.horizontalAngles[static_cast<std::size_t>(j)] = static_cast<float>(step * j);
+        grid.horizontalAngles[static_cast<std::size_t>(j)] = static_cast<float>(samplingStep * j);
         for (int i = 0; i < grid.verticalCount; ++i)
-            grid.candela(i, j) = dist.localIntensity(toRadians(step * i), toRadians(step * j)) * factor;
+            grid.candela(i, j) =
+                dist.localIntensity(toRadians(samplingStep * i), toRadians(samplingStep * j)) * factor;
     }
     return true;
 }

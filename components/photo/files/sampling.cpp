@@ -16,20 +16,6 @@ constexpr double stepOfFormulas = 5;    // where no web says how fine a distribu
 constexpr double allowedLoss = 0.0007;  // of the peak, midway on the edges of a cell; inside it is a little more
 constexpr double sameAngle = 0.005;     // degrees
 
-double endOf(PhotoWebSymmetry symmetry) {
-    switch (symmetry) {
-        case PhotoWebSymmetry::Full:
-            return 360;
-        case PhotoWebSymmetry::Half:
-            return 180;
-        case PhotoWebSymmetry::Quarter:
-            return 90;
-        case PhotoWebSymmetry::Axial:
-            break;
-    }
-    return 0;
-}
-
 /// What is left of a symmetry after a turn about the axis.
 PhotoWebSymmetry turned(PhotoWebSymmetry symmetry, double degrees) {
     const auto multipleOf = [&](double angle) { return std::fabs(std::remainder(degrees, angle)) < sameAngle; };
@@ -214,7 +200,7 @@ float HostView::overCell(double theta, double psi, const SamplingPlan& plan) con
     return static_cast<float>(sum / weights);
 }
 
-double SamplingPlan::lastPsi() const { return endOf(symmetry); }
+double SamplingPlan::lastPsi() const { return psiExtentInDegrees(symmetry); }
 
 SamplingPlan planSampling(Ov::RnIntensityDist& dist, const SamplingRules& rules) {
     const HostView view(dist);

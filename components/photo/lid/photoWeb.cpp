@@ -158,23 +158,15 @@ bool canBeHeld(float lumens, float maxCandela) {
 
 /// The message that refuses the last psi for the symmetry, if any.
 std::optional<Ov::Message<>> refusedPsiRange(const PhotoWebRecord& rec) {
-    const auto refusedOutside = [&](float limit, Ov::Message<> message) -> std::optional<Ov::Message<>> {
-        const float last = rec.psis[rec.npsis - 1];
-        if (compareAngles(last, 0) <= 0 || compareAngles(last, limit) > 0) return message;
-        return std::nullopt;
-    };
-    switch (rec.symmetry) {
-        case PhotoWebSymmetry::Full:
-            return refusedOutside(twoPi, messages::fullRange);
-        case PhotoWebSymmetry::Half:
-            return refusedOutside(pi, messages::halfRange);
-        case PhotoWebSymmetry::Quarter:
-            return refusedOutside(halfPi, messages::quarterRange);
-        case PhotoWebSymmetry::Axial:
-            if (rec.npsis != 1) return messages::axialCount;
-            break;
-    }
-    return std::nullopt;
+    const bool axial = rec.symmetry == PhotoWebSymmetry::Axial;
+    const float last = rec.psis[rec.npsis - 1];
+    const bool fits =
+        axial ? rec.npsis == 1 : compareAngles(last, 0) > 0 && compareAngles(last, psiExtent(rec.symmetry)) <= 0;
+    if (fits) return std::nullopt;
+    return axial                                       ? messages::axialCount
+           : rec.symmetry == PhotoWebSymmetry::Quarter ? messages::quarterRange
+           : rec.symmetry == PhotoWebSymmetry::Half    ? messages::halfRange
+                                                       : messages::fullRange;
 }
 
 /// The value, or the nearest that is finite; 0 for none.
@@ -191,12 +183,6 @@ std::optional<Ov::Message<>> refusedAngles(const PhotoWebRecord& rec) {
 }
 
 }  // namespace
-
-int compareAngles(float a, float b) {
-    constexpr double tolerance = 0.0043633231;
-    if (static_cast<double>(b) > a + tolerance) return -1;
-    return a > b + tolerance ? 1 : 0;
-}
 
 void photoWebRecordInit(PhotoWebRecord& rec, int nthetas, int npsis, PhotoWebSymmetry symmetry, bool psiTruncated,
                         bool loaded, const wchar_t* name) {

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "components/photo/lid/angleSearch.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/lid/gridEvaluation.h"
 #include "ovphoto/photoFile.h"
 
@@ -21,22 +22,8 @@ using Ov::AngleRange;
 using Ov::GeLinearMatrix3;
 using Ov::GeVector3;
 using Ov::IndexRange;
-using Ov::PhotoWebSymmetry;
 using Ov::RnEnum;
 using Ov::RnRef;
-
-// The single-precision angles that all range checks and foldings use.
-inline constexpr float pi = 3.1415927f;
-inline constexpr float twoPi = 6.2831855f;
-inline constexpr float halfPi = 1.5707964f;
-
-/// -1, 0 or +1 as a lies below, about at or above b, within 0.25 degree.
-int compareAngles(float a, float b);
-
-/// Degrees and radians in double, in this order of steps; an angle that is stored is rounded once.
-inline double inRadians(double degrees) { return degrees * 3.14159265358979323846 / 180.0; }
-inline double inDegrees(double radians) { return radians * 180.0 / 3.14159265358979323846; }
-inline float toRadians(double degrees) { return static_cast<float>(inRadians(degrees)); }
 
 /// A web as a reader fills it. Owns its blocks.
 struct PhotoWebRecord {

@@ -2,9 +2,8 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
-#include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/naturallight/calendar.h"
 #include "components/photo/naturallight/solar.h"
 
@@ -12,15 +11,13 @@ namespace OvPhotometrics {
 
 namespace {
 
-constexpr double exactPi = std::numbers::pi;
-
 float single(double value) { return static_cast<float>(value); }
 
 double finite(float value) { return std::isfinite(value) ? value : 0; }
 
 /// A longitude or meridian: 180 degrees and beyond count as -180.
 double meridian(float value) {
-    if (std::abs(value) >= exactPi) return -3.1415927f;
+    if (std::abs(value) >= exactPi) return -pi;
     return finite(value);
 }
 

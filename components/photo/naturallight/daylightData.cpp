@@ -1,6 +1,6 @@
 #include "components/photo/naturallight/daylightData.h"
 
-#include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/naturallight/calendar.h"
 #include "components/photo/naturallight/daylightForms.h"
 #include "host/componentManager/stream.h"

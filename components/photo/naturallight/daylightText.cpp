@@ -5,7 +5,7 @@
 #include <string>
 
 #include "components/messageFile/messageIds.h"
-#include "components/photo/lid/photoWeb.h"
+#include "components/photo/lid/angles.h"
 #include "components/photo/lid/reportMessage.h"
 #include "components/photo/naturallight/formParts.h"
 

@@ -2,14 +2,13 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 #include <numeric>
+
+#include "components/photo/lid/angles.h"
 
 namespace OvPhotometrics {
 
 namespace {
-
-constexpr double pi = std::numbers::pi;
 
 // Zenith luminance over the mean luminance of the sky, every 5 degrees of solar altitude.
 using RatioTable = std::array<double, 20>;
@@ -51,7 +50,7 @@ double overcastLuminance(const SkyCoefficients& c, double cosineOfZenith) {
 
 constexpr int bands = 32;
 constexpr int azimuths = 128;
-constexpr double step = pi / 64;  // of zenith angle and of azimuth
+constexpr double step = exactPi / 64;  // of zenith angle and of azimuth
 
 /// Sines and cosines of the sampled angles, `north` left out.
 struct Samples {
@@ -66,12 +65,12 @@ struct Samples {
 
     Samples() {
         for (int i = 0; i < bands; ++i) {
-            const double middle = i * step + pi / 128;
+            const double middle = i * step + exactPi / 128;
             const double weight = (std::cos(i * step) - std::cos((i + 1) * step)) * step;
             zenith[static_cast<std::size_t>(i)] = {{std::sin(middle), std::cos(middle)}, weight};
         }
         for (int j = 0; j < azimuths; ++j) {
-            const double angle = (j + 0.5) * step - pi;
+            const double angle = (j + 0.5) * step - exactPi;
             azimuth[static_cast<std::size_t>(j)] = {std::sin(angle), std::cos(angle)};
         }
     }
@@ -159,7 +158,7 @@ SkyType skyTypeOf(float cover) {
 double directNormalIlluminance(SkyType type, double altitude, int day) {
     if (!(altitude > 0) || type == SkyType::overcast) return 0;
     const double extinction = type == SkyType::clear ? 0.21 : 0.80;
-    const double distance = 1 + 0.034 * std::cos(2 * pi * (day - 2) / 365);
+    const double distance = 1 + 0.034 * std::cos(2 * exactPi * (day - 2) / 365);
     return solarIlluminance * distance * std::exp(-extinction / std::abs(std::sin(altitude)));
 }
 
@@ -178,16 +177,16 @@ double skyHorizontalIlluminance(SkyType type, double altitude) {
 double zenithLuminance(SkyType type, double altitude, double horizontal) {
     if (type == SkyType::overcast) return 0.409 * horizontal;
     const RatioTable& ratios = type == SkyType::clear ? clearRatios : partlyCloudyRatios;
-    constexpr double spacing = pi / 36;
-    const double a = std::clamp(altitude, 0.0, pi / 2);
+    constexpr double spacing = exactPi / 36;
+    const double a = std::clamp(altitude, 0.0, exactPi / 2);
     const auto below = std::min(static_cast<std::size_t>(a / spacing), ratios.size() - 2);
     const double part = a / spacing - static_cast<double>(below);
-    return ((1 - part) * ratios[below] + part * ratios[below + 1]) / pi * horizontal;
+    return ((1 - part) * ratios[below] + part * ratios[below + 1]) / exactPi * horizontal;
 }
 
 SkyCoefficients skyCoefficients(SkyType type, double altitude, double zenithLuminance) {
     if (!(altitude > 0)) return {};
-    const double fromZenith = pi / 2 - altitude;
+    const double fromZenith = exactPi / 2 - altitude;
     const double s = std::sin(altitude);
     const double c = std::cos(altitude);
     if (type == SkyType::clear) {

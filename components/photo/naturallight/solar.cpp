@@ -2,13 +2,12 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
+
+#include "components/photo/lid/angles.h"
 
 namespace OvPhotometrics {
 
 namespace {
-
-constexpr double pi = std::numbers::pi;
 
 /// The sine of a declination. On day 265, half a turn behind day 81, a rounded pi leaves it at 5e-17; at a pole, where
 /// its sign decides on day and night, that is 0.
@@ -20,19 +19,19 @@ double sineOf(double declination, const LatitudeTerms& latitude) {
 }  // namespace
 
 double equationOfTime(int day) {
-    return 0.17 * std::sin(4 * pi * (day - 80) / 373) - 0.129 * std::sin(2 * pi * (day - 8) / 355);
+    return 0.17 * std::sin(4 * exactPi * (day - 80) / 373) - 0.129 * std::sin(2 * exactPi * (day - 8) / 355);
 }
 
-double solarDeclination(int day) { return 0.4093 * std::sin(2 * pi * (day - 81) / 368); }
+double solarDeclination(int day) { return 0.4093 * std::sin(2 * exactPi * (day - 81) / 368); }
 
 LatitudeTerms::LatitudeTerms(double latitude) {
-    const bool isPole = 2 * std::abs(latitude) >= pi;
+    const bool isPole = 2 * std::abs(latitude) >= exactPi;
     sine = isPole ? std::copysign(1.0, latitude) : std::sin(latitude);
     cosine = isPole ? 0 : std::cos(latitude);
 }
 
 SolarPosition solarPosition(const LatitudeTerms& latitude, double declination, double solarTime) {
-    const double hourAngle = solarTime * pi / 12;  // from midnight
+    const double hourAngle = solarTime * exactPi / 12;  // from midnight
     const double sineOfDeclination = sineOf(declination, latitude);
     const double cosineOfDeclination = std::cos(declination);
     const double cosineOfHour = std::cos(hourAngle);
@@ -49,7 +48,7 @@ double sunriseSolarTime(const LatitudeTerms& latitude, double declination) {
     const double swing = std::cos(declination) * latitude.cosine;
     // At a pole the swing is 0 and the quotient infinite, unless the sun goes around on the horizon.
     if (std::abs(above) >= swing && above != 0) return above > 0 ? 0 : 12;
-    return above == 0 ? 6 : std::acos(above / swing) * 12 / pi;
+    return above == 0 ? 6 : std::acos(above / swing) * 12 / exactPi;
 }
 
 }  // namespace OvPhotometrics

@@ -2,10 +2,10 @@
 
 #include <cmath>
 #include <cstdint>
-#include <numbers>
 
 #include "components/messageFile/message.h"
 #include "components/messageFile/messageIds.h"
+#include "components/photo/lid/angles.h"
 
 namespace OvPhotometrics {
 
@@ -53,7 +53,6 @@ constexpr TimeZone zones[] = {
 };
 
 constexpr int zoneCount = std::size(zones);
-constexpr float pi = 3.1415927F;
 
 /// The row of a valid index, or null.
 const TimeZone* findZone(int index) { return index >= 0 && index < zoneCount ? &zones[index] : nullptr; }
@@ -79,7 +78,7 @@ float getTimeZoneMeridian(int index) {
 
 int findTimeZone(float meridian) {
     // In double, rounded once: a meridian midway between two zones then lies exactly midway.
-    const auto hours = static_cast<float>(meridian * 12.0 / std::numbers::pi);
+    const auto hours = static_cast<float>(meridian * 12.0 / exactPi);
     int nearest = 0;
     for (int i = 1; i < zoneCount; ++i) {
         if (std::abs(zones[i].offset - hours) < std::abs(zones[nearest].offset - hours)) nearest = i;

@@ -48,7 +48,7 @@ struct Spacing {
 
 Spacing spacingOf(AngleRange range) {
     const float width = range.last - range.first;
-    const float tens = width / 0.17453292f;  // 10 degrees
+    const float tens = width / toRadians(10);
     const int count = std::fabs(tens) < 1000 ? static_cast<int>(tens) : 0;
     return {count, width / static_cast<float>(count)};
 }

@@ -12,28 +12,12 @@ namespace OvPhotometrics {
 
 namespace {
 
-constexpr double exactPi = 3.14159265358979323846;
 constexpr int mostVertical = 90;
 constexpr int mostHorizontal = 180;
 
 /// File codes count the other way.
 PhotoWebSymmetry symmetryOf(std::int32_t code) { return static_cast<PhotoWebSymmetry>(4 - code); }
 std::int32_t codeOf(PhotoWebSymmetry symmetry) { return 4 - static_cast<std::int32_t>(symmetry); }
-
-/// The horizontal angles run from 0 to this.
-float rangeOf(PhotoWebSymmetry symmetry) {
-    switch (symmetry) {
-        case PhotoWebSymmetry::Full:
-            return twoPi;
-        case PhotoWebSymmetry::Half:
-            return pi;
-        case PhotoWebSymmetry::Quarter:
-            return halfPi;
-        case PhotoWebSymmetry::Axial:
-            break;
-    }
-    return 0;
-}
 
 float verticalAngle(int v, int count) { return static_cast<float>(v * exactPi / (count - 1)); }
 
@@ -55,7 +39,7 @@ void chooseGrid(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     rec.horizontalCount = mostHorizontal;
     if (const auto holder = Ov::rnQuery<Ov::RnWebIntensityDist>(&dist)) {
         const auto web = Ov::rnCast<Ov::RnPhotoWebData>(holder->getWeb());
-        const float range = rangeOf(symmetry);
+        const float range = psiExtent(symmetry);
         const float vertical = smallestStep(web->getThetaCount(), pi, [&](int i) { return web->getTheta(i); });
         const float horizontal = smallestStep(web->getPsiCount(), range, [&](int j) { return web->getPsi(j); });
         rec.verticalCount = countFor(exactPi, vertical, mostVertical);
@@ -85,7 +69,7 @@ float candelaFactor(const TbtFileRecord& rec) {
 }
 
 void fillWebRecord(PhotoWebRecord& webRecord, const TbtFileRecord& rec) {
-    const float range = rangeOf(webRecord.symmetry);
+    const float range = psiExtent(webRecord.symmetry);
     for (int v = 0; v < rec.verticalCount; ++v)
         photoWebRecordSetTheta(webRecord, v, verticalAngle(v, rec.verticalCount));
     const float* row = rec.values.data();
@@ -116,7 +100,7 @@ bool hasNegatives(const Ov::RnPhotoWebData& web) {
 bool takeOwnGrid(const Ov::RnPhotoWebData& web, TbtFileRecord& rec) {
     const int vertical = web.getThetaCount();
     const int horizontal = web.getPsiCount();
-    const float range = rangeOf(web.getSymmetry());
+    const float range = psiExtent(web.getSymmetry());
     if (web.isPsiTruncated() || !web.hasIdentityOrientation() || vertical < 2) return false;
     if (std::int64_t{vertical} * horizontal > tbtMostValues || hasNegatives(web)) return false;
     if (!areAngles(
@@ -171,7 +155,7 @@ bool tbtRecordFromDistribution(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
     return withinMemory([&] {
         tbtRecordInit(rec);
         chooseGrid(dist, rec);
-        const float range = rangeOf(dist.getSymmetry());
+        const float range = psiExtent(dist.getSymmetry());
         sample(rec, dist.getFlux(), [&](int v, int h) {
             return dist.intensity(verticalAngle(v, rec.verticalCount),
                                   horizontalAngle(h, rec.horizontalCount, range));
