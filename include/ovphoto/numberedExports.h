@@ -35,8 +35,8 @@ enum class FileForm : std::int32_t {
     /// A file that is right in other programs: absolute candela (cd per 1000 lm in TBT) with six digits or more
     /// where the format has decimals. The grid is the web's own, orientation included, where the format can hold it;
     /// else the distribution in the host frame on even planes, with steps of the web's smallest, 1 degree at the
-    /// least, that lose less than 0.1 % of the peak where they can. What is written has been read back by the
-    /// format's own reader.
+    /// least or finer for narrow beams, that lose less than 0.1 % of the peak where they can. What is written has
+    /// been read back by the format's own reader.
     faithful = 1
 };
 

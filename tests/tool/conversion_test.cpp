@@ -113,6 +113,35 @@ TEST_F(ToolConversion, LossIsMeasuredBetweenTheAnglesAndAtPolesOnce) {
     EXPECT_LT(convert("laid.ies out.tbt")["maxCandelaDifferencePercent"], 1);
 }
 
+TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
+    IesFile spot{.verticals = angles(0, 90, 0.5)};
+    spot.candela = [](double v, double) { return 5000 * std::exp(-v * v / 13); };
+    folder.write("spot.ies", spot.text());
+    IesFile ends{.verticals = angles(0, 90, 10)};
+    ends.candela = [](double v, double) { return 1000 - 11 * v; };
+    folder.write("ends.ies", ends.text());
+    IesFile laid{.type = 2, .verticals = {-90, 90}, .horizontals = angles(-90, 90, 45)};
+    laid.candela = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
+    folder.write("laid.ies", laid.text());
+    folder.write("jump.tbt", "t\n3\n1 1 1\n1000 1000 1 1 5 0\n4 3 5\n9 9 9\n9 9 9\n9 9 9\n9 9 9\n9 5 9\n-1\n");
+    folder.write(
+        "behind.cib",
+        "CIBSE/1\n\n\n\n\n\n\n\n1 2 0 0 0 1 0 0 0\n3 3\n-90 0 90\n0 45 90\n0 10 0\n0 7 0\n0 0 0\n99 0 0 0\n");
+    const struct {
+        const char* files;
+        const char* warning;
+    } cases[] = {
+        {"spot.ies out.nmb", "the candela differ"},               // what steps of 1 degree lose,
+        {"spot.ies out.tbt", "[]"},                               // finer ones keep
+        {"ends.ies out.tbt", "at the rim of its range"},          // at 90 degrees, behind which it is dark
+        {"laid.ies out.tbt", "a pole where planes"},              // 10 to 200 cd
+        {"jump.tbt out.ies", "the candela differ by up to 3.9"},  // next to plane 360
+        {"behind.cib out.nmb", "the candela differ"},             // where the values go on below 0 and count as 0
+    };
+    for (const auto& c : cases)
+        EXPECT_THAT(texts(convert(c.files)["warnings"]), testing::HasSubstr(c.warning)) << c.files;
+}
+
 TEST_F(ToolConversion, ANegativeFluxIsToldAndTheLightStays) {
     IesFile file;
     file.candela = [](double v, double) { return v == 0 ? 100 : -50; };

@@ -14,22 +14,42 @@ using namespace Ov;
 
 namespace {
 
-constexpr double keptPercent = 0.1;  // of the peak, by every conversion that can
 constexpr float degree = static_cast<float>(std::numbers::pi / 180);
+constexpr double circle = 2 * std::numbers::pi;
 
 /// So far from the rim of a dark range that rounding does not lead into the dark.
 constexpr float atRim = 0.01F * degree;
 
+/// The web that a distribution holds, or null.
+const RnPhotoWebData* webOf(RnIntensityDist& light) {
+    const auto withWeb = rnQuery<RnWebIntensityDist>(&light);
+    return withWeb ? withWeb->getWeb() : nullptr;
+}
+
 /// Behind the steps, of a degree or so, that light takes to fall off at a rim on an even grid, in both directions.
-float behindRim(RnIntensityDist& output) {
-    const auto withWeb = rnQuery<RnWebIntensityDist>(&output);
-    const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
+float behindRim(const RnPhotoWebData* web) {
     if (!web) return atRim;
     float step = 0;
     if (web->getThetaCount() > 1) step = web->getTheta(1) - web->getTheta(0);
     if (web->getPsiCount() > 1) step = std::max(step, web->getPsi(1) - web->getPsi(0));
     return std::clamp(3 * step, atRim, 3 * degree);
 }
+
+struct Angles {
+    float theta, psi;
+
+    explicit Angles(float ofTheta, float ofPsi) : theta(ofTheta), psi(ofPsi) {}
+    explicit Angles(const GeVector3<float>& direction)
+        : theta(std::atan2(std::hypot(direction.x, direction.y), direction.z)),
+          psi(std::atan2(direction.y, direction.x)) {
+        if (psi < 0) psi += static_cast<float>(circle);
+    }
+    GeVector3<float> direction() const {
+        const double across = std::sin(double(theta));
+        return {static_cast<float>(across * std::cos(double(psi))),
+                static_cast<float>(across * std::sin(double(psi))), static_cast<float>(std::cos(double(theta)))};
+    }
+};
 
 /// Two lights towards angles in the frame of the first.
 class Pair {
@@ -48,14 +68,17 @@ public:
     };
     Candela at(float theta, float psi) const {
         if (_sameFrame) return {_source.localIntensity(theta, psi), _output.localIntensity(theta, psi)};
-        const double across = std::sin(double(theta));
-        const GeVector3<float> local{static_cast<float>(across * std::cos(double(psi))),
-                                     static_cast<float>(across * std::sin(double(psi))),
-                                     static_cast<float>(std::cos(double(theta)))};
-        const GeVector3<float> host = _toHost * local;
+        const GeVector3<float> host = _toHost * Angles(theta, psi).direction();
         return {_source.intensityAt(host), _output.intensityAt(host)};
     }
     double source(float theta, float psi) const { return _source.localIntensity(theta, psi); }
+    bool sameFrame() const { return _sameFrame; }
+    /// In the frame of the source.
+    Angles ofOutput(float theta, float psi) const {
+        if (_sameFrame) return Angles(theta, psi);
+        const auto toHost = _output.getOrientation().computeTranspose();
+        return Angles(_source.getOrientation() * (toHost * Angles(theta, psi).direction()));
+    }
     /// Whether both are the same all around one axis.
     bool axial() const {
         return _sameFrame && _source.getSymmetry() == PhotoWebSymmetry::Axial &&
@@ -69,39 +92,47 @@ private:
     bool _sameFrame;
 };
 
-/// A range of angles and which of its ends are rims of darkness.
+/// A range of angles and which of its ends are rims: of darkness, or poles that have another value in each plane.
 struct LitRange {
     AngleRange angles;
     bool firstIsRim;
     bool lastIsRim;
-    float rim;  // how wide
 
-    /// The angle, moved off the rim where it lies there.
-    float movedIn(float angle) const {
+    /// The angle, moved in behind a rim that is nearer than `rim`.
+    float movedIn(float angle, float rim) const {
+        const auto isAt = [&](float end) { return std::abs(std::remainder(double(angle) - end, circle)) < rim; };
         const float middle = (angles.first + angles.last) / 2;
-        const float first = std::min(angles.first + rim, middle);
-        const float last = std::max(angles.last - rim, middle);
-        if (firstIsRim && angle < first) return first;
-        return lastIsRim && angle > last ? last : angle;
+        if (firstIsRim && isAt(angles.first)) return std::min(angles.first + rim, middle);
+        if (lastIsRim && isAt(angles.last)) return std::max(angles.last - rim, middle);
+        return angle;
     }
 };
 
-LitRange thetasOf(const RnPhotoWebData& web, float rim) {
-    const AngleRange angles = web.getThetaRange();
-    return {angles, angles.first > 0, angles.last < static_cast<float>(std::numbers::pi), rim};
+bool isPole(float theta) { return std::abs(std::sin(double(theta))) < 1e-6; }
+
+bool isRim(const RnPhotoWebData& web, int thetaIndex) {
+    if (!isPole(web.getTheta(thetaIndex))) return true;
+    const auto differs = [&](int j) {
+        return std::abs(web.getCandela(j, thetaIndex) - web.getCandela(0, thetaIndex)) > keptPercent / 100;
+    };
+    for (int j = 1; j < web.getPsiCount(); ++j)
+        if (differs(j)) return true;
+    return web.isPsiTruncated() && web.getCandela(0, thetaIndex) > keptPercent / 100;
 }
 
-LitRange psisOf(const RnPhotoWebData& web, float rim) {
+LitRange thetasOf(const RnPhotoWebData& web) {
+    return {web.getThetaRange(), isRim(web, 0), isRim(web, web.getThetaCount() - 1)};
+}
+
+LitRange psisOf(const RnPhotoWebData& web) {
     const bool dark = web.isPsiTruncated();
-    return {web.getPsiRange(), dark && web.getSymmetry() == PhotoWebSymmetry::Full, dark, rim};
+    return {web.getPsiRange(), dark && web.getSymmetry() == PhotoWebSymmetry::Full, dark};
 }
 
 /// Where the horizontal range of a web ends that goes on behind its last plane; else its last plane.
 float endOfPsis(const RnPhotoWebData& web) {
     const float last = web.getPsiRange().last;
-    const auto end = [&](double turns) {
-        return std::max(last, static_cast<float>(turns * 2 * std::numbers::pi));
-    };
+    const auto end = [&](double turns) { return std::max(last, static_cast<float>(turns * circle)); };
     if (web.isPsiTruncated()) return last;
     switch (web.getSymmetry()) {
         case PhotoWebSymmetry::Full:
@@ -116,11 +147,13 @@ float endOfPsis(const RnPhotoWebData& web) {
     return last;
 }
 
-/// The angles and what lies midway between them.
-std::vector<float> withMidpoints(const std::vector<float>& angles) {
+/// The angles, and the steps between them in equal parts.
+std::vector<float> inParts(const std::vector<float>& angles, int parts) {
     std::vector<float> all;
     for (const float angle : angles) {
-        if (!all.empty() && angle > all.back()) all.push_back((all.back() + angle) / 2);
+        const float step = all.empty() ? 0 : angle - all.back();
+        for (int part = parts - 1; part > 0 && step > 0; --part)
+            all.push_back(angle - step * static_cast<float>(part) / static_cast<float>(parts));
         all.push_back(angle);
     }
     return all;
@@ -136,10 +169,10 @@ std::vector<float> psiList(const RnPhotoWebData& web) {
     std::vector<float> psis;
     for (int j = 0; j < web.getPsiCount(); ++j) psis.push_back(web.getPsi(j));
     if (const float end = endOfPsis(web); end > psis.back()) psis.push_back(end);
+    // What a plane 360 is like only shows before it: at 360 it is plane 0 that stands.
+    if (web.getPsiRange().last > static_cast<float>(circle) - atRim) psis.back() -= atRim;
     return psis;
 }
-
-bool isPole(float theta) { return std::abs(std::sin(double(theta))) < 1e-6; }
 
 /// At a pole a web may hold another value in each plane, and darkness between them: what another light gives there
 /// is as good as any value in that range.
@@ -153,25 +186,53 @@ double apartAtPole(const RnPhotoWebData& web, const Pair& lights, int thetaIndex
     return std::max({0.0, *least - output, output - *most});
 }
 
-double overGrid(const RnPhotoWebData& web, const Pair& lights, float rim) {
-    const LitRange thetas = thetasOf(web, rim);
-    const LitRange psis = psisOf(web, rim);
-    const std::vector<float> allThetas = withMidpoints(thetaList(web));
-    double largest = 0;
-    for (const float psi : withMidpoints(psiList(web))) {
-        const float innerPsi = psis.movedIn(psi);
-        for (const float theta : allThetas) {
-            if (isPole(theta)) continue;
-            const float innerTheta = thetas.movedIn(theta);
-            double here = lights.at(theta, psi).apart();
-            const bool onRim = innerTheta != theta || innerPsi != psi;
-            if (onRim && here > largest) here = std::min(here, lights.at(innerTheta, innerPsi).apart());
-            largest = std::max(largest, here);
-        }
+/// The largest difference of two lights, `rim` behind the rims of the source where they are as near.
+class Largest {
+public:
+    Largest(const RnPhotoWebData& source, const Pair& lights, float rim)
+        : _lights(lights), _thetas(thetasOf(source)), _psis(psisOf(source)), _rim(rim) {
+        for (const int end : {0, source.getThetaCount() - 1})
+            if (isPole(source.getTheta(end))) _candela = std::max(_candela, apartAtPole(source, lights, end));
     }
-    for (const int end : {0, web.getThetaCount() - 1})
-        if (isPole(web.getTheta(end))) largest = std::max(largest, apartAtPole(web, lights, end));
-    return largest;
+
+    double candela() const { return _candela; }
+
+    void lookAt(const Angles& angles) {
+        const auto& [theta, psi] = angles;
+        if (isPole(theta)) return;
+        double here = _lights.at(theta, psi).apart();
+        if (here <= _candela) return;
+        const float across = _lights.sameFrame() ? 1 : std::sin(theta);
+        const Angles inner(_thetas.movedIn(theta, _rim), _psis.movedIn(psi, _rim / across));
+        const bool onRim = inner.theta != theta || inner.psi != psi;
+        if (onRim) here = std::min(here, _lights.at(inner.theta, inner.psi).apart());
+        _candela = std::max(_candela, here);
+    }
+
+private:
+    const Pair& _lights;
+    LitRange _thetas;
+    LitRange _psis;
+    float _rim;
+    double _candela = 0;
+};
+
+/// Over the grid of the source and all midway, then along the lines of the other's finer grid, where that gives it.
+double overGrids(const RnPhotoWebData& source, const RnPhotoWebData* output, const Pair& lights, float rim) {
+    Largest largest(source, lights, rim);
+    const std::vector<float> thetas = thetaList(source);
+    const std::vector<float> psis = psiList(source);
+    for (const float psi : inParts(psis, 2))
+        for (const float theta : inParts(thetas, 2)) largest.lookAt(Angles(theta, psi));
+    if (!output) return largest.candela();
+    const std::vector<float> outputThetas = thetaList(*output);
+    const std::vector<float> outputPsis = psiList(*output);
+    if (lights.sameFrame() && outputThetas == thetas && outputPsis == psis) return largest.candela();
+    for (const float psi : inParts(outputPsis, 4))
+        for (const float theta : outputThetas) largest.lookAt(lights.ofOutput(theta, psi));
+    for (const float psi : outputPsis)
+        for (const float theta : inParts(outputThetas, 4)) largest.lookAt(lights.ofOutput(theta, psi));
+    return largest.candela();
 }
 
 /// For lights that are the same all around their axis.
@@ -215,17 +276,17 @@ double percent(double part, double whole) { return whole > 0 ? part / whole * 10
 }  // namespace
 
 ConversionLoss measureLoss(RnIntensityDist& source, RnIntensityDist& output) {
-    const auto withWeb = rnQuery<RnWebIntensityDist>(&source);
-    const RnPhotoWebData* const web = withWeb ? withWeb->getWeb() : nullptr;
+    const RnPhotoWebData* const web = webOf(source);
+    const RnPhotoWebData* const made = webOf(output);
     const Pair lights(source, output);
     const AngleRange thetas = source.getThetaRange();
     const Pair::Candela sums =
         gaveOff(lights, web ? thetaList(*web) : std::vector{thetas.first, thetas.last}, web ? 2 : 64);
     ConversionLoss loss;
-    loss.candela = web ? overGrid(*web, lights, atRim) : fromAxis(lights);
+    loss.candela = web ? overGrids(*web, made, lights, atRim) : fromAxis(lights);
     loss.candelaPercent = percent(loss.candela, source.getPeakIntensity());
     if (web && loss.candelaPercent > keptPercent) {
-        const double inside = overGrid(*web, lights, behindRim(output));
+        const double inside = overGrids(*web, made, lights, behindRim(made));
         if (inside < loss.candela) loss.rimCandela = loss.candela;
         loss.candela = inside;
         loss.candelaPercent = percent(inside, source.getPeakIntensity());

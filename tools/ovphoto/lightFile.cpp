@@ -13,7 +13,7 @@ using namespace Ov;
 
 namespace {
 
-constexpr double tolerated = 1;  // per cent
+constexpr double tolerated = 1;  // per cent, of fluxes
 
 std::optional<std::string> fileBytes(const HostSession& session, const TargetFormat& target,
                                      RnIntensityDist& light, OvPhotometrics::FileForm form,
@@ -60,13 +60,14 @@ std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFo
         std::abs(made.lampLumens - lamps) > lamps * tolerated / 100)
         warnings.push_back(std::string(target.name) + " holds no flux of lamps: readers take " +
                            shortNumber(made.lampLumens) + " lm instead of " + shortNumber(lamps) + " lm");
-    if (loss.candelaPercent > tolerated) {
+    if (loss.candelaPercent > keptPercent) {
         warnings.push_back("the candela differ by up to " + shortNumber(loss.candela) + " cd, " +
                            shortNumber(loss.candelaPercent) + " % of the peak");
     }
     if (loss.rimCandela > 0) {
         const std::string apart = shortNumber(loss.rimCandela) + " cd";
-        warnings.push_back("at the rim of its range, where it falls off, the light differs by up to " + apart);
+        warnings.push_back(
+            "at the rim of its range, or a pole where planes disagree, the light differs by up to " + apart);
     }
     if (std::abs(loss.fluxPercent) > tolerated)
         warnings.push_back("the flux of the luminaire differs by " + shortNumber(loss.fluxPercent) + " %");

@@ -12,6 +12,8 @@ namespace OvPhotometrics {
 namespace {
 
 constexpr double finest = 1;            // degrees
+constexpr double finestDetail = 0.05;   // degrees, of light that coarser steps lose and these keep
+constexpr int mostDetailed = 1 << 16;   // values of a grid of such steps
 constexpr double stepOfFormulas = 5;    // where no web says how fine a distribution is
 constexpr double allowedLoss = 0.0007;  // of the peak, midway on the edges of a cell; inside it is a little more
 constexpr double sameAngle = 0.005;     // degrees
@@ -25,11 +27,11 @@ PhotoWebSymmetry turned(PhotoWebSymmetry symmetry, double degrees) {
     return kept ? symmetry : PhotoWebSymmetry::Full;
 }
 
-/// The largest step up to `limit` degrees that divides 90 and is a multiple of 0.01, or of 1.
-double stepUpTo(double limit, bool wholeDegrees) {
-    for (int parts = 1; parts < 90; ++parts)
+/// The largest step from `least` up to `limit` degrees that divides 90 and is a multiple of 0.01, or of 1.
+double stepUpTo(double limit, bool wholeDegrees, double least = finest) {
+    for (int parts = 1; parts * least < 90; ++parts)
         if ((wholeDegrees ? 90 : 9000) % parts == 0 && 90.0 / parts <= limit + sameAngle) return 90.0 / parts;
-    return finest;
+    return least;
 }
 
 double smallestStep(int count, auto angleAt) {
@@ -100,15 +102,30 @@ private:
     RnRef<PlannedWeb> _web;
 };
 
+/// A plan with steps below 1 degree in one direction, if some keep all of the light on a grid that is not too large.
+SamplingPlan detailed(const SamplingPlan& plan, double SamplingPlan::*step, bool (LossCheck::*isFine)() const,
+                      const HostView& view, const SamplingRules& rules) {
+    SamplingPlan finer = plan;
+    while (!(LossCheck(view, finer, rules.planeKept).*isFine)()) {
+        if (finer.*step <= finestDetail) return plan;
+        finer.*step = stepUpTo(finer.*step / 2, false, finestDetail);
+        if (std::int64_t{finer.thetaCount()} * finer.psiCount() > mostDetailed) return plan;
+    }
+    return finer;
+}
+
 SamplingPlan refined(SamplingPlan plan, const HostView& view, const SamplingRules& rules) {
     for (;;) {
         const LossCheck check(view, plan, rules.planeKept);
         const bool refineThetas = plan.thetas.empty() && plan.thetaStep > finest && !check.thetasFine();
         const bool refinePsis = plan.psiStep > finest && !check.psisFine();
-        if (!refineThetas && !refinePsis) return plan;
+        if (!refineThetas && !refinePsis) break;
         if (refineThetas) plan.thetaStep = stepUpTo(plan.thetaStep * 0.7, rules.wholeDegrees);
         if (refinePsis) plan.psiStep = stepUpTo(plan.psiStep * 0.7, rules.wholeDegrees);
     }
+    if (rules.wholeDegrees) return plan;
+    if (plan.thetas.empty()) plan = detailed(plan, &SamplingPlan::thetaStep, &LossCheck::thetasFine, view, rules);
+    return detailed(plan, &SamplingPlan::psiStep, &LossCheck::psisFine, view, rules);
 }
 
 SamplingPlan coarsestPlan(Ov::RnIntensityDist& dist, const HostView& view, const SamplingRules& rules) {

@@ -69,8 +69,9 @@ struct SamplingRules {
     bool planeKept = false;     // readers keep the plane that closes the circle
 };
 
-/// A grid for `dist`: its steps are at most the smallest of its web, at least 1 degree, and fine enough to lose
-/// less than 0.1 % of the peak between the angles, where 1 degree can. Throws std::bad_alloc.
+/// A grid for `dist`: its steps are at most the smallest of its web, and fine enough to lose less than 0.1 % of the
+/// peak between the angles where 1 degree can or, on a grid of at most 65536 values, 0.05 degree. Throws
+/// std::bad_alloc.
 SamplingPlan planSampling(Ov::RnIntensityDist& dist, const SamplingRules& rules = {});
 
 /// Candela on a grid as planned.
