@@ -8,6 +8,7 @@ if(WIN32)
   set(pictures OFF)  # Debian has no Cairo for MinGW
 endif()
 option(OVPHOTO_PICTURES "Build the tool with pictures and reports, which needs Cairo" ${pictures})
+option(OVPHOTO_UNITY "Compile sources together: faster from scratch, slower after a small change" OFF)
 set(OVPHOTO_SANITIZE "" CACHE STRING "Sanitizers, such as address,undefined")
 option(OVPHOTO_COVERAGE "Count what the tests run" OFF)
 

@@ -12,7 +12,7 @@ namespace Ov {
 
 namespace {
 
-constexpr const char* source = "components/support/devices";
+constexpr const char* devicesSource = "components/support/devices";
 constexpr std::size_t blockSize = 16384;
 
 char narrow(wchar_t c) { return static_cast<std::uint32_t>(c) > 255 ? '?' : static_cast<char>(c); }
@@ -99,7 +99,9 @@ long RnMemoryBuffer::seek(long offset, int whence) {
 
 RnInBuffer::RnInBuffer(std::istream* input) : _source(input) {}
 
-char* RnInBuffer::prepareWrite(std::size_t) { throw RnStreamEx::ExWriteError(source, __LINE__, "input stream"); }
+char* RnInBuffer::prepareWrite(std::size_t) {
+    throw RnStreamEx::ExWriteError(devicesSource, __LINE__, "input stream");
+}
 
 bool RnInBuffer::readMore() {
     if (_source->eof()) return false;
@@ -114,7 +116,7 @@ bool RnInBuffer::readMore() {
         count = _source->gcount();
     }
     if (_source->bad() || (_source->fail() && !_source->eof())) {
-        throw RnStreamEx::ExReadError(source, __LINE__, "input stream");
+        throw RnStreamEx::ExReadError(devicesSource, __LINE__, "input stream");
     }
     append(block, static_cast<std::size_t>(count));
     return count > 0;
@@ -122,7 +124,7 @@ bool RnInBuffer::readMore() {
 
 void RnOutBuffer::write(const char* bytes, std::size_t count) {
     if (!_sink->write(bytes, static_cast<std::streamsize>(count))) {
-        throw RnStreamEx::ExWriteError(source, __LINE__, "output stream");
+        throw RnStreamEx::ExWriteError(devicesSource, __LINE__, "output stream");
     }
     _written += static_cast<long>(count);
 }

@@ -14,7 +14,7 @@ namespace Ov {
 
 namespace {
 
-constexpr const char* source = "host/componentManager/streamValues";
+constexpr const char* valuesSource = "host/componentManager/streamValues";
 constexpr std::size_t longestNumber = 1024;
 
 /// The numbers that stand for a value: `Text` has all values of T, `Binary` is what fits the stream.
@@ -41,8 +41,8 @@ using Bits = std::conditional_t<
     size == 1, std::uint8_t,
     std::conditional_t<size == 2, std::uint16_t, std::conditional_t<size == 4, std::uint32_t, std::uint64_t>>>;
 
-[[noreturn]] void failRead(int line) { throw RnStreamEx::ExReadError(source, line, "value stream"); }
-[[noreturn]] void failWrite(int line) { throw RnStreamEx::ExWriteError(source, line, "value stream"); }
+[[noreturn]] void failRead(int line) { throw RnStreamEx::ExReadError(valuesSource, line, "value stream"); }
+[[noreturn]] void failWrite(int line) { throw RnStreamEx::ExWriteError(valuesSource, line, "value stream"); }
 
 /// The same value in another type; false when that cannot hold it.
 template <class To, class From>

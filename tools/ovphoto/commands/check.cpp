@@ -20,7 +20,7 @@ struct CheckOptions {
     bool json = false;
 };
 
-struct Totals {
+struct CheckTotals {
     int well = 0;
     int withWarnings = 0;  // of those that are well
     int refused = 0;
@@ -48,7 +48,7 @@ void printText(const ReadResult& result, const std::vector<std::string>& warning
     printTexts("warning: ", warnings);
 }
 
-void printSummary(const Totals& totals) {
+void printSummary(const CheckTotals& totals) {
     const int files = totals.well + totals.refused;
     std::ostringstream line;
     line << files << (files == 1 ? " file: " : " files: ") << totals.well << " ok";
@@ -66,7 +66,7 @@ ReadResult readFound(const FoundFile& file, const CheckOptions& options, const H
     return result;
 }
 
-void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, Totals& totals,
+void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, CheckTotals& totals,
                const Progress& progress) {
     const ReadResult result = readFound(file, options, session);
     const bool foreign = file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
@@ -83,7 +83,7 @@ void checkFile(const FoundFile& file, const CheckOptions& options, const HostSes
 
 int runCheck(const CheckOptions& options, const HostSession& session) {
     const std::vector<FoundFile> files = expandPaths(options.paths);
-    Totals totals;
+    CheckTotals totals;
     Progress progress(files.size());
     for (const FoundFile& file : files) {
         if (!std::cout) break;

@@ -33,7 +33,7 @@ struct Plan {
     int skipped = 0;  // in folders, of no known format
 };
 
-struct Totals {
+struct ConversionTotals {
     int converted = 0;
     int withWarnings = 0;  // of those
     int failed = 0;
@@ -170,8 +170,8 @@ private:
     std::string _failure;
 };
 
-Totals carryOut(const Plan& plan, const ConvertOptions& options, const HostSession& session) {
-    Totals totals;
+ConversionTotals carryOut(const Plan& plan, const ConvertOptions& options, const HostSession& session) {
+    ConversionTotals totals;
     Progress progress(plan.jobs.size());
     Worker worker(plan.jobs, options, session);
     for (const Job& job : plan.jobs) {
@@ -187,7 +187,7 @@ Totals carryOut(const Plan& plan, const ConvertOptions& options, const HostSessi
     return totals;
 }
 
-void printSummary(const Totals& totals, int skipped) {
+void printSummary(const ConversionTotals& totals, int skipped) {
     const int files = totals.converted + totals.failed;
     std::ostringstream line;
     line << files << (files == 1 ? " file: " : " files: ") << totals.converted << " converted";
@@ -207,7 +207,7 @@ int convertIntoFolder(const ConvertOptions& options, const HostSession& session)
         complain(options.folder + ": cannot be made: " + error.message());
         return exitFailed;
     }
-    const Totals totals = carryOut(plan, options, session);
+    const ConversionTotals totals = carryOut(plan, options, session);
     if (!options.json) printSummary(totals, plan.skipped);
     return totals.failed == 0 ? exitWell : exitFailed;
 }
