@@ -1,6 +1,8 @@
 #include <gmock/gmock.h>
 
+#include <cmath>
 #include <cstdlib>
+#include <limits>
 
 #include "components/support/file.h"
 #include "components/support/path.h"
@@ -108,6 +110,12 @@ TEST_F(Files, AreFoundInTheOrderOfPlacesAndSpellings) {
     for (const std::wstring& absent : {folder.wide("absent"), std::wstring(5000, L'x')})
         EXPECT_EQ(find(absent), "-");
     for (const wchar_t* list : {static_cast<const wchar_t*>(nullptr), L"Other"}) EXPECT_EQ(find(L"b", list), "-");
+}
+
+TEST(FloatUtil, AbsLeavesTheSignOfZeroAlone) {
+    for (const float value : {0.0f, 1e-45f, 2.5f, std::numeric_limits<float>::infinity()})
+        for (const float either : {value, -value}) EXPECT_EQ(Ov::FloatUtil::abs(either), value);
+    EXPECT_TRUE(std::signbit(Ov::FloatUtil::abs(-0.0f)) && std::isnan(Ov::FloatUtil::abs(std::nanf(""))));
 }
 
 TEST(ProcessController, ReportsToItsReporterOrStandardError) {

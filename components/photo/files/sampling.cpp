@@ -63,7 +63,7 @@ public:
     RnRef<Ov::RnPhotoWebData> clone() const override { return {}; }
     /// Candela by angles in degrees.
     float intensity(double theta, double psi) const {
-        return _maxCandela * getIntensity(toRadians(theta), toRadians(psi));
+        return _content.maxCandela * getIntensity(toRadians(theta), toRadians(psi));
     }
 };
 

@@ -1,14 +1,14 @@
 #include "components/photo/lid/photoWeb.h"
 
 #include <algorithm>
-#include <array>
 #include <cmath>
 #include <limits>
 #include <new>
 #include <optional>
-#include <vector>
+#include <span>
 
 #include "components/messageFile/messageIds.h"
+#include "components/photo/lid/fluxIntegral.h"
 #include "components/photo/lid/reportMessage.h"
 #include "components/photo/lid/webEvaluation.h"
 
@@ -24,129 +24,25 @@ std::size_t count(int n) {
 std::unique_ptr<float[]> newFloats(std::size_t n) { return std::make_unique_for_overwrite<float[]>(n); }
 
 /// Without a way out of the loop, which wide instructions can then do.
-bool allFinite(const float* values, std::size_t n) {
+bool allFinite(std::span<const float> values) {
     int finite = 1;
-    for (std::size_t k = 0; k < n; ++k) finite &= std::isfinite(values[k]);
+    for (const float value : values) finite &= std::isfinite(value);
     return finite != 0;
 }
 
 bool ascends(const float* angles, int n) { return std::is_sorted(angles, angles + n); }
 
-/// The flux integral over theta of many rows on one list of angles: the sines serve all rows.
-class ThetaIntegral {
-public:
-    ThetaIntegral(int n, const float* angles)
-        : _n(n), _angles(angles), _steps(n < 30 && n > 1 ? (n + 28) / (n - 1) : 1) {
-        if (n < 2) return;
-        _sines.reserve(count(n - 1) * count(_steps));
-        for (int k = 1; k < n; ++k)
-            if (subdivides())
-                addSteps(k);
-            else
-                addSine((angles[k] + angles[k - 1]) / 2);
-    }
-
-    /// The integrals of `Rows` rows, one after another in memory. The sums of a row are a chain of dependent
-    /// steps; several rows at once keep the machine busy.
-    template <int Rows>
-    std::array<float, Rows> of(const float* values) const {
-        if (_n < 2) return {};
-        return subdivides() ? sumOfSteps<Rows>(values) : sumOfIntervals<Rows>(values);
-    }
-
-private:
-    bool subdivides() const { return _n < 30; }
-    void addSine(float angle) { _sines.push_back(std::sin(static_cast<double>(angle))); }
-    float stepOf(int k) const { return (_angles[k] - _angles[k - 1]) / static_cast<float>(_steps); }
-
-    void addSteps(int k) {
-        const float da = stepOf(k);
-        float a = _angles[k - 1];
-        for (int step = 0; step < _steps; ++step, a += da) addSine((a + da + a) * 0.5f);
-    }
-
-    template <int Rows>
-    std::array<float, Rows> sumOfIntervals(const float* values) const {
-        std::array<float, Rows> sums{};
-        for (int k = 1; k < _n; ++k) {
-            const double sine = _sines[count(k - 1)];
-            const float da = _angles[k] - _angles[k - 1];
-            for (int r = 0; r < Rows; ++r) {
-                const float* v = values + static_cast<std::ptrdiff_t>(r) * _n + k;
-                float& sum = sums[count(r)];
-                sum = static_cast<float>(sum + sine * ((v[0] + v[-1]) * da));
-            }
-        }
-        for (float& sum : sums) sum *= 0.5f;
-        return sums;
-    }
-
-    template <int Rows>
-    std::array<float, Rows> sumOfSteps(const float* values) const {
-        std::array<float, Rows> totals{};
-        for (int r = 0; r < Rows; ++r, values += _n) totals[count(r)] = sumOfSteps(values);
-        return totals;
-    }
-
-    float sumOfSteps(const float* values) const {
-        float total = 0;
-        const double* sine = _sines.data();
-        for (int k = 1; k < _n; ++k) {
-            const float dv = (values[k] - values[k - 1]) / static_cast<float>(_steps);
-            float v = values[k - 1];
-            float sum = 0;
-            for (int step = 0; step < _steps; ++step, v += dv)
-                sum = static_cast<float>(sum + *sine++ * (v + dv + v));
-            total += stepOf(k) * sum;
-        }
-        return total * 0.5f;
-    }
-
-    int _n;
-    const float* _angles;
-    int _steps;  // equal parts that an interval of a coarse list is cut into
-    std::vector<double> _sines;
-};
-
-std::vector<float> integrateRows(const WebGrid& grid) {
-    constexpr int together = 8;
-    const ThetaIntegral integral(grid.nthetas, grid.thetas);
-    std::vector<float> rows;
-    rows.reserve(count(grid.npsis));
-    const auto add = [&](const auto& sums) { rows.insert(rows.end(), sums.begin(), sums.end()); };
-    int j = 0;
-    const auto row = [&] { return grid.values + count(j) * count(grid.nthetas); };
-    for (; j + together <= grid.npsis; j += together) add(integral.of<together>(row()));
-    for (; j < grid.npsis; ++j) add(integral.of<1>(row()));
-    return rows;
-}
-
-/// Flux in lumens of a grid whose values are relative to a peak of `maxCandela`.
-float integrateFlux(const WebGrid& grid, float maxCandela) {
-    const std::vector<float> rows = integrateRows(grid);
-    const float first = rows.front();
-    const float last = rows.back();
-    float sum = 0;
-    for (int j = 1; j < grid.npsis; ++j)
-        sum += (rows[count(j)] + rows[count(j - 1)]) * (grid.psis[j] - grid.psis[j - 1]);
-    const float lastPsi = grid.psis[grid.npsis - 1];
-    switch (grid.symmetry) {
-        case PhotoWebSymmetry::Full:
-            if (!grid.psiTruncated) sum += ((grid.psis[0] + twoPi) - lastPsi) * (last + first);
-            break;
-        case PhotoWebSymmetry::Half:
-            if (!grid.psiTruncated) sum += 2 * last * (pi - lastPsi);
-            sum = 2 * sum;
-            break;
-        case PhotoWebSymmetry::Quarter:
-            if (!grid.psiTruncated) sum += 2 * last * (halfPi - lastPsi);
-            sum = 4 * sum;
-            break;
-        case PhotoWebSymmetry::Axial:
-            sum = (first + first) * twoPi;
-            break;
-    }
-    return sum * 0.5f * maxCandela;
+/// The same with values that are not yet set.
+PhotoWebRecord copyWithoutValues(const PhotoWebRecord& rec) {
+    PhotoWebRecord copy;
+    photoWebRecordInit(copy, rec.nthetas, rec.npsis, rec.symmetry, rec.psiTruncated, rec.loaded, rec.name.c_str());
+    std::copy_n(rec.thetas.get(), rec.angleCount(), copy.thetas.get());
+    copy.maxCandela = rec.maxCandela;
+    copy.lumens = rec.lumens;
+    copy.orientation = rec.orientation;
+    copy.identityOrientation = rec.identityOrientation;
+    copy.file = rec.file;
+    return copy;
 }
 
 /// Whether a distribution can hold the flux: whether candela and lumens that it works out of both are finite.
@@ -242,10 +138,6 @@ void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<flo
     rec.identityOrientation = false;
 }
 
-float photoWebIntegrate(int n, const float* angles, const float* values) {
-    return ThetaIntegral(n, angles).of<1>(values)[0];
-}
-
 bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     if (rec.nthetas <= 0 || rec.npsis <= 0) return false;
     if (const auto refused = refusedAngles(rec)) {
@@ -254,92 +146,59 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
     }
 
     // Everything that can fail comes before the first change of the web.
-    const std::size_t values = count(rec.nthetas) * count(rec.npsis);
-    const std::size_t angles = count(rec.nthetas) + count(rec.npsis);
-    auto candelas = newFloats(values);
-    auto thetas = newFloats(angles);
-    std::wstring name = rec.name;
-    std::copy_n(rec.thetas.get(), angles, thetas.get());
-    float lumens = 0;
-    if (rec.maxCandela > 0) {
-        std::transform(rec.candelas.get(), rec.candelas.get() + values, candelas.get(),
-                       [peak = rec.maxCandela](float value) { return value / peak; });
-        lumens = rec.lumens > 0 ? rec.lumens
-                                : integrateFlux({rec.thetas.get(), rec.psis, candelas.get(), rec.nthetas,
-                                                 rec.npsis, rec.symmetry, rec.psiTruncated},
-                                                rec.maxCandela);
+    PhotoWebRecord installed = copyWithoutValues(rec);
+    const std::span<const float> values(rec.candelas.get(), rec.valueCount());
+    installed.lumens = 0;
+    if (const float peak = rec.maxCandela; peak > 0) {
+        std::ranges::transform(values, installed.candelas.get(), [peak](float value) { return value / peak; });
+        installed.lumens = rec.lumens > 0 ? rec.lumens : fluxOf(installed.grid(), peak);
     } else {
-        std::copy_n(rec.candelas.get(), values, candelas.get());
+        std::ranges::copy(values, installed.candelas.get());
     }
-    if (!std::isfinite(rec.maxCandela) || !std::isfinite(rec.lumens) || !std::isfinite(lumens) ||
-        !canBeHeld(lumens, rec.maxCandela) || !allFinite(candelas.get(), values))
+    if (!std::isfinite(rec.maxCandela) || !std::isfinite(rec.lumens) || !std::isfinite(installed.lumens) ||
+        !canBeHeld(installed.lumens, rec.maxCandela) || !allFinite({installed.candelas.get(), values.size()}))
         return false;
 
-    web._name = std::move(name);
-    web._thetas = std::move(thetas);
-    web._psis = web._thetas.get() + rec.nthetas;
-    web._candelas = std::move(candelas);
-    web._maxCandela = rec.maxCandela;
-    web._lumens = lumens;
-    web._orientation = rec.orientation.computeTranspose();
-    web._nthetas = rec.nthetas;
-    web._npsis = rec.npsis;
-    web._symmetry = rec.symmetry;
-    web._psiTruncated = rec.psiTruncated;
-    web._identityOrientation = rec.identityOrientation;
-    web._loaded = rec.loaded;
-    web._file = rec.file;
-    if (rec.lumens > 0) web._file.lampLumens = rec.lumens;
+    installed.orientation = rec.orientation.computeTranspose();
+    if (rec.lumens > 0) installed.file.lampLumens = rec.lumens;
+    web._content = std::move(installed);
     return true;
 }
 
 RnBasePhotoWebData::RnBasePhotoWebData(const RnBasePhotoWebData& other)
-    : Ov::RnPhotoFileWeb(),
-      _maxCandela(other._maxCandela),
-      _lumens(other._lumens),
-      _orientation(other._orientation),
-      _nthetas(other._nthetas),
-      _npsis(other._npsis),
-      _symmetry(other._symmetry),
-      _psiTruncated(other._psiTruncated),
-      _identityOrientation(other._identityOrientation),
-      _file(other._file) {
-    if (!other._thetas) return;
-    const std::size_t angles = count(_nthetas) + count(_npsis);
-    const std::size_t values = count(_nthetas) * count(_npsis);
-    _thetas = newFloats(angles);
-    _candelas = newFloats(values);
-    _psis = _thetas.get() + _nthetas;
-    std::copy_n(other._thetas.get(), angles, _thetas.get());
-    std::copy_n(other._candelas.get(), values, _candelas.get());
+    : Ov::RnPhotoFileWeb(), _content(copyWithoutValues(other._content)) {
+    std::copy_n(other._content.candelas.get(), _content.valueCount(), _content.candelas.get());
+    _content.name.clear();
+    _content.loaded = false;
 }
 
 GeVector3<float>& RnBasePhotoWebData::toWebFrame(GeVector3<float>& out, const GeVector3<float>& direction) const {
-    out = _identityOrientation ? direction : (_orientation * direction).normalized();
+    out = _content.identityOrientation ? direction : (_content.orientation * direction).normalized();
     return out;
 }
 
 GeVector3<float>& RnBasePhotoWebData::toWebFrameUnit(GeVector3<float>& out,
                                                      const GeVector3<float>& direction) const {
-    out = (_identityOrientation ? direction : _orientation * direction.measurable()).normalized();
+    out = (_content.identityOrientation ? direction : _content.orientation * direction.measurable()).normalized();
     return out;
 }
 
 float RnBasePhotoWebData::getLuminaireLumens() const {
-    if (empty() || !(_maxCandela > 0)) return 0;
-    return held(integrateFlux(grid(), _maxCandela) * _file.candelaFactor);
+    if (empty() || !(_content.maxCandela > 0)) return 0;
+    return held(fluxOf(grid(), _content.maxCandela) * _content.file.candelaFactor);
 }
 
 RnRef<Ov::RnPhotoWebData> RnBasePhotoWebData::inCandela() {
-    const float lumens = _file.lampLumens > 0 ? _file.lampLumens : _lumens;
-    if (_file.candelaFactor == 1 && lumens == _lumens) return RnRef<Ov::RnPhotoWebData>::share(this);
+    const float lumens = _content.file.lampLumens > 0 ? _content.file.lampLumens : _content.lumens;
+    if (_content.file.candelaFactor == 1 && lumens == _content.lumens)
+        return RnRef<Ov::RnPhotoWebData>::share(this);
     auto copy = clone();
     auto& web = static_cast<RnBasePhotoWebData&>(*copy);
-    web._name = _name;
-    web._loaded = _loaded;
-    web._maxCandela = held(_maxCandela * _file.candelaFactor);
-    web._lumens = lumens;
-    web._file.candelaFactor = 1;
+    web._content.name = _content.name;
+    web._content.loaded = _content.loaded;
+    web._content.maxCandela = held(_content.maxCandela * _content.file.candelaFactor);
+    web._content.lumens = lumens;
+    web._content.file.candelaFactor = 1;
     return copy;
 }
 

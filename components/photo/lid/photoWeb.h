@@ -25,7 +25,8 @@ using Ov::IndexRange;
 using Ov::RnEnum;
 using Ov::RnRef;
 
-/// A web as a reader fills it. Owns its blocks.
+/// What a web consists of: as a reader fills it and, with values relative to the peak and the orientation transposed,
+/// as an object holds it. Owns its blocks.
 struct PhotoWebRecord {
     std::wstring name;
     std::unique_ptr<float[]> thetas;  // one block: nthetas vertical angles, then npsis horizontal ones
@@ -41,6 +42,10 @@ struct PhotoWebRecord {
     bool identityOrientation = true;
     bool loaded = false;
     Ov::PhotoFileInfo file;  // lumens of lamps that `lumens` says need not stand here too
+
+    std::size_t angleCount() const { return static_cast<std::size_t>(nthetas) + static_cast<std::size_t>(npsis); }
+    std::size_t valueCount() const { return static_cast<std::size_t>(nthetas) * static_cast<std::size_t>(npsis); }
+    WebGrid grid() const { return {thetas.get(), psis, candelas.get(), nthetas, npsis, symmetry, psiTruncated}; }
 };
 
 /// Starts a record: angles and candelas are allocated and not yet set (psi 0 of an axial web is 0). Throws
@@ -73,10 +78,6 @@ inline int photoWebFoldPsiIndex(int j, int npsis, PhotoWebSymmetry symmetry) {
     return r < npsis ? r : 2 * npsis - 2 - r;
 }
 
-/// The integral of v(theta) sin(theta) over the n sampled angles, v linear between them: exact sums are fixed, in
-/// single precision around a double sine. 0 for fewer than two angles.
-float photoWebIntegrate(int n, const float* angles, const float* values);
-
 class RnBasePhotoWebData;
 
 /// The flux of a web over its peak: what a distribution multiplies its candela by to get lumens.
@@ -97,40 +98,46 @@ public:
     RnBasePhotoWebData(const RnBasePhotoWebData& other);
     RnBasePhotoWebData& operator=(const RnBasePhotoWebData&) = delete;
 
-    bool isLoaded() const override { return _loaded; }
-    const wchar_t* getName() const override { return _name.c_str(); }
-    PhotoWebSymmetry getSymmetry() const override { return _symmetry; }
-    float getMaxCandela() const override { return _maxCandela; }
-    float getLumens() const override { return _lumens; }
-    bool hasIdentityOrientation() const override { return _identityOrientation; }
-    GeLinearMatrix3<float> getOrientation() const override { return _orientation; }
+    bool isLoaded() const override { return _content.loaded; }
+    const wchar_t* getName() const override { return _content.name.c_str(); }
+    PhotoWebSymmetry getSymmetry() const override { return _content.symmetry; }
+    float getMaxCandela() const override { return _content.maxCandela; }
+    float getLumens() const override { return _content.lumens; }
+    bool hasIdentityOrientation() const override { return _content.identityOrientation; }
+    GeLinearMatrix3<float> getOrientation() const override { return _content.orientation; }
     GeVector3<float>& toWebFrame(GeVector3<float>& out, const GeVector3<float>& direction) const override;
     GeVector3<float>& toWebFrameUnit(GeVector3<float>& out, const GeVector3<float>& direction) const override;
-    bool isPsiTruncated() const override { return _psiTruncated; }
+    bool isPsiTruncated() const override { return _content.psiTruncated; }
     AngleRange getThetaRange() const override {
-        return _nthetas > 0 ? AngleRange{_thetas[0], _thetas.get()[_nthetas - 1]} : AngleRange{};
+        return _content.nthetas > 0 ? AngleRange{_content.thetas[0], _content.thetas.get()[_content.nthetas - 1]}
+                                    : AngleRange{};
     }
     AngleRange getPsiRange() const override {
-        return _npsis > 0 ? AngleRange{_psis[0], _psis[_npsis - 1]} : AngleRange{};
+        return _content.npsis > 0 ? AngleRange{_content.psis[0], _content.psis[_content.npsis - 1]} : AngleRange{};
     }
-    int findTheta(float angle) const override { return lastAtMost(_thetas.get(), _nthetas, angle); }
-    int findPsi(float angle) const override { return lastAtMost(_psis, _npsis, angle); }
-    int getThetaCount() const override { return _nthetas; }
-    float getTheta(int index) const override { return _nthetas > 0 ? _thetas.get()[clampTheta(index)] : 0; }
-    int getPsiCount() const override { return _npsis; }
+    int findTheta(float angle) const override {
+        return lastAtMost(_content.thetas.get(), _content.nthetas, angle);
+    }
+    int findPsi(float angle) const override { return lastAtMost(_content.psis, _content.npsis, angle); }
+    int getThetaCount() const override { return _content.nthetas; }
+    float getTheta(int index) const override {
+        return _content.nthetas > 0 ? _content.thetas.get()[clampTheta(index)] : 0;
+    }
+    int getPsiCount() const override { return _content.npsis; }
     float getPsi(int index) const override {
-        return _npsis > 0 ? _psis[photoWebFoldPsiIndex(index, _npsis, _symmetry)] : 0;
+        return _content.npsis > 0 ? _content.psis[photoWebFoldPsiIndex(index, _content.npsis, _content.symmetry)]
+                                  : 0;
     }
     float getCandela(int psiIndex, int thetaIndex) const override {
         if (empty()) return 0;
-        return row(photoWebFoldPsiIndex(psiIndex, _npsis, _symmetry))[clampTheta(thetaIndex)];
+        return row(photoWebFoldPsiIndex(psiIndex, _content.npsis, _content.symmetry))[clampTheta(thetaIndex)];
     }
     void getCandelaBlock(IndexRange psis, IndexRange thetas, float* out) const override;
     RnEnum::Action enumerateFiles(Ov::RnEnumerator<const wchar_t*>& visitor) const override {
         return visitor.finish();
     }
     float getIntensity(float theta, float psi) const override;
-    const Ov::PhotoFileInfo& getFileInfo() const override { return _file; }
+    const Ov::PhotoFileInfo& getFileInfo() const override { return _content.file; }
     float getLuminaireLumens() const override;
     RnRef<Ov::RnPhotoWebData> inCandela() override;
 
@@ -138,39 +145,24 @@ public:
     static constexpr Ov::RnUid iid{0x7c1e9f10, 0x4a5b11ef, 0x9c6e0b62, 0x5d83a4f7};
     /// `getIntensity` towards `count` directions, a theta and a psi each.
     virtual void getIntensities(const float* angles, std::size_t count, float* out) const;
-    WebGrid grid() const {
-        return {_thetas.get(), _psis, _candelas.get(), _nthetas, _npsis, _symmetry, _psiTruncated};
-    }
+    WebGrid grid() const { return _content.grid(); }
 
 protected:
     friend bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec);
 
-    bool empty() const { return _nthetas <= 0 || _npsis <= 0; }
-    int clampTheta(int i) const { return i <= 0 ? 0 : i < _nthetas ? i : _nthetas - 1; }
+    bool empty() const { return _content.nthetas <= 0 || _content.npsis <= 0; }
+    int clampTheta(int i) const { return i <= 0 ? 0 : i < _content.nthetas ? i : _content.nthetas - 1; }
     const float* row(int j) const {
-        return _candelas.get() + static_cast<std::size_t>(j) * static_cast<std::size_t>(_nthetas);
+        return _content.candelas.get() + static_cast<std::size_t>(j) * static_cast<std::size_t>(_content.nthetas);
     }
     float* copyRow(int j, IndexRange thetas, float* out) const;
 
-    std::wstring _name;
-    std::unique_ptr<float[]> _thetas;
-    float* _psis = nullptr;
-    std::unique_ptr<float[]> _candelas;
-    float _maxCandela = 0;
-    float _lumens = 0;
-    GeLinearMatrix3<float> _orientation;
-    std::int32_t _nthetas = 0;
-    std::int32_t _npsis = 0;
-    PhotoWebSymmetry _symmetry = PhotoWebSymmetry::Full;
-    bool _psiTruncated = false;
-    bool _identityOrientation = true;
-    bool _loaded = false;
-    Ov::PhotoFileInfo _file;
+    PhotoWebRecord _content;
 };
 
 inline float* RnBasePhotoWebData::copyRow(int j, IndexRange thetas, float* out) const {
     const float* values = row(j);
-    if (thetas.first >= 0 && thetas.last < _nthetas && thetas.first <= thetas.last) {
+    if (thetas.first >= 0 && thetas.last < _content.nthetas && thetas.first <= thetas.last) {
         // Nearly every block is 4 wide: a copy of known size is one instruction, others are a call.
         if (thetas.last - thetas.first == 3) return std::copy_n(values + thetas.first, 4, out);
         return std::copy(values + thetas.first, values + thetas.last + 1, out);
@@ -186,27 +178,28 @@ inline void RnBasePhotoWebData::getCandelaBlock(IndexRange psis, IndexRange thet
             for (std::int64_t i = thetas.first; i <= thetas.last; ++i) *out++ = 0;
         return;
     }
-    if (_symmetry == PhotoWebSymmetry::Axial) {
+    if (_content.symmetry == PhotoWebSymmetry::Axial) {
         for (std::int64_t h = psis.first; h <= psis.last; ++h) out = copyRow(0, thetas, out);
         return;
     }
-    const bool full = _symmetry == PhotoWebSymmetry::Full;
-    if (!full && _symmetry != PhotoWebSymmetry::Half && _symmetry != PhotoWebSymmetry::Quarter) return;
-    if (psis.first < -1 || psis.first >= _npsis)
+    const bool full = _content.symmetry == PhotoWebSymmetry::Full;
+    if (!full && _content.symmetry != PhotoWebSymmetry::Half && _content.symmetry != PhotoWebSymmetry::Quarter)
+        return;
+    if (psis.first < -1 || psis.first >= _content.npsis)
         Ov::Assertions::throwAssertionFailed("h >= -1 && h < _npsis", "components/photo/lid/photoweb", __LINE__);
 
     // Rows wrap around the circle, or turn back at both ends.
     int step = 1;
     int j = psis.first;
     if (j < 0) {
-        j = full ? _npsis - 1 : _npsis > 1 ? 1 : 0;
+        j = full ? _content.npsis - 1 : _content.npsis > 1 ? 1 : 0;
         step = full ? 1 : -1;
     }
     for (std::int64_t h = psis.first; h <= psis.last; ++h) {
         out = copyRow(j, thetas, out);
-        if (_npsis == 1) continue;
+        if (_content.npsis == 1) continue;
         j += step;
-        if (j >= 0 && j < _npsis) continue;
+        if (j >= 0 && j < _content.npsis) continue;
         if (full) {
             j = 0;
         } else {

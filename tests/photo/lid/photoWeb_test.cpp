@@ -5,6 +5,7 @@
 #include <numbers>
 #include <random>
 
+#include "components/photo/lid/fluxIntegral.h"
 #include "components/photo/lid/webEvaluation.h"
 #include "tests/photo/photoFixture.h"
 
@@ -117,6 +118,23 @@ TEST_F(PhotoWeb, FluxIsTheIntegral) {
     EXPECT_NEAR(webOf(cut, ten)->getLumens(), sphere / 2, 0.002 * sphere);
     EXPECT_EQ(webOf(cut, ten, 123)->getLumens(), 123);
     EXPECT_EQ(webOf(cut, [](double, double) { return -1; })->getLumens(), 0);
+}
+
+TEST_F(PhotoWeb, ARowIsIntegratedWithTheSineOfItsAngles) {
+    // The integral of t sin(t) is sin(t) - t cos(t): exact for values that are linear in the angle.
+    const auto antiderivative = [](double t) { return std::sin(t) - t * std::cos(t) - 5 * std::cos(t); };
+    for (const int n : {2, 3, 29, 30, 181})
+        for (const auto& [first, last] : {std::pair{0.0f, pi}, std::pair{0.5f, 1.2f}, std::pair{halfPi, pi}}) {
+            std::vector<float> angles, values;
+            for (int k = 0; k < n; ++k) {
+                angles.push_back(first + (last - first) * static_cast<float>(k) / static_cast<float>(n - 1));
+                values.push_back(angles.back() + 5);
+            }
+            const double exact = antiderivative(last) - antiderivative(first);
+            EXPECT_NEAR(photoWebIntegrate(n, angles.data(), values.data()), exact, 0.001 * exact)
+                << n << " " << first;
+            for (const int few : {0, 1}) EXPECT_EQ(photoWebIntegrate(few, angles.data(), values.data()), 0);
+        }
 }
 
 TEST_F(PhotoWeb, IndicesFold) {
