@@ -111,6 +111,9 @@ TEST_F(ToolConversion, LossIsMeasuredBetweenTheAnglesAndAtPolesOnce) {
     laid.candela = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
     folder.write("laid.ies", laid.text());
     EXPECT_LT(convert("laid.ies out.tbt")["maxCandelaDifferencePercent"], 1);
+    laid.candela = [](double, double) { return 100; };  // and dark behind
+    folder.write("laid.ies", laid.text());
+    EXPECT_LT(convert("laid.ies out.tbt")["maxCandelaDifferencePercent"], 1);
 }
 
 TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
@@ -124,9 +127,16 @@ TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
     laid.candela = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
     folder.write("laid.ies", laid.text());
     folder.write("jump.tbt", "t\n3\n1 1 1\n1000 1000 1 1 5 0\n4 3 5\n9 9 9\n9 9 9\n9 9 9\n9 9 9\n9 5 9\n-1\n");
-    folder.write(
-        "behind.cib",
-        "CIBSE/1\n\n\n\n\n\n\n\n1 2 0 0 0 1 0 0 0\n3 3\n-90 0 90\n0 45 90\n0 10 0\n0 7 0\n0 0 0\n99 0 0 0\n");
+    std::string behind = "CIBSE/1\n\n\n\n\n\n\n\n1 2 0 0 0 1 0 0 0\n19 10\n";
+    for (const double v : angles(-90, 90, 10)) behind += std::to_string(v) + "\n";
+    for (const double h : angles(0, 90, 10)) behind += std::to_string(h) + "\n";
+    const auto cosine = [](double degrees) { return std::cos(degrees * std::acos(-1) / 180); };
+    for (const double h : angles(0, 90, 10))
+        for (const double v : angles(-90, 90, 10)) behind += std::to_string(1000 * cosine(v) * cosine(h)) + "\n";
+    folder.write("behind.cib", behind + "99 0 0 0\n");
+    IesFile narrow{.type = 3, .verticals = angles(-10, 10, 0.5), .horizontals = angles(-10, 10, 0.5)};
+    narrow.candela = [](double v, double h) { return 5000 * std::exp(-v * v / 4 - h * h / 8); };
+    folder.write("narrow.ies", narrow.text());
     const struct {
         const char* files;
         const char* warning;
@@ -137,6 +147,7 @@ TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
         {"laid.ies out.tbt", "a pole where planes"},              // 10 to 200 cd
         {"jump.tbt out.ies", "the candela differ by up to 3.9"},  // next to plane 360
         {"behind.cib out.nmb", "the candela differ"},             // where the values go on below 0 and count as 0
+        {"narrow.ies out.tbt", "the candela differ"},             // finer steps were too many
     };
     for (const auto& c : cases)
         EXPECT_THAT(texts(convert(c.files)["warnings"]), testing::HasSubstr(c.warning)) << c.files;
