@@ -8,7 +8,7 @@ namespace {
 
 template <class Format>
 void tryFileOf(const Ov::RnUid& classId, std::string_view bytes) {
-    if (classId == Format::facts.classId) tryFile<Format>(bytes);
+    if (classId == Format::info.classId) tryFile<Format>(bytes);
 }
 
 }  // namespace

@@ -148,7 +148,7 @@ void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
     demand(written || !ordinary(web.getMaxCandela()) || !ordinary(web.getLumens()), "what is read is written");
     if (!written) return;
     io->seek(0, 0);
-    demand(recognisedAs(*io) == Format::facts.classId, "what is written is recognised as its format");
+    demand(recognisedAs(*io) == Format::info.classId, "what is written is recognised as its format");
     demand(!!imported<Format>(*io, io->bytes().size()), "what is written is read");
 }
 

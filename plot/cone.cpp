@@ -44,7 +44,7 @@ void drawTable(Canvas& canvas, const Box& room, const std::vector<double>& place
     }
 }
 
-/// The beam of a plane from the light at `apex` to the last distance at `bottom`.
+/// The beam of a plane from the luminaire at `apex` to the last distance at `bottom`.
 Path beamPath(Point apex, double bottom, const AngleSpan& beam, double scale) {
     return {apex, {apex.x + scale * offset(beam.first), bottom}, {apex.x + scale * offset(beam.last), bottom}};
 }

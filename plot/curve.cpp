@@ -53,7 +53,7 @@ std::vector<PlaneCurve> planeCurves(const Diagram& diagram) {
 
 namespace {
 
-/// A light among others: its name and as many of its notes as there is room for, two at least; else the name is cut.
+/// A luminaire among others: its name and as many of its notes as there is room for, two at least; else the name is cut.
 std::string legendText(const Canvas& canvas, const Subject& subject) {
     const double room = legendRoom(canvas);
     for (std::size_t count = subject.notes.size();; --count) {

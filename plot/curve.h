@@ -5,7 +5,7 @@
 
 namespace OvPlot {
 
-/// The intensities of a light in a plane: towards C for positive angles from the axis, towards C + 180 for
+/// The intensities of a luminaire in a plane: towards C for positive angles from the axis, towards C + 180 for
 /// negative ones, from -180 to 180 degrees in even steps.
 class PlaneCurve {
 public:
@@ -25,13 +25,13 @@ private:
 /// The curve around the origin: gamma 0 downwards, C to the right, at `scale` a candela. Closed.
 Path polarPath(const PlaneCurve& curve, double scale);
 
-/// "C0-C180", or what the plane of an aimed light is called.
+/// "C0-C180", or what the plane of an aimed luminaire is called.
 std::string planeName(const Subject& subject, double c);
 
 /// The caption of a diagram, with its planes where `planes`; the room that is left.
 Box drawCaption(Canvas& canvas, const Diagram& diagram, const std::string& subtitle, bool planes);
 
-/// The pen of a plane of a subject: colours tell lights apart or, for a single light, planes; dashes planes.
+/// The pen of a plane of a subject: colours tell luminaires apart or, for a single one, planes; dashes planes.
 Pen curvePen(const Canvas& canvas, const Diagram& diagram, std::size_t subject, std::size_t plane);
 
 /// Every curve of a diagram: those of a subject beside each other.

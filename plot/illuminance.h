@@ -6,7 +6,7 @@
 
 namespace OvPlot {
 
-/// On a plane `height` below a light, perpendicular to its axis, where the direction (gamma, C) meets it.
+/// On a plane `height` below a luminaire, perpendicular to its axis, where the direction (gamma, C) meets it.
 inline double horizontalIlluminance(const Subject& subject, double gamma, double c, double height) {
     const double cosine = std::cos(radians(gamma));
     if (!(cosine > 0)) return 0;

@@ -23,7 +23,7 @@ std::uint32_t pixelOf(Colour colour) {
 }
 
 /// Luminances of square pixels around the zenith, negative below the horizon.
-std::vector<float> luminances(Ov::RnNaturalLight& light) {
+std::vector<float> luminances(Ov::RnNaturalLight& daylight) {
     std::vector<float> values;
     constexpr double half = (pixelsAcross - 1) / 2.0;
     for (int row = 0; row < pixelsAcross; ++row) {
@@ -34,7 +34,7 @@ std::vector<float> luminances(Ov::RnNaturalLight& light) {
             const double azimuth = degrees(std::atan2(-east, south));
             // A little beyond the horizon, which a line covers.
             values.push_back(zenith > 91 ? -1
-                                         : light.getSkyLuminanceAt(static_cast<float>(std::min(zenith, 89.5)),
+                                         : daylight.getSkyLuminanceAt(static_cast<float>(std::min(zenith, 89.5)),
                                                                    static_cast<float>(azimuth)));
         }
     }
@@ -80,21 +80,21 @@ void drawDome(Canvas& canvas, const SkyDome& dome, const SkyWords& words) {
 
 }  // namespace
 
-void drawSky(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& caption) {
+void drawSky(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& caption) {
     std::vector<LegendItem> legend;
     for (const std::string& note : caption.notes) legend.push_back({{}, note});
     const Box room = drawCaption(canvas, caption.title, caption.subtitle, legend);
     const double radius = std::min((room.width() - 110) / 2, room.height() / 2 - 26);
     const SkyDome dome{{room.left + (room.width() - 80) / 2, room.centre().y}, radius, true};
 
-    const std::vector<float> values = luminances(light);
+    const std::vector<float> values = luminances(daylight);
     const double most = *std::max_element(values.begin(), values.end());
     const Axis axis = axisTo(most, 6);
     drawLuminances(canvas, dome, values, axis);
     drawDome(canvas, dome, caption.words);
-    const double altitude = degrees(light.getSolarAltitude());
+    const double altitude = degrees(daylight.getSolarAltitude());
     if (altitude > 0) {
-        const Point sun = dome.at(altitude, degrees(light.getSolarAzimuth()));
+        const Point sun = dome.at(altitude, degrees(daylight.getSolarAzimuth()));
         canvas.disc(sun, 9, colour(0x1a1a1a));
         canvas.disc(sun, 7, colour(0xffd23c));
     }

@@ -28,11 +28,11 @@ struct SkyCaption {
 };
 
 /// The sky's luminance as one sees it who looks up with north on top: east is on the left.
-void drawSky(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& caption);
+void drawSky(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& caption);
 
 /// The sun's ways over the site on the 21st of each month and on the set day, and where it stands at each hour of
 /// the clock, as on a map: east is on the right. `months` are short names.
-void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& caption,
+void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& caption,
                  const std::array<std::string, 12>& months);
 
 }  // namespace OvPlot

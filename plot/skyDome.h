@@ -3,7 +3,7 @@
 #include <array>
 
 #include "plot/canvas.h"
-#include "plot/lightFrame.h"
+#include "plot/luminaireFrame.h"
 
 namespace OvPlot {
 

@@ -195,10 +195,11 @@ void drawSolid(Canvas& canvas, const Diagram& diagram) {
             canvas.stroke(path, false, {palette.muted, 1.2, 0});
             continue;
         }
-        const double light = shade(piece.corners);
+        const double brightness = shade(piece.corners);
         const Colour base = palette.series[0];
         const Colour fill =
-            light < 0.5 ? mixed({0, 0, 0}, base, 0.45 + 1.1 * light) : mixed(base, {1, 1, 1}, 1.2 * (light - 0.5));
+            brightness < 0.5 ? mixed({0, 0, 0}, base, 0.45 + 1.1 * brightness)
+                             : mixed(base, {1, 1, 1}, 1.2 * (brightness - 0.5));
         canvas.face(path, fill, {mixed(fill, {0, 0, 0}, 0.25), 0.6, 0});
     }
     for (const AxisEnd& end : ends)

@@ -4,7 +4,7 @@
 
 namespace OvPlot {
 
-/// The photometric solid: in each direction as far from the light as it is bright there.
+/// The photometric solid: in each direction as far from the luminaire as it is bright there.
 struct SolidMesh {
     std::vector<double> gammas;  // where the radii change most, nearest to each other
     std::size_t planes = 0;      // C 0, 360 / planes, ...

@@ -15,8 +15,8 @@ struct SunPlace {
     double azimuth;
 };
 
-SunPlace sunPlace(Ov::RnNaturalLight& light) {
-    return {degrees(light.getSolarAltitude()), degrees(light.getSolarAzimuth())};
+SunPlace sunPlace(Ov::RnNaturalLight& daylight) {
+    return {degrees(daylight.getSolarAltitude()), degrees(daylight.getSolarAzimuth())};
 }
 
 /// Where the line between two places crosses the horizon.
@@ -40,22 +40,22 @@ std::vector<Path> aboveHorizon(const SkyDome& dome, const std::vector<SunPlace>&
 }
 
 /// The sun's way over the set day, from midnight to midnight by the sun.
-std::vector<Path> dayPaths(const SkyDome& dome, Ov::RnNaturalLight& light) {
+std::vector<Path> dayPaths(const SkyDome& dome, Ov::RnNaturalLight& daylight) {
     std::vector<SunPlace> places;
     for (double hour = 0; hour <= hoursInDay; hour += 0.05) {
-        light.setSolarTime(static_cast<float>(hour));
-        places.push_back(sunPlace(light));
+        daylight.setSolarTime(static_cast<float>(hour));
+        places.push_back(sunPlace(daylight));
     }
     return aboveHorizon(dome, places);
 }
 
 /// Where it stands over the year when the clock shows an hour.
-std::vector<SunPlace> hourPlaces(Ov::RnNaturalLight& light, int hour) {
+std::vector<SunPlace> hourPlaces(Ov::RnNaturalLight& daylight, int hour) {
     std::vector<SunPlace> places;
     for (int day = 1; day <= daysInYear; day += 4) {
-        light.setDayOfYear(static_cast<std::uint16_t>(day));
-        light.setLocalTime(static_cast<float>(hour));
-        places.push_back(sunPlace(light));
+        daylight.setDayOfYear(static_cast<std::uint16_t>(day));
+        daylight.setLocalTime(static_cast<float>(hour));
+        places.push_back(sunPlace(daylight));
     }
     places.push_back(places.front());
     return places;
@@ -137,7 +137,7 @@ std::vector<LegendItem> legendOf(const SkyCaption& caption, const std::array<std
 
 }  // namespace
 
-void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& caption,
+void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& caption,
                  const std::array<std::string, 12>& months) {
     const Palette& palette = canvas.palette();
     const Pen pens[4] = {{palette.series[0], 1.6, 0},
@@ -154,8 +154,8 @@ void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& ca
                   {15, palette.ink, true});
 
     // The position that was set is that of one moment; the ways follow from the site.
-    const SunPlace now = sunPlace(light);
-    const Ov::RnRef<Ov::RnNaturalLight> moving = light.clone();
+    const SunPlace now = sunPlace(daylight);
+    const Ov::RnRef<Ov::RnNaturalLight> moving = daylight.clone();
     moving->setOverrideSolarPosition(false);
     std::vector<std::vector<SunPlace>> hours;
     for (int hour = 0; hour < hoursInDay; ++hour) {
@@ -170,7 +170,7 @@ void drawSunPath(Canvas& canvas, Ov::RnNaturalLight& light, const SkyCaption& ca
                  std::to_string(monthDay) + caption.words.dayEnd + months[static_cast<std::size_t>(month - 1)],
                  month > 6);
     }
-    moving->setDayOfYear(light.getDayOfYear());
+    moving->setDayOfYear(daylight.getDayOfYear());
     strokeAll(canvas, dayPaths(dome, *moving), pens[3]);
     if (now.altitude > 0) {
         const Point sun = dome.at(now.altitude, now.azimuth);

@@ -11,7 +11,7 @@
 
 // Wrappers and what any format reports.
 #define OVPHOTO_MESSAGES_GENERAL(message) \
-    message(naturalLightLine, 12896, std::wstring, int)  /* detail, line */ \
+    message(daylightLine,     12896, std::wstring, int)  /* detail, line */ \
     message(nimbLine,         12897, int, std::wstring)  /* line, detail */ \
     message(webRefused,       12935) \
     message(outOfMemory,      12936) \
@@ -21,34 +21,34 @@
 
 // Natural light, text form: the line that is missing or malformed. Put into 12896 as they stand.
 #define OVPHOTO_MESSAGES_NATURAL_LIGHT(message) \
-    message(lightHeader,                   12898) \
-    message(lightOnOff,                    12899) \
-    message(lightOnOffWord,                12900) \
-    message(lightInOut,                    12901) \
-    message(lightInOutWord,                12902) \
-    message(lightNorth,                    12903) \
-    message(lightLatitude,                 12904) \
-    message(lightLongitude,                12905) \
-    message(lightDay,                      12906) \
-    message(lightDaylightSaving,           12907) \
-    message(lightDaylightSavingWord,       12908) \
-    message(lightLocalTime,                12909) \
-    message(lightTimeZone,                 12910) \
-    message(lightSkyCover,                 12911) \
-    message(lightSunColor,                 12912) \
-    message(lightSkyColor,                 12913) \
-    message(lightOverwritePosition,        12914) \
-    message(lightOverwritePositionWord,    12915) \
-    message(lightSolarAltitude,            12916) \
-    message(lightSolarAzimuth,             12917) \
-    message(lightOverwriteIlluminance,     12918) \
-    message(lightOverwriteIlluminanceWord, 12919) \
-    message(lightDirectNormalIlluminance,  12920) \
-    message(lightSkyCastsShadows,          12921) \
-    message(lightSunFlags,                 12922) \
-    message(lightSkyFlags,                 12923) \
-    message(lightSkyShadowsAccuracy,       12924) \
-    message(lightNotFinite,                13081, std::wstring)  /* line; this one stands alone */
+    message(daylightHeader,                   12898) \
+    message(daylightOnOff,                    12899) \
+    message(daylightOnOffWord,                12900) \
+    message(daylightInOut,                    12901) \
+    message(daylightInOutWord,                12902) \
+    message(daylightNorth,                    12903) \
+    message(daylightLatitude,                 12904) \
+    message(daylightLongitude,                12905) \
+    message(daylightDay,                      12906) \
+    message(daylightSaving,                   12907) \
+    message(daylightSavingWord,               12908) \
+    message(daylightLocalTime,                12909) \
+    message(daylightTimeZone,                 12910) \
+    message(daylightSkyCover,                 12911) \
+    message(daylightSunColor,                 12912) \
+    message(daylightSkyColor,                 12913) \
+    message(daylightOverwritePosition,        12914) \
+    message(daylightOverwritePositionWord,    12915) \
+    message(daylightSolarAltitude,            12916) \
+    message(daylightSolarAzimuth,             12917) \
+    message(daylightOverwriteIlluminance,     12918) \
+    message(daylightOverwriteIlluminanceWord, 12919) \
+    message(daylightDirectNormalIlluminance,  12920) \
+    message(daylightSkyCastsShadows,          12921) \
+    message(daylightSunFlags,                 12922) \
+    message(daylightSkyFlags,                 12923) \
+    message(daylightSkyShadowsAccuracy,       12924) \
+    message(daylightNotFinite,                13081, std::wstring)  /* line; this one stands alone */
 
 // Installing a web.
 #define OVPHOTO_MESSAGES_WEB(message) \

@@ -89,7 +89,7 @@ static_assert(!takes<messages::lampCount, double> && !takes<messages::lampCount,
 static_assert(!takes<messages::lampCount, const wchar_t*> && !takes<messages::lampCount, std::int64_t>);
 static_assert(!takes<messages::tbtFlux, std::wstring> && !takes<messages::tbtFlux, int>);
 static_assert(!takes<messages::fileNotRead, int> && !takes<messages::fileNotRead, std::string>);
-static_assert(!takes<messages::naturalLightLine, int, std::wstring>);  // in the other order
+static_assert(!takes<messages::daylightLine, int, std::wstring>);  // in the other order
 
 TEST_P(MessageTexts, EveryNumberHasATextThatShowsItsArguments) {
     for (const MessageEntry& message : messages::all) {
@@ -113,7 +113,7 @@ TEST_P(MessageTexts, EveryTextHasANumber) {
 
 TEST_P(MessageTexts, WhatStandsInOtherTextsFits) {
     // Natural light puts its details in as they are, without resolving escapes.
-    for (unsigned id = messages::lightHeader; id <= messages::lightSkyShadowsAccuracy; ++id)
+    for (unsigned id = messages::daylightHeader; id <= messages::daylightSkyShadowsAccuracy; ++id)
         EXPECT_EQ(catalogue.getText(id).find(L'%'), std::wstring::npos) << id;
     for (unsigned id = messages::tbtTokenNumber; id <= messages::tbtTokenOther; ++id)
         EXPECT_LE(catalogue.format(id, L"1234567.125").size(), 63u) << id;

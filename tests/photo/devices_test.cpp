@@ -46,7 +46,7 @@ protected:
                    Ov::rnCreate<Spotlight>(),
                    Ov::rnCreate<DaylightData>()};
         for (const Ov::RnUid& id :
-             {CibseFormat::facts.classId, NimbFormat::facts.classId, TbtFormat::facts.classId})
+             {CibseFormat::info.classId, NimbFormat::info.classId, TbtFormat::info.classId})
             sources.push_back(reread(id, *distributionOf(*web)));
     }
 

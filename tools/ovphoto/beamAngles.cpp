@@ -83,7 +83,7 @@ BeamAngles anglesIn(const char* plane, const Curve& curve) {
 
 }  // namespace
 
-OvPlot::LightFrame mainFrame(RnPhotoWebData& web) {
+OvPlot::LuminaireFrame mainFrame(RnPhotoWebData& web) {
     const PhotoFileInfo file = fileInfoOf(web);
     const double psi = file.psi(0);
     const Vector towards0{std::cos(psi), std::sin(psi), 0};
@@ -93,7 +93,7 @@ OvPlot::LightFrame mainFrame(RnPhotoWebData& web) {
 }
 
 std::vector<BeamAngles> beamAngles(const RnWebIntensityDist& light) {
-    const OvPlot::LightFrame frame = mainFrame(*light.getWeb());
+    const OvPlot::LuminaireFrame frame = mainFrame(*light.getWeb());
     return {anglesIn(frame.aimed ? "horizontal" : "C0-C180", {light, frame.down, frame.c0}),
             anglesIn(frame.aimed ? "vertical" : "C90-C270", {light, frame.down, frame.c90})};
 }

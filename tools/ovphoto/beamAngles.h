@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "ovphoto/intensityDist.h"
-#include "plot/lightFrame.h"
+#include "plot/luminaireFrame.h"
 
 namespace OvTool {
 
@@ -20,7 +20,7 @@ struct BeamAngles {
 /// Where the light's axis and its two main planes lie in the frame of its web, by the angles of its file: C0-C180 and
 /// C90-C270 are the planes of horizontal 0 and 90 degrees; where planes go through a horizontal axis (types A and B)
 /// they are those of vertical 0 and of horizontal 0 through the axis of the light.
-OvPlot::LightFrame mainFrame(Ov::RnPhotoWebData& web);
+OvPlot::LuminaireFrame mainFrame(Ov::RnPhotoWebData& web);
 
 /// The angles of the light's two main planes, from its interpolated intensities.
 std::vector<BeamAngles> beamAngles(const Ov::RnWebIntensityDist& light);

@@ -87,7 +87,7 @@ bool cibseToWeb(const CibseRecord& rec, PhotoWebCIBSE& web, bool loaded, const w
     WebLayout layout;
     if (!(isType1(rec) ? polarLayout(rec.grid, type1, layout) : lateralLayout(rec.grid, type2, layout)))
         return false;
-    return installed([&] { return install(rec, layout, web, loaded, name); });
+    return installOrReport([&] { return install(rec, layout, web, loaded, name); });
 }
 
 bool cibseRecordFromDistribution(Ov::RnIntensityDist& dist, CibseRecord& rec) {

@@ -9,8 +9,8 @@ namespace OvPhotometrics {
 struct CibseFormat {
     using Web = PhotoWebCIBSE;
     using Record = CibseRecord;
-    static constexpr BuilderFacts facts{classIds::cibseWeb, photometricWebCategory, L"CIBSE Web",
-                                        L"CIBSE Photometric Web"};
+    static constexpr BuilderInfo info{classIds::cibseWeb, photometricWebCategory, L"CIBSE Web",
+                                      L"CIBSE Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{.holdsOrientation = true};
     static constexpr const wchar_t* extension = L"cib";
     static constexpr const char* source = "components/photo/cibse/cibse";

@@ -13,9 +13,9 @@ using DiffusePersistant = CandelaPersistant<Diffuse>;
 /// A Lambertian emitter that faces +Z: candela times the cosine, 0 behind; flux = pi candela.
 class Diffuse final : public CosineDist<Diffuse, DiffusePersistant, Ov::RnDiffuseIntensityDist> {
 public:
-    static constexpr BuilderFacts facts{classIds::diffuse, distributionCategory, L"Diffuse Distribution",
-                                        L"Diffuse Light Intensity Distribution"};
-    static constexpr Ov::RnUid classId = facts.classId;
+    static constexpr BuilderInfo info{classIds::diffuse, distributionCategory, L"Diffuse Distribution",
+                                      L"Diffuse Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = info.classId;
 
     float law(float cosine) const { return cosine > 0 ? orDark(cosine * candela) : 0; }
     float getFlux() const override { return orDark(candela * pi); }

@@ -13,9 +13,9 @@ using IsotropicPersistant = CandelaPersistant<Isotropic>;
 /// The same intensity in every direction: flux = 4 pi candela.
 class Isotropic final : public AnalyticDist<Isotropic, IsotropicPersistant, Ov::RnIsotropicIntensityDist> {
 public:
-    static constexpr BuilderFacts facts{classIds::isotropic, distributionCategory, L"Isotropic Distribution",
-                                        L"Isotropic Light Intensity Distribution"};
-    static constexpr Ov::RnUid classId = facts.classId;
+    static constexpr BuilderInfo info{classIds::isotropic, distributionCategory, L"Isotropic Distribution",
+                                      L"Isotropic Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = info.classId;
 
     float intensity(float, float) const override { return orDark(candela); }
     float intensityAt(const GeVector3<float>&) const override { return orDark(candela); }

@@ -21,9 +21,9 @@ public:
 /// The flux is the integral of that over the cone.
 class Spotlight final : public CosineDist<Spotlight, SpotlightPersistant, Ov::RnSpotlightIntensityDist> {
 public:
-    static constexpr BuilderFacts facts{classIds::spotlight, distributionCategory, L"Spotlight Distribution",
-                                        L"Spotlight Light Intensity Distribution"};
-    static constexpr Ov::RnUid classId = facts.classId;
+    static constexpr BuilderInfo info{classIds::spotlight, distributionCategory, L"Spotlight Distribution",
+                                      L"Spotlight Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = info.classId;
 
     Spotlight() { setCosines(0.8660254f, 0.5f); }
 

@@ -27,9 +27,9 @@ public:
 class Web final : public Ov::RnDataObject<Web, WebPersistant, ManyIntensities, Ov::RnWebIntensityDist,
                                           Ov::RnIntensityDist, ManyIntensities> {
 public:
-    static constexpr BuilderFacts facts{classIds::webDistribution, distributionCategory, L"Web Distribution",
-                                        L"Web Light Intensity Distribution"};
-    static constexpr Ov::RnUid classId = facts.classId;
+    static constexpr BuilderInfo info{classIds::webDistribution, distributionCategory, L"Web Distribution",
+                                      L"Web Light Intensity Distribution"};
+    static constexpr Ov::RnUid classId = info.classId;
 
     RnRef<Ov::RnIntensityDist> reference() override { return RnRef<Ov::RnIntensityDist>::share(this); }
     /// Shares the web.
@@ -86,7 +86,7 @@ private:
 
 /// Builds web distributions, and has the setting of how the module's webs are saved.
 class WebBuilder final
-    : public FactsBuilder<
+    : public InfoBuilder<
           Web, Ov::RnCastImpl2<LidBuilder, Ov::RnWebSaveForm, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
 public:
     bool isFaithful() const override { return websAreSavedFaithfully(); }

@@ -10,10 +10,10 @@ namespace OvPhotometrics {
 
 namespace {
 
-/// Comparisons of file angles within a format's tolerance, in single precision.
-struct Tolerance {
-    float t;
-    bool about(float a, float b) const { return a + t >= b && a <= b + t; }
+/// Whether angles of a file are the same within its format's tolerance, in single precision.
+struct SameWithin {
+    float tolerance;
+    bool operator()(float a, float b) const { return a + tolerance >= b && a <= b + tolerance; }
 };
 
 template <class... Types>
@@ -31,19 +31,19 @@ bool checkAngleOrder(const CandelaGrid& grid, bool anyHorizontalOrder) {
 
 /// Planes that start at 0.
 bool layoutFrom0(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout) {
-    const Tolerance is{rules.tolerance};
+    const SameWithin same{rules.tolerance};
     const float hn = grid.horizontalAngles.back();
     const int n = grid.horizontalCount;
-    if (n == 1 || (n == 2 && is.about(hn, 360))) {
+    if (n == 1 || (n == 2 && same(hn, 360))) {
         layout.symmetry = PhotoWebSymmetry::Axial;
         layout.columns = 1;
-    } else if (is.about(hn, 90)) {
+    } else if (same(hn, 90)) {
         layout.symmetry = PhotoWebSymmetry::Quarter;
-    } else if (is.about(hn, 180)) {
+    } else if (same(hn, 180)) {
         layout.symmetry = PhotoWebSymmetry::Half;
     } else if (hn > 180 + rules.tolerance && hn <= 360 + rules.tolerance) {
         layout.symmetry = PhotoWebSymmetry::Full;
-        if (is.about(hn, 360)) layout.columns = n - 1;  // plane 360 repeats plane 0
+        if (same(hn, 360)) layout.columns = n - 1;  // plane 360 repeats plane 0
     } else {
         return refuse(rules.lastHorizontal, hn);
     }
@@ -53,25 +53,25 @@ bool layoutFrom0(const CandelaGrid& grid, const PolarRules& rules, WebLayout& la
 }  // namespace
 
 bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& layout) {
-    const Tolerance is{rules.tolerance};
+    const SameWithin same{rules.tolerance};
     const float h0 = grid.horizontalAngles.front();
     const float hn = grid.horizontalAngles.back();
-    const bool from270 = rules.from270 && is.about(h0, 270);
+    const bool from270 = rules.from270 && same(h0, 270);
     if (!checkAngleOrder(grid, from270)) return false;
 
     const float v0 = grid.verticalAngles.front();
     const float vn = grid.verticalAngles.back();
-    const bool lower = is.about(v0, 0) && (is.about(vn, 90) || is.about(vn, 180));
-    if (!lower && !(is.about(v0, 90) && is.about(vn, 180))) return refuse(rules.verticalRange);
+    const bool lower = same(v0, 0) && (same(vn, 90) || same(vn, 180));
+    if (!lower && !(same(v0, 90) && same(vn, 180))) return refuse(rules.verticalRange);
 
     layout = {.columns = grid.horizontalCount};
-    if (is.about(h0, 0)) return layoutFrom0(grid, rules, layout);
-    const bool from90 = is.about(h0, 90) && is.about(hn, 270);
+    if (same(h0, 0)) return layoutFrom0(grid, rules, layout);
+    const bool from90 = same(h0, 90) && same(hn, 270);
     if (!from90 && !from270) return refuse(rules.firstHorizontal, h0);
     layout.horizontalShift = from90 ? -90 : -270;
-    if (from90 || is.about(hn, 90)) {
+    if (from90 || same(hn, 90)) {
         layout.symmetry = PhotoWebSymmetry::Half;
-    } else if (is.about(hn, 270)) {
+    } else if (same(hn, 270)) {
         --layout.columns;  // the last plane repeats the first
     }
     return true;
@@ -79,7 +79,7 @@ bool polarLayout(const CandelaGrid& grid, const PolarRules& rules, WebLayout& la
 
 bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout& layout) {
     if (!checkAngleOrder(grid, false)) return false;
-    const Tolerance is{rules.tolerance};
+    const SameWithin same{rules.tolerance};
     const float t = rules.tolerance;
     const float v0 = grid.verticalAngles.front();
     const float vn = grid.verticalAngles.back();
@@ -88,7 +88,7 @@ bool lateralLayout(const CandelaGrid& grid, const LateralRules& rules, WebLayout
     if (grid.horizontalCount < 2) return refuse(rules.horizontalCount);
 
     const float h0 = grid.horizontalAngles.front();
-    const bool oneSided = is.about(h0, 0);
+    const bool oneSided = same(h0, 0);
     if (grid.horizontalAngles.back() > 90 + t || (!oneSided && (h0 + t >= 0 || h0 + t < -90)))
         return refuse(rules.horizontalRange);
     layout = {.symmetry = oneSided ? PhotoWebSymmetry::Half : PhotoWebSymmetry::Full,

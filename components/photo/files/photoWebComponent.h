@@ -22,7 +22,7 @@
 //     struct IesFormat {
 //         using Web = PhotoWebIES;               // final, derived from PhotoWebOf<PhotoWebIES, IesFormat>
 //         using Record = IesFileRecord;          // the file as plain values; owns its parts
-//         static constexpr BuilderFacts facts;   // class id and texts
+//         static constexpr BuilderInfo info;   // class id and texts
 //         static constexpr PhotoFormatTraits traits;  // what its files are like
 //         static constexpr const wchar_t* extension;
 //         static constexpr const char* source;   // what stream exceptions carry: source path, lines, stream name
@@ -111,8 +111,8 @@ template <class Self, class Format>
 class PhotoWebOf : public Ov::RnDataObject<Self, PhotoWebPersistant<Format>, RnBasePhotoWebData,
                                            Ov::RnPhotoFileWeb, Ov::RnPhotoWebData, RnBasePhotoWebData> {
 public:
-    static constexpr BuilderFacts facts = Format::facts;
-    static constexpr Ov::RnUid classId = Format::facts.classId;
+    static constexpr BuilderInfo info = Format::info;
+    static constexpr Ov::RnUid classId = Format::info.classId;
 
     RnRef<Ov::RnPhotoWebData> clone() const override { return Ov::rnCreate<Self>(self()); }
     // The shared evaluation: of one direction with this class's own queries, of many straight from the grid. A
@@ -168,8 +168,8 @@ private:
 /// Builds webs of a format and imports them.
 template <class Format>
 class PhotoWebBuilder final
-    : public FactsBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
-                                                                Ov::RnComponentBuilder, Ov::RnBuilderDescription>>,
+    : public InfoBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
+                                                               Ov::RnComponentBuilder, Ov::RnBuilderDescription>>,
       public FileFormat {
 public:
     using Ov::RnImportBuilder::canImport;

@@ -45,7 +45,7 @@ bool iesRecordToWeb(const IesFileRecord& rec, PhotoWebIES& web, bool loaded, con
                     const wchar_t* basePath) {
     WebLayout layout;
     if (!chooseLayout(rec, layout)) return false;
-    return installed([&] { return install(rec, layout, web, loaded, name, basePath); });
+    return installOrReport([&] { return install(rec, layout, web, loaded, name, basePath); });
 }
 
 }  // namespace OvPhotometrics

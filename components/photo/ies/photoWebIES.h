@@ -11,8 +11,8 @@ namespace OvPhotometrics {
 struct IesFormat {
     using Web = PhotoWebIES;
     using Record = IesFileRecord;
-    static constexpr BuilderFacts facts{classIds::iesWeb, photometricWebCategory, L"IES Web",
-                                        L"IES Photometric Web"};
+    static constexpr BuilderInfo info{classIds::iesWeb, photometricWebCategory, L"IES Web",
+                                      L"IES Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{.holdsLampLumens = true, .holdsOrientation = true};
     static constexpr const wchar_t* extension = L"ies";
     static constexpr const char* source = "components/photo/ies/ies";

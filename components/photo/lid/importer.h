@@ -9,15 +9,15 @@ namespace OvPhotometrics {
 /// Imports photometric files without being told their format. The one in the registry is not counted; those that
 /// `create` makes are.
 class LidImporter
-    : public FactsBuilder<
+    : public InfoBuilder<
           Ov::RnCastHeap<LidImporter>,
           Ov::RnCastImpl2<LidBuilder, Ov::RnBaseImporter, Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
 public:
-    static constexpr BuilderFacts facts{classIds::importer, photometricWebCategory, L"LID Importer",
-                                        L"Photometric file importer."};
+    static constexpr BuilderInfo info{classIds::importer, photometricWebCategory, L"LID Importer",
+                                      L"Photometric file importer."};
 
     bool isCreatable() const override { return false; }
-    const wchar_t* getImportCategory() const override { return facts.category; }
+    const wchar_t* getImportCategory() const override { return info.category; }
 };
 
 }  // namespace OvPhotometrics

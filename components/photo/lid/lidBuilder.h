@@ -6,7 +6,7 @@
 namespace OvPhotometrics {
 
 /// What a builder says of the class that it builds.
-struct BuilderFacts {
+struct BuilderInfo {
     Ov::RnUid classId;
     const wchar_t* category;
     const wchar_t* name;
@@ -29,20 +29,19 @@ public:
     bool isCreatable() const override { return true; }
 };
 
-/// A builder's answers from `T::facts`, over `Base`, a LidBuilder that answers the castable operations.
+/// A builder's answers from `T::info`, over `Base`, a LidBuilder that answers the castable operations.
 template <class T, class Base>
-class FactsBuilder : public Base {
+class InfoBuilder : public Base {
 public:
-    const Ov::RnUid& getClassId() const override { return T::facts.classId; }
-    const wchar_t* getCategory() const override { return T::facts.category; }
-    const wchar_t* getName() const override { return T::facts.name; }
-    const wchar_t* getDescription() const override { return T::facts.description; }
+    const Ov::RnUid& getClassId() const override { return T::info.classId; }
+    const wchar_t* getCategory() const override { return T::info.category; }
+    const wchar_t* getName() const override { return T::info.name; }
+    const wchar_t* getDescription() const override { return T::info.description; }
     Ov::RnRef<Ov::RnCastable> create() override { return Ov::rnCreateOrNull<T>(); }
 };
 
 /// Builds objects of a class that no file is imported into.
 template <class T>
-using ObjectBuilder =
-    FactsBuilder<T, Ov::RnCastImpl<LidBuilder, Ov::RnComponentBuilder, Ov::RnBuilderDescription>>;
+using ObjectBuilder = InfoBuilder<T, Ov::RnCastImpl<LidBuilder, Ov::RnComponentBuilder, Ov::RnBuilderDescription>>;
 
 }  // namespace OvPhotometrics

@@ -21,7 +21,7 @@ bool withinMemory(Work&& work) {
 /// Does `install`, which answers whether a web took the record that it filled; false after message 12935, or 12936
 /// where memory runs out.
 template <class Install>
-bool installed(Install&& install) {
+bool installOrReport(Install&& install) {
     return withinMemory([&] {
         if (install()) return true;
         reportMessage(messages::webRefused);

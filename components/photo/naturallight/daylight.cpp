@@ -63,7 +63,7 @@ SolarPosition placeSun(Daylight& out, const Ov::NaturalLightSettings& in, double
     return sun;
 }
 
-void light(Daylight& out, const Ov::NaturalLightSettings& in, double altitude, int day) {
+void addIlluminances(Daylight& out, const Ov::NaturalLightSettings& in, double altitude, int day) {
     out.skyType = skyTypeOf(coverOf(in.skyCover));
     const double direct = in.overrideSolarIlluminance ? finite(in.directNormalIlluminance)
                                                       : directNormalIlluminance(out.skyType, altitude, day);
@@ -99,7 +99,7 @@ Daylight computeDaylight(const Ov::NaturalLightSettings& settings, std::optional
     const int day = std::clamp<int>(settings.day, 1, daysInYear);
     const double time = tellTime(out, settings, solarTime, day);
     const SolarPosition sun = placeSun(out, settings, time, day);
-    light(out, settings, sun.altitude, day);
+    addIlluminances(out, settings, sun.altitude, day);
     out.sunColor = normalized(settings.sunColor);
     out.skyColor = normalized(settings.skyColor);
     return out;

@@ -119,7 +119,7 @@ template <class Read>
 bool readBlock(RnStream& in, int count, Read read) {
     const std::string bytes = nextBytes(in, count);
     if (bytes.size() < static_cast<std::size_t>(count)) {
-        reportFormError(messages::lightHeader, 0);
+        reportFormError(messages::daylightHeader, 0);
         return false;
     }
     RnStream block(Ov::rnCreate<Ov::RnMemoryBuffer>(bytes).get(), RnStream::Form::binary);

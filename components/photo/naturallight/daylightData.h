@@ -13,9 +13,9 @@ class DaylightDataPersistant;
 class DaylightData final
     : public Ov::RnDataObject<DaylightData, DaylightDataPersistant, Ov::RnNaturalLight, Ov::RnNaturalLight> {
 public:
-    static constexpr BuilderFacts facts{classIds::naturalLight, L"Natural Lighting", L"Natural Lighting",
-                                        L"Daylight and skylight lighting."};
-    static constexpr Ov::RnUid classId = facts.classId;
+    static constexpr BuilderInfo info{classIds::naturalLight, L"Natural Lighting", L"Natural Lighting",
+                                      L"Daylight and skylight lighting."};
+    static constexpr Ov::RnUid classId = info.classId;
 
     Ov::RnRef<Ov::RnNaturalLight> clone() const override { return Ov::rnCreate<DaylightData>(*this); }
     void setEnabled(bool on) override { _settings.enabled = on; }

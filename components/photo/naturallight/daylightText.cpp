@@ -134,42 +134,43 @@ private:
 
 /// What every release has.
 bool readCommon(TextReader& text, Settings& s) {
-    return text.word(m::lightOnOff, m::lightOnOffWord, L" Natural light is: %3s\n", L"Off", L"On", s.enabled) &&
-           text.word(m::lightInOut, m::lightInOutWord, L"In/Out: %3s\n", L"In", L"Out", s.outside) &&
-           text.degrees(m::lightNorth, L"North: %lg\n", s.north) &&
-           text.degrees(m::lightLatitude, L"Latitude: %lg\n", s.latitude) &&
-           text.degrees(m::lightLongitude, L"Longitude: %lg\n", s.longitude) &&
-           text.fields(1, m::lightDay, L"Day: %hd\n", &s.day) &&
-           text.word(m::lightDaylightSaving, m::lightDaylightSavingWord, L"Daylight Savings Time: %3s\n", L"No",
-                     L"Yes", s.daylightSaving) &&
-           text.number(m::lightLocalTime, L"Local Time: %lg\n", s.localTime) &&
-           text.number(m::lightTimeZone, L"Time Zone: %lg\n", s.timeZone) &&
-           text.number(m::lightSkyCover, L"Sky Cover: %lg\n", s.skyCover) &&
-           text.color(m::lightSunColor, L"Sun Color: %g %g %g\n", s.sunColor) &&
-           text.color(m::lightSkyColor, L"Sky Color: %g %g %g\n", s.skyColor);
+    return text.word(m::daylightOnOff, m::daylightOnOffWord, L" Natural light is: %3s\n", L"Off", L"On",
+                     s.enabled) &&
+           text.word(m::daylightInOut, m::daylightInOutWord, L"In/Out: %3s\n", L"In", L"Out", s.outside) &&
+           text.degrees(m::daylightNorth, L"North: %lg\n", s.north) &&
+           text.degrees(m::daylightLatitude, L"Latitude: %lg\n", s.latitude) &&
+           text.degrees(m::daylightLongitude, L"Longitude: %lg\n", s.longitude) &&
+           text.fields(1, m::daylightDay, L"Day: %hd\n", &s.day) &&
+           text.word(m::daylightSaving, m::daylightSavingWord, L"Daylight Savings Time: %3s\n", L"No", L"Yes",
+                     s.daylightSaving) &&
+           text.number(m::daylightLocalTime, L"Local Time: %lg\n", s.localTime) &&
+           text.number(m::daylightTimeZone, L"Time Zone: %lg\n", s.timeZone) &&
+           text.number(m::daylightSkyCover, L"Sky Cover: %lg\n", s.skyCover) &&
+           text.color(m::daylightSunColor, L"Sun Color: %g %g %g\n", s.sunColor) &&
+           text.color(m::daylightSkyColor, L"Sky Color: %g %g %g\n", s.skyColor);
 }
 
 bool readPosition(TextReader& text, Settings& s) {
-    if (!text.word(m::lightOverwritePosition, m::lightOverwritePositionWord, L"Overwrite Solar Position: %3s\n",
-                   L"No", L"Yes", s.overrideSolarPosition))
+    if (!text.word(m::daylightOverwritePosition, m::daylightOverwritePositionWord,
+                   L"Overwrite Solar Position: %3s\n", L"No", L"Yes", s.overrideSolarPosition))
         return false;
     return !s.overrideSolarPosition ||
-           (text.number(m::lightSolarAltitude, L"Solar Altitude: %lg\n", s.solarAltitude) &&
-            text.number(m::lightSolarAzimuth, L"Solar Azimuth: %lg\n", s.solarAzimuth));
+           (text.number(m::daylightSolarAltitude, L"Solar Altitude: %lg\n", s.solarAltitude) &&
+            text.number(m::daylightSolarAzimuth, L"Solar Azimuth: %lg\n", s.solarAzimuth));
 }
 
 bool readIlluminance(TextReader& text, Settings& s) {
-    if (!text.word(m::lightOverwriteIlluminance, m::lightOverwriteIlluminanceWord,
+    if (!text.word(m::daylightOverwriteIlluminance, m::daylightOverwriteIlluminanceWord,
                    L"Overwrite Solar Illuminance: %3s\n", L"No", L"Yes", s.overrideSolarIlluminance))
         return false;
     return !s.overrideSolarIlluminance ||
-           text.number(m::lightDirectNormalIlluminance, L"Direct Normal Solar Illuminance: %lg\n",
+           text.number(m::daylightDirectNormalIlluminance, L"Direct Normal Solar Illuminance: %lg\n",
                        s.directNormalIlluminance);
 }
 
 bool readFlags(TextReader& text, Settings& s) {
-    return text.flags(m::lightSunFlags, L"Sun Flags: 0x%hx\n", setSunFlags, s) &&
-           text.flags(m::lightSkyFlags, L"Sky Flags: 0x%hx\n", setSkyFlags, s);
+    return text.flags(m::daylightSunFlags, L"Sun Flags: 0x%hx\n", setSunFlags, s) &&
+           text.flags(m::daylightSkyFlags, L"Sky Flags: 0x%hx\n", setSkyFlags, s);
 }
 
 void writeLines(TextWriter& text, const Settings& s) {
@@ -199,7 +200,7 @@ bool writeDaylightText(RnStream& out, const Settings& s) {
     TextWriter trial(nullptr);
     writeLines(trial, s);
     if (!trial.notFinite().empty()) {
-        reportMessage(m::lightNotFinite, trial.notFinite());
+        reportMessage(m::daylightNotFinite, trial.notFinite());
         return false;
     }
     TextWriter text(&out);
@@ -213,12 +214,13 @@ std::optional<Settings> readDaylightText(RnStream& in) {
     int version = 0;
     int release = 0;
     const bool isRead =
-        text.fields(2, m::lightHeader, L" Marovendel Natural Light Version %d, Release %d", &version, &release) &&
+        text.fields(2, m::daylightHeader, L" Marovendel Natural Light Version %d, Release %d", &version,
+                    &release) &&
         readCommon(text, s) && (release < 1 || (readPosition(text, s) && readIlluminance(text, s))) &&
-        (release != 2 || text.yes(m::lightSkyCastsShadows, L"Sky Casts Shadows: %3s\n", s.skyCastsShadows)) &&
+        (release != 2 || text.yes(m::daylightSkyCastsShadows, L"Sky Casts Shadows: %3s\n", s.skyCastsShadows)) &&
         (release < 3 || readFlags(text, s)) &&
         (release < 2 ||
-         text.number(m::lightSkyShadowsAccuracy, L"Sky Shadows Accuracy: %lg\n", s.skyShadowAccuracy));
+         text.number(m::daylightSkyShadowsAccuracy, L"Sky Shadows Accuracy: %lg\n", s.skyShadowAccuracy));
     return isRead ? std::optional(s) : std::nullopt;
 }
 

@@ -36,7 +36,7 @@ void setSkyFlags(Settings& s, unsigned word) { setFlags(word, s.skyCastsShadows,
 void reportFormError(Ov::Message<> message, int line) {
     const Report report;
     const std::wstring detail = report.rawText(message);
-    report.postWrapped(detail, messages::naturalLightLine, detail, line);
+    report.postWrapped(detail, messages::daylightLine, detail, line);
 }
 
 }  // namespace OvPhotometrics

@@ -162,7 +162,7 @@ SamplingPlan planGrid(Ov::RnIntensityDist& dist, NimbRecord& rec) {
 }  // namespace
 
 bool nimbToWeb(const NimbRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
-    return installed([&] {
+    return installOrReport([&] {
         PhotoWebRecord webRecord;
         photoWebRecordInit(webRecord, rec.thetaCount(), rec.psiCount(), symmetryOf(rec.psiMax), false, loaded,
                            name);

@@ -11,8 +11,8 @@ class PhotoWebNIMB;
 struct NimbFormat {
     using Web = PhotoWebNIMB;
     using Record = NimbRecord;
-    static constexpr BuilderFacts facts{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
-                                        L"NIMB Photometric Web"};
+    static constexpr BuilderInfo info{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
+                                      L"NIMB Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{};
     static constexpr const wchar_t* extension = L"nmb";
     static constexpr const char* source = "components/photo/nimb/nimb";

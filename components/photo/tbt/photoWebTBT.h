@@ -11,8 +11,8 @@ class PhotoWebTBT;
 struct TbtFormat {
     using Web = PhotoWebTBT;
     using Record = TbtFileRecord;
-    static constexpr BuilderFacts facts{classIds::tbtWeb, photometricWebCategory, L"TBT Web",
-                                        L"TBT Photometric Web"};
+    static constexpr BuilderInfo info{classIds::tbtWeb, photometricWebCategory, L"TBT Web",
+                                      L"TBT Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{Ov::PhotoValueUnit::candelaPerKilolumen, true};
     static constexpr const wchar_t* extension = L"tbt";
     static constexpr const char* source = "components/photo/tbt/tbt";

@@ -137,7 +137,7 @@ void fillFaithfully(Ov::RnIntensityDist& dist, TbtFileRecord& rec) {
 }  // namespace
 
 bool tbtToWeb(const TbtFileRecord& rec, RnBasePhotoWebData& web, bool loaded, const wchar_t* name) {
-    return installed([&] {
+    return installOrReport([&] {
         PhotoWebRecord webRecord;
         photoWebRecordInit(webRecord, rec.verticalCount, rec.horizontalCount, symmetryOf(rec.symmetryCode), false,
                            loaded, name);

@@ -12,16 +12,16 @@ using Vector = Ov::GeVector3<double>;
 inline double radians(double degrees) { return degrees * std::numbers::pi / 180; }
 inline double degrees(double radians) { return radians * 180 / std::numbers::pi; }
 
-/// The intensity of a light towards a direction of its local frame.
-inline float intensityTowards(const Ov::RnIntensityDist& light, const Vector& direction) {
+/// The intensity of a luminaire towards a direction of its local frame.
+inline float intensityTowards(const Ov::RnIntensityDist& luminaire, const Vector& direction) {
     const auto [x, y, z] = direction;
-    return light.localIntensity(static_cast<float>(std::atan2(std::hypot(x, y), z)),
+    return luminaire.localIntensity(static_cast<float>(std::atan2(std::hypot(x, y), z)),
                                 static_cast<float>(std::atan2(y, x)));
 }
 
-/// The angles of diagrams in the local frame of a light: gamma counts from `down`, planes C around it from `c0`
+/// The angles of diagrams in the local frame of a luminaire: gamma counts from `down`, planes C around it from `c0`
 /// towards `c90`. The three are orthogonal unit vectors.
-struct LightFrame {
+struct LuminaireFrame {
     Vector down{0, 0, 1};
     Vector c0{1, 0, 0};
     Vector c90{0, 1, 0};
