@@ -11,8 +11,6 @@ namespace OvPhotometrics {
 
 namespace {
 
-float single(double value) { return static_cast<float>(value); }
-
 double finite(float value) { return std::isfinite(value) ? value : 0; }
 
 /// A longitude or meridian: 180 degrees and beyond count as -180.
@@ -30,15 +28,15 @@ double tellTime(Daylight& out, const Ov::NaturalLightSettings& in, std::optional
     const double equation = equationOfTime(day);
     const double toMeridian = (meridian(in.timeZone) - meridian(in.longitude)) * 12 / exactPi;
     const double saving = in.daylightSaving ? 1 : 0;
-    out.equationOfTime = single(equation);
+    out.equationOfTime = inSingle(equation);
     out.clockShift = equation + toMeridian - saving;
     if (solarTime) {
         out.solarTime = *solarTime;
-        out.localTime = single(finite(*solarTime) + saving - equation - toMeridian);
+        out.localTime = inSingle(finite(*solarTime) + saving - equation - toMeridian);
         return finite(*solarTime);
     }
     const double time = finite(in.localTime) - saving + equation + toMeridian;
-    out.solarTime = single(time);
+    out.solarTime = inSingle(time);
     out.localTime = in.localTime;
     return time;
 }
@@ -49,17 +47,17 @@ SolarPosition placeSun(Daylight& out, const Ov::NaturalLightSettings& in, double
     const double declination = solarDeclination(day);
     SolarPosition sun{finite(in.solarAltitude), finite(in.solarAzimuth)};
     if (!in.overrideSolarPosition) sun = solarPosition(latitude, declination, solarTime);
-    out.solarAltitude = single(sun.altitude);
-    out.solarAzimuth = single(sun.azimuth);
-    out.solarZenith = single(exactPi / 2 - sun.altitude);
+    out.solarAltitude = inSingle(sun.altitude);
+    out.solarAzimuth = inSingle(sun.azimuth);
+    out.solarZenith = inSingle(exactPi / 2 - sun.altitude);
     const double turned = sun.azimuth + finite(in.north);
     const double across = std::cos(sun.altitude);
-    out.sunDirection = {single(-std::sin(turned) * across), single(-std::cos(turned) * across),
-                        single(std::sin(sun.altitude))};
+    out.sunDirection = {inSingle(-std::sin(turned) * across), inSingle(-std::cos(turned) * across),
+                        inSingle(std::sin(sun.altitude))};
     const double sunrise = sunriseSolarTime(latitude, declination);
-    out.sunrise = single(sunrise - out.clockShift);
-    out.sunset = single(24 - sunrise - out.clockShift);
-    out.solarNoon = single(12 - out.clockShift);
+    out.sunrise = inSingle(sunrise - out.clockShift);
+    out.sunset = inSingle(24 - sunrise - out.clockShift);
+    out.solarNoon = inSingle(12 - out.clockShift);
     return sun;
 }
 
@@ -69,19 +67,19 @@ void addIlluminances(Daylight& out, const Ov::NaturalLightSettings& in, double a
                                                       : directNormalIlluminance(out.skyType, altitude, day);
     const double horizontal = skyHorizontalIlluminance(out.skyType, altitude);
     const double zenith = zenithLuminance(out.skyType, altitude, horizontal);
-    out.directNormalIlluminance = single(direct);
-    out.directHorizontalIlluminance = single(std::sin(altitude) * direct + 0.0);  // at night no -0
-    out.skyHorizontalIlluminance = single(horizontal);
-    out.zenithLuminance = single(zenith);
-    out.maxDirectNormalIlluminance = single(maxSolarIlluminance);
-    std::ranges::transform(skyCoefficients(out.skyType, altitude, zenith), out.skyCoefficients.begin(), single);
+    out.directNormalIlluminance = inSingle(direct);
+    out.directHorizontalIlluminance = inSingle(std::sin(altitude) * direct + 0.0);  // at night no -0
+    out.skyHorizontalIlluminance = inSingle(horizontal);
+    out.zenithLuminance = inSingle(zenith);
+    out.maxDirectNormalIlluminance = inSingle(maxSolarIlluminance);
+    std::ranges::transform(skyCoefficients(out.skyType, altitude, zenith), out.skyCoefficients.begin(), inSingle);
 }
 
 /// A colour over its luminance.
 std::array<float, 3> normalized(const std::array<float, 3>& color) {
     const double luminance = 0.263 * std::abs(color[0]) + 0.655 * std::abs(color[1]) + 0.082 * std::abs(color[2]);
     if (!(luminance >= 0.0001) || !std::isfinite(luminance)) return {1, 1, 1};
-    return {single(color[0] / luminance), single(color[1] / luminance), single(color[2] / luminance)};
+    return {inSingle(color[0] / luminance), inSingle(color[1] / luminance), inSingle(color[2] / luminance)};
 }
 
 SkyModel modelOf(const Daylight& daylight) {

@@ -9,6 +9,9 @@
 
 namespace OvPhotometrics {
 
+/// A result as it is kept.
+inline float inSingle(double value) { return static_cast<float>(value); }
+
 /// What the pass gives, in single precision as it is kept. Units and signs: RnNaturalLight.
 struct Daylight {
     // Hours.

@@ -11,8 +11,7 @@ namespace {
 
 constexpr double degreesPerHour = 15;
 
-float single(double value) { return static_cast<float>(value); }
-float toDegrees(float radians) { return single(inDegrees(radians)); }
+float toDegrees(float radians) { return inSingle(inDegrees(radians)); }
 
 }  // namespace
 
@@ -47,7 +46,7 @@ int DaylightData::getDayOfMonth() const {
 void DaylightData::setTimeZoneHours(float hours) {
     change(_settings.timeZone, toRadians(degreesPerHour * static_cast<double>(hours)));
 }
-float DaylightData::getTimeZoneHours() const { return single(inDegrees(_settings.timeZone) / degreesPerHour); }
+float DaylightData::getTimeZoneHours() const { return inSingle(inDegrees(_settings.timeZone) / degreesPerHour); }
 void DaylightData::setTimeZone(float degrees) { change(_settings.timeZone, toRadians(degrees)); }
 float DaylightData::getTimeZone() const { return toDegrees(_settings.timeZone); }
 
@@ -73,15 +72,15 @@ void DaylightData::setDirectNormalIlluminance(float lux) {
 }
 
 float DaylightData::getSkyIlluminance(const float normal[3]) {
-    return single(skyIlluminance(derived(), normal, _settings.north));
+    return inSingle(skyIlluminance(derived(), normal, _settings.north));
 }
 
 float DaylightData::getSkyLuminance(const float direction[3]) {
-    return single(skyLuminance(derived(), direction));
+    return inSingle(skyLuminance(derived(), direction));
 }
 
 float DaylightData::getSkyLuminanceAt(float zenithAngle, float azimuth) {
-    return single(skyLuminanceAt(derived(), zenithAngle, azimuth));
+    return inSingle(skyLuminanceAt(derived(), zenithAngle, azimuth));
 }
 
 const Daylight& DaylightData::derived() {

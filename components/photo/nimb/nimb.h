@@ -27,6 +27,8 @@ namespace OvPhotometrics {
 
 /// Characters kept of a line.
 inline constexpr int nimbLineLength = 72;
+/// Candela values in a line; the last may have fewer.
+inline constexpr int nimbValuesPerLine = 17;
 
 /// A file as it was read, or as it is to be written. The numbers are those of its header.
 struct NimbRecord {

@@ -14,7 +14,6 @@ namespace {
 
 constexpr std::size_t fieldWidth = 4;
 constexpr int magicPlace = 36;
-constexpr int valuesPerLine = 17;
 
 /// A file being read, line by line: the current one, cut into fields.
 class Lines {
@@ -116,9 +115,9 @@ bool checkHeader(const NimbRecord& rec, const Lines& lines) {
 bool readValues(NimbRecord& rec, Lines& lines) {
     const int count = rec.valueCount();
     rec.values.reserve(static_cast<std::size_t>(count));
-    for (int done = 0; done < count; done += valuesPerLine) {
+    for (int done = 0; done < count; done += nimbValuesPerLine) {
         if (!lines.next()) return false;
-        const int expected = std::min(count - done, valuesPerLine);
+        const int expected = std::min(count - done, nimbValuesPerLine);
         if (lines.fields() != expected) return lines.refuse(messages::nimbLineFields, lines.fields());
         for (int k = 0; k < expected; ++k) rec.values.push_back(static_cast<std::int16_t>(lines.field(k)));
     }

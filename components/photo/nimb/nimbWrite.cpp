@@ -58,9 +58,8 @@ void writeText(std::wstring line, Ov::RnStream& s) {
 }
 
 void writeValues(const std::vector<std::int16_t>& values, Ov::RnStream& s) {
-    constexpr std::size_t valuesPerLine = 17;
     for (std::size_t k = 0; k < values.size(); ++k) {
-        if (k > 0 && k % valuesPerLine == 0) endLine(s);
+        if (k > 0 && k % nimbValuesPerLine == 0) endLine(s);
         s.formattedWrite(L"%4d", std::clamp<int>(values[k], -999, largestField));
     }
     endLine(s);
