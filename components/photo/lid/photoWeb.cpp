@@ -16,7 +16,7 @@ namespace OvPhotometrics {
 
 namespace {
 
-std::size_t count(int n) {
+std::size_t checkedCount(int n) {
     if (n < 0) throw std::bad_array_new_length();
     return static_cast<std::size_t>(n);
 }
@@ -87,8 +87,8 @@ void photoWebRecordInit(PhotoWebRecord& rec, int nthetas, int npsis, PhotoWebSym
     PhotoWebRecord filled;
     filled.loaded = loaded;
     if (name) filled.name = name;
-    filled.candelas = newFloats(count(nthetas) * count(npsis));
-    filled.thetas = newFloats(count(nthetas) + count(npsis));
+    filled.candelas = newFloats(checkedCount(nthetas) * checkedCount(npsis));
+    filled.thetas = newFloats(checkedCount(nthetas) + checkedCount(npsis));
     filled.psis = filled.thetas.get() + nthetas;
     filled.nthetas = nthetas;
     filled.npsis = npsis;
@@ -107,7 +107,7 @@ void photoWebRecordFree(PhotoWebRecord& rec) {
 }
 
 void photoWebRecordSetTheta(PhotoWebRecord& rec, int i, float radians) {
-    rec.thetas[count(std::clamp(i, 0, rec.nthetas - 1))] = radians;
+    rec.thetas[checkedCount(std::clamp(i, 0, rec.nthetas - 1))] = radians;
 }
 
 void photoWebRecordSetPsi(PhotoWebRecord& rec, int j, float radians) {
@@ -116,13 +116,14 @@ void photoWebRecordSetPsi(PhotoWebRecord& rec, int j, float radians) {
 }
 
 void photoWebRecordSetCandela(PhotoWebRecord& rec, int i, int j, float candela) {
-    const std::size_t row = count(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry));
-    rec.candelas[row * count(rec.nthetas) + count(std::clamp(i, 0, rec.nthetas - 1))] = candela;
+    const std::size_t row = checkedCount(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry));
+    rec.candelas[row * checkedCount(rec.nthetas) + checkedCount(std::clamp(i, 0, rec.nthetas - 1))] = candela;
     if (candela > rec.maxCandela) rec.maxCandela = candela;
 }
 
 void photoWebRecordSetRow(PhotoWebRecord& rec, int j, const float* values, float factor) {
-    float* row = rec.candelas.get() + count(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry)) * count(rec.nthetas);
+    float* row = rec.candelas.get() +
+                 checkedCount(photoWebFoldPsiIndex(j, rec.npsis, rec.symmetry)) * checkedCount(rec.nthetas);
     float peak = rec.maxCandela;
     for (int i = 0; i < rec.nthetas; ++i) {
         row[i] = values[i] * factor;
