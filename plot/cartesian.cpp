@@ -12,6 +12,8 @@ constexpr double visibleShare = 0.005;  // of the peak: less is dark
 
 void drawCartesian(Canvas& canvas, const Diagram& diagram) {
     const Box room = drawCaption(canvas, diagram, "Luminous intensity in cd over gamma", true);
+
+    // The axes: as far as the brightest curve, and behind 90 degrees where there is light.
     const std::vector<PlaneCurve> curves = planeCurves(diagram);
     double most = 0;
     double behind = 0;
@@ -23,12 +25,16 @@ void drawCartesian(Canvas& canvas, const Diagram& diagram) {
     const Chart chart{{room.left + 46, room.top + 6, room.right - 14, room.bottom - 44},
                       degreeAxis(-last, last, 12),
                       axisTo(most, 6)};
+
+    // Grid and captions.
     drawGrid(canvas, chart);
     const Subject& first = diagram.subjects.front();
     canvas.text({chart.box.centre().x, chart.box.bottom + 36},
                 first.frame.aimed ? "Angle from the axis in degrees"
                                   : "\u2190 C + 180\u00b0      gamma in degrees      C \u2192",
                 canvas.mutedFont(), Align::centre);
+
+    // The curves.
     for (std::size_t i = 0; i < curves.size(); ++i) {
         Path path;
         for (std::size_t k = 0; k < curves[i].size(); ++k) {

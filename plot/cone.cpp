@@ -72,6 +72,7 @@ void drawCones(Canvas& canvas, const Subject& subject, const Box& box) {
 }  // namespace
 
 void drawCone(Canvas& canvas, const Diagram& diagram) {
+    // The two main planes, and round distances without 0.
     Diagram main = diagram;
     main.planes = {0, 90};
     const Subject& subject = main.subjects.front();
@@ -79,6 +80,7 @@ void drawCone(Canvas& canvas, const Diagram& diagram) {
     std::vector<double> distances = axisTo(diagram.height.value_or(5), 5).ticks();
     distances.erase(distances.begin());
 
+    // On the left the cones, with a line across the page for each distance.
     const double tableLeft = room.left + room.width() * 0.36;
     const Box box{room.left + 10, room.top + 44, tableLeft - 14, room.bottom - 14};
     std::vector<double> ys;
@@ -88,6 +90,7 @@ void drawCone(Canvas& canvas, const Diagram& diagram) {
     }
     drawCones(canvas, subject, box);
 
+    // On the right the table.
     const double axial = subject.intensity(0, 0);
     const double largest = largestIlluminance(subject);
     const auto width = [&](std::size_t plane) {

@@ -91,11 +91,14 @@ void drawIsolux(Canvas& canvas, const Diagram& diagram) {
     const Box room = drawCaption(
         canvas, diagram,
         std::string("Illuminance in lx on a plane ") + tickLabel(height) + " m below (+), seen from above", false);
+
+    // Levels by the brightest spot; the plane reaches as far as the lowest of them.
     const double most = largestIlluminance(subject) / (height * height);
     const std::vector<double> levels = roundLevels(most, levelCount);
     const double reach = height * (levels.empty() ? 1 : reachOf(subject, height, levels.back()));
     const Axis half = axisTo(reach, 5);
 
+    // A square chart in the middle of the room.
     const double side = std::min(room.width() - 60, room.height() - 44);
     const double left = room.centre().x - side / 2 + 12;
     const Axis both{-half.last, half.last, half.step};
@@ -106,6 +109,8 @@ void drawIsolux(Canvas& canvas, const Diagram& diagram) {
                 canvas.mutedFont(), Align::centre);
     canvas.textUpwards({chart.box.left - 46, chart.box.centre().y},
                        aimed ? "vertically, m" : "m towards C90 \u2192", canvas.mutedFont());
+
+    // Lines of equal illuminance, and the luminaire above them.
     canvas.clipped(chart.box, [&] { drawLines(canvas, chart, sampledPlane(subject, height, half.last), levels); });
     drawLuminaire(canvas, chart.box.centre());
     if (levels.empty())

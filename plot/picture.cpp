@@ -81,6 +81,7 @@ std::string drawPicture(PictureFormat format, PictureSize size, const Palette& p
 }
 
 std::string escaped(std::string_view text) {
+    // Every character that means something in markup, within quotes of either kind, too.
     std::string result;
     for (const char c : cleanText(text)) {
         switch (c) {

@@ -81,12 +81,14 @@ void drawDome(Canvas& canvas, const SkyDome& dome, const SkyWords& words) {
 }  // namespace
 
 void drawSky(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& caption) {
+    // The dome, with room for a scale beside it.
     std::vector<LegendItem> legend;
     for (const std::string& note : caption.notes) legend.push_back({{}, note});
     const Box room = drawCaption(canvas, caption.title, caption.subtitle, legend);
     const double radius = std::min((room.width() - 110) / 2, room.height() / 2 - 26);
     const SkyDome dome{{room.left + (room.width() - 80) / 2, room.centre().y}, radius, true};
 
+    // The sky's luminance, and the sun where it is up.
     const std::vector<float> values = luminances(daylight);
     const double most = *std::max_element(values.begin(), values.end());
     const Axis axis = axisTo(most, 6);
@@ -98,6 +100,8 @@ void drawSky(Canvas& canvas, Ov::RnNaturalLight& daylight, const SkyCaption& cap
         canvas.disc(sun, 9, colour(0x1a1a1a));
         canvas.disc(sun, 7, colour(0xffd23c));
     }
+
+    // What the colours mean.
     if (most > 0) {
         drawScale(canvas,
                   {room.right - 62, dome.centre.y - radius * 0.8, room.right - 44, dome.centre.y + radius * 0.8},

@@ -159,6 +159,8 @@ SolidMesh solidMesh(const Subject& subject, std::size_t gammas, std::size_t plan
 void drawSolid(Canvas& canvas, const Diagram& diagram) {
     const Subject& subject = diagram.subjects.front();
     const Box room = drawCaption(canvas, diagram, "Photometric solid: as far as it is bright", false);
+
+    // The solid in pieces, and the axes, which start at its surface.
     const View view;
     const SolidMesh mesh = solidMesh(subject, 32, 30);
     std::vector<Piece> pieces;
@@ -183,8 +185,11 @@ void drawSolid(Canvas& canvas, const Diagram& diagram) {
     for (const Piece& piece : pieces)
         for (const Space& corner : piece.corners) include(corner);
 
+    // Scaled to the room.
     const double scale = std::min((room.width() - 60) / box.width(), (room.height() - 40) / box.height());
     const auto place = [&](const Space& p) { return room.centre() + scale * (view.onPaper(p) - box.centre()); };
+
+    // The far pieces first, those behind hidden by those in front.
     std::stable_sort(pieces.begin(), pieces.end(),
                      [](const Piece& a, const Piece& b) { return a.nearness < b.nearness; });
     const Palette& palette = canvas.palette();
@@ -202,6 +207,8 @@ void drawSolid(Canvas& canvas, const Diagram& diagram) {
                              : mixed(base, {1, 1, 1}, 1.2 * (brightness - 0.5));
         canvas.face(path, fill, {mixed(fill, {0, 0, 0}, 0.25), 0.6, 0});
     }
+
+    // Names of the axes that are in sight.
     for (const AxisEnd& end : ends)
         if (!isHidden(pieces, view, end.end()))
             canvas.label(place(end.end(0.06)), subject.frame.aimed ? end.aimedName : end.name, canvas.mutedFont());

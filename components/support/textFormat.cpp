@@ -169,6 +169,7 @@ char* convertMagnitude(char* buffer, const Directive& spec, double value) {
         format = isFixed ? std::chars_format::fixed : std::chars_format::scientific;
         precision -= isFixed ? exponent + 1 : 1;
     }
+    // The common case is quicker without the library.
     if (format == std::chars_format::fixed) {
         if (char* end = convertFixedFloat(buffer, value, precision)) return end;
     }
@@ -192,6 +193,7 @@ const wchar_t* parseDirective(const wchar_t* text, const wchar_t* end, Directive
 }
 
 void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value) {
+    // 16 bits of the value, or 32, as sign and magnitude.
     const bool isShort = spec.modifier == L'h';
     if (spec.letter == L'c' || spec.letter == L'C')
         return appendCharacter(out, spec, static_cast<wchar_t>(isShort ? value & 0xFFFF : value));
@@ -202,6 +204,7 @@ void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value)
     if (negative) magnitude = 0 - magnitude;
     if (isShort && !isSigned) magnitude &= 0xFFFF;
 
+    // The digits. A precision of 0 shows no digit for 0.
     char buffer[16];
     const int base = baseOf(spec.letter);
     char* end = std::to_chars(buffer, buffer + sizeof buffer, magnitude, base).ptr;
@@ -209,6 +212,7 @@ void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value)
     if (magnitude == 0 && spec.precision == 0) end = buffer;
     std::string_view digits(buffer, static_cast<std::size_t>(end - buffer));
 
+    // Zeros up to the precision; in front of them the sign, or what tells the base.
     const auto wanted = static_cast<std::size_t>(std::max(spec.precision, 0));
     std::size_t zeros = wanted > digits.size() ? wanted - digits.size() : 0;
     if (spec.alternate && base == 8 && zeros == 0 && !digits.starts_with('0')) zeros = 1;

@@ -116,6 +116,7 @@ RnStream& RnStream::operator<<(const RnCastable* object) {
 
 /// Saves into memory first, because the length stands before the content.
 void RnStream::saveContent(RnPersistant& adapter) {
+    // While it lives the stream writes into another device, from the start of a line.
     const auto content = rnCreate<RnMemoryBuffer>();
     struct Redirection {
         Redirection(RnStream& stream, RnBufferedIO& device)
@@ -133,6 +134,8 @@ void RnStream::saveContent(RnPersistant& adapter) {
         RnStream& _stream;
         RnCharInput _outer;
     };
+
+    // Save into memory, then write length and content.
     {
         const Redirection toMemory(*this, *content);
         adapter.save(*this);

@@ -18,11 +18,12 @@ void fetchWidth(Directive& spec, Arguments& arguments) {
     if (spec.precisionIsArgument) spec.precision = std::clamp(arguments.next<int>(), -1, maxFormatWidth);
 }
 
-/// Appends the conversion of the next argument; false for a letter that is none.
+/// Appends the next argument as its directive says; false for a letter that stands for no conversion.
 bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
     if (spec.modifier == L'L') return false;
     fetchWidth(spec, arguments);
     switch (spec.letter) {
+        // Integers and characters.
         case L'd':
         case L'i':
         case L'u':
@@ -33,6 +34,7 @@ bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
         case L'C':
             appendInteger(out, spec, arguments.next<int>());
             return true;
+        // Numbers with a fraction.
         case L'e':
         case L'E':
         case L'f':
@@ -44,6 +46,7 @@ bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
         case L's':
             appendText(out, spec, arguments.next<const wchar_t*>());
             return true;
+        // The characters written so far, told to the caller.
         case L'n':
             *arguments.next<int*>() = static_cast<int>(out.size());
             return true;
@@ -52,7 +55,7 @@ bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
     }
 }
 
-/// Appends the text of a whole format; it ends before a conversion that is none.
+/// Appends the text of a whole format. It ends before the first directive that is malformed.
 void appendFormatted(std::wstring& out, const wchar_t* format, Arguments& arguments) {
     const wchar_t* const end = format + std::wcslen(format);
     while (format != end) {

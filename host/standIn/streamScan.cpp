@@ -399,6 +399,7 @@ Scanner::Outcome Scanner::matchLiteral(wchar_t c) {
 
 Scanner::Outcome Scanner::convert(const Directive& directive) {
     switch (directive.letter) {
+        // Numbers.
         case L'd':
         case L'i':
         case L'u':
@@ -413,6 +414,7 @@ Scanner::Outcome Scanner::convert(const Directive& directive) {
         case L'g':
         case L'G':
             return readReal(directive);
+        // Texts: a word, characters of a set, a number of characters.
         case L's':
             return readText(directive, true, [](int c) { return !isWhiteSpace(c); });
         case L'[':

@@ -45,8 +45,7 @@ protected:
                    Ov::rnCreate<Diffuse>(),
                    Ov::rnCreate<Spotlight>(),
                    Ov::rnCreate<DaylightData>()};
-        for (const Ov::RnUid& id :
-             {CibseFormat::info.classId, NimbFormat::info.classId, TbtFormat::info.classId})
+        for (const Ov::RnUid& id : {CibseFormat::info.classId, NimbFormat::info.classId, TbtFormat::info.classId})
             sources.push_back(reread(id, *distributionOf(*web)));
     }
 

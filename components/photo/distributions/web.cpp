@@ -44,8 +44,11 @@ float Web::localIntensityAtUnit(const Vector& direction) const {
 }
 
 bool Web::intensities(DirectionForm form, const float* directions, std::size_t count, float* out) const {
+    // Other webs, and dark ones, are asked direction by direction.
     const auto web = Ov::rnQuery<RnBasePhotoWebData>(_web.get());
     if (!web || !(_maxCandela > 0)) return false;
+
+    // Each form as vectors of the web's frame, but for the angles of that frame, which the web takes as they are.
     const auto vectors = [&](std::size_t floats, auto convert) {
         intensitiesOfVectors(*web, directions, floats, count, out, convert);
         return true;

@@ -64,7 +64,8 @@ bool NumberText::findNumber(Ov::Message<wchar_t> unexpected, std::int32_t& inste
     return first && fail(messages::numberNotConverted);
 }
 
-/// A number that runs on into something else is none: reading on there would shift all values behind it.
+/// Whether the number ends here. One that runs on into something else is refused: reading on in the middle of it would
+/// shift all values behind it.
 bool NumberText::atNumberEnd() {
     const int c = _chars.peekChar();
     return c < 0 || isBetween(c) || c == ctrlZ || c == 0;

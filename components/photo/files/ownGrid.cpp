@@ -182,9 +182,13 @@ bool isDarkBehind(const Ov::RnPhotoWebData& web) {
 }
 
 std::optional<Layout> lateralLayoutOf(const Ov::RnPhotoWebData& web, const OwnGridRules& rules) {
+    // In a format whose files are not dark behind their last plane a truncated web ends in rims; in one whose files are
+    // another web must be dark there already.
     const bool rims = web.isPsiTruncated() && !rules.lateralTruncated;
     if (web.isPsiTruncated() == rules.lateralTruncated ? web.getPsiCount() < 2 : !rims && !isDarkBehind(web))
         return {};
+
+    // Angles to one side of 0 stay where they are.
     constexpr double rounding = 1e-4;  // of degrees from radians
     const double last = inDegrees(web.getPsiRange().last);
     Layout layout{GridFrame::upright, thetaNodes(web, 90)};
@@ -195,6 +199,7 @@ std::optional<Layout> lateralLayoutOf(const Ov::RnPhotoWebData& web, const OwnGr
     }
     if (web.getSymmetry() != PhotoWebSymmetry::Full) return {};
 
+    // Angles to both sides were shifted by the turn of the web, which stands upright or lies.
     const auto fits = [&](std::optional<float> shift) {
         return shift && *shift > rules.tolerance && *shift <= 90 && last - *shift <= 90 + rounding;
     };
@@ -204,6 +209,8 @@ std::optional<Layout> lateralLayoutOf(const Ov::RnPhotoWebData& web, const OwnGr
         layout.frame = GridFrame::laidDown;
     }
     if (!fits(turn)) return {};
+
+    // Shift them back, and end the light at rims where the format would go on.
     layout.horizontal = psiNodes(web, *turn);
     if (rims &&
         !(addRimAbove(layout.horizontal, web.getPsiCount(), 90) && addRimBelow(layout.horizontal, -1, -90)))

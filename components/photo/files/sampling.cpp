@@ -192,6 +192,7 @@ bool HostView::jumps(double litTheta, double litPsi, double darkTheta, double da
 }
 
 float HostView::overCell(double theta, double psi, const SamplingPlan& plan) const {
+    // The cell reaches half a step to each side; look whether a hard edge of light crosses it.
     const float here = intensity(theta, psi);
     const double first = std::max(theta - plan.thetaStep / 2, plan.firstTheta);
     const double last = std::min(theta + plan.thetaStep / 2, plan.lastTheta);
@@ -203,6 +204,7 @@ float HostView::overCell(double theta, double psi, const SamplingPlan& plan) con
         }
     if (!crossed) return here;
 
+    // The mean over the cell, by solid angle.
     constexpr int parts = 10;
     double sum = 0;
     double weights = 0;

@@ -108,12 +108,15 @@ float photoWebIntegrate(int n, const float* angles, const float* values) {
 }
 
 float fluxOf(const WebGrid& grid, float maxCandela) {
+    // Trapezoids between the stored planes.
     const std::vector<float> rows = integrateRows(grid);
     const float first = rows.front();
     const float last = rows.back();
     float sum = 0;
     for (int j = 1; j < grid.npsis; ++j)
         sum += (rows[count(j)] + rows[count(j - 1)]) * (grid.psis[j] - grid.psis[j - 1]);
+
+    // What lies behind the last plane, and as many parts as the symmetry repeats.
     const float lastPsi = grid.psis[grid.npsis - 1];
     switch (grid.symmetry) {
         case PhotoWebSymmetry::Full:

@@ -71,6 +71,8 @@ OVPHOTO_IN_EACH_COPY void findPlaces(const Axis& axis, const float* angles, int 
         i += (list[std::min(i + 1, last)] <= a) - (list[i] > a);
         places.index[k] = std::clamp(i, 0, last);
     }
+
+    // Where one of the guesses is wrong all are searched for.
     int found = 1;
     for (int k = 0; k < count; ++k) {
         const float a = angles[k];
@@ -82,6 +84,7 @@ OVPHOTO_IN_EACH_COPY void findPlaces(const Axis& axis, const float* angles, int 
     if (!found)
         for (int k = 0; k < count; ++k) places.index[k] = lastAtMost(list, last + 1, angles[k]);
 
+    // The way to the next angle, as a share of the step.
     for (int k = 0; k < count; ++k) {
         const float a = angles[k];
         const int i = places.index[k];
@@ -109,6 +112,7 @@ OVPHOTO_IN_EACH_COPY void cubics(const float* __restrict p, const float* __restr
 }
 
 OVPHOTO_IN_EACH_COPY void evaluateGroup(const Search& search, const float* angles, int count, float* out) {
+    // Fold the directions into the stored range; see which of them are lit.
     const WebGrid& grid = search.grid;
     float theta[groupSize];
     float psi[groupSize];
@@ -121,9 +125,12 @@ OVPHOTO_IN_EACH_COPY void evaluateGroup(const Search& search, const float* angle
         lit[k] = (p == p) & (theta[k] >= grid.thetas[0]) & (theta[k] <= grid.thetas[search.thetas.last]) &
                  !(psi[k] > search.darkBehindPsi);
     }
+
+    // Find the cells of the grid.
     Places columns;
     findPlaces(search.thetas, theta, count, columns);
 
+    // Fetch 4 values around each direction, or 4 by 4, and interpolate along theta, then along psi.
     float block[groupSize * 16];
     float results[groupSize];
     if (search.axial) {

@@ -140,6 +140,7 @@ void photoWebRecordSetOrientation(PhotoWebRecord& rec, const GeLinearMatrix3<flo
 }
 
 bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
+    // Check the angles.
     if (rec.nthetas <= 0 || rec.npsis <= 0) return false;
     if (const auto refused = refusedAngles(rec)) {
         reportMessage(*refused);
@@ -160,6 +161,7 @@ bool photoWebInstall(RnBasePhotoWebData& web, const PhotoWebRecord& rec) {
         !canBeHeld(installed.lumens, rec.maxCandela) || !allFinite({installed.candelas.get(), values.size()}))
         return false;
 
+    // Nothing can fail any more.
     installed.orientation = rec.orientation.computeTranspose();
     if (rec.lumens > 0) installed.file.lampLumens = rec.lumens;
     web._content = std::move(installed);

@@ -178,10 +178,13 @@ inline void RnBasePhotoWebData::getCandelaBlock(IndexRange psis, IndexRange thet
             for (std::int64_t i = thetas.first; i <= thetas.last; ++i) *out++ = 0;
         return;
     }
+    // The one row of an axial web stands for all.
     if (_content.symmetry == PhotoWebSymmetry::Axial) {
         for (std::int64_t h = psis.first; h <= psis.last; ++h) out = copyRow(0, thetas, out);
         return;
     }
+
+    // A block may start one plane before the first, and may end anywhere.
     const bool full = _content.symmetry == PhotoWebSymmetry::Full;
     if (!full && _content.symmetry != PhotoWebSymmetry::Half && _content.symmetry != PhotoWebSymmetry::Quarter)
         return;

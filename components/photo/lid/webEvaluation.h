@@ -53,6 +53,7 @@ inline float asLight(float value) { return value > 0 ? std::min(value, std::nume
 /// class which overrides one of them gets its own; for a final class they resolve at compile time.
 template <class Web>
 float evaluateWeb(const Web& web, float theta, float psi) {
+    // Dark: no direction, above the first and below the last vertical angle, and a web without values.
     if (theta != theta || psi != psi) return 0;
     theta = theta < 0 ? 0 : theta > pi ? pi : theta;
     const AngleRange thetas = web.getThetaRange();
@@ -61,12 +62,15 @@ float evaluateWeb(const Web& web, float theta, float psi) {
     const int npsis = web.getPsiCount();
     if (nthetas <= 0 || npsis <= 0) return 0;
 
+    // The column at or before theta, and how far theta lies on the way to the next.
     const int i = web.findTheta(theta);
     float u = 0;
     if (i < nthetas - 1) {
         const float t0 = web.getTheta(i);
         u = detail::fraction(theta, t0, web.getTheta(i + 1) - t0);
     }
+
+    // Four values around theta are enough where all planes are the same.
     const IndexRange columns{i - 1, i + 2};
     float block[16] = {};
     const PhotoWebSymmetry symmetry = web.getSymmetry();
@@ -75,6 +79,7 @@ float evaluateWeb(const Web& web, float theta, float psi) {
         return detail::asLight(catmullRom(block, u));
     }
 
+    // The row at or before psi; -1 before the first. Behind the last a truncated web is dark.
     psi = detail::foldPsi(psi, symmetry);
     const AngleRange psis = web.getPsiRange();
     int j = -1;
@@ -84,6 +89,9 @@ float evaluateWeb(const Web& web, float theta, float psi) {
     } else if (psi >= psis.first) {
         j = web.findPsi(psi);
     }
+
+    // How far psi lies on the way to the next row. Behind the last that is the first of a closed circle; the others go
+    // on as wide as the interval before.
     float v = 0;
     if (j < 0) {
         j = 0;
@@ -95,6 +103,7 @@ float evaluateWeb(const Web& web, float theta, float psi) {
         v = detail::fraction(psi, p0, width);
     }
 
+    // Interpolate along theta in four rows, then along psi.
     web.getCandelaBlock({j - 1, j + 2}, columns, block);
     float rows[4];
     for (std::size_t k = 0; k < 4; ++k) rows[k] = catmullRom(block + 4 * k, u);

@@ -102,6 +102,7 @@ Settings BinaryForm::settings(int release) const {
     s.skyShadowAccuracy = skyShadowAccuracy;
     setSunFlags(s, sunFlags);
     setSkyFlags(s, skyFlags);
+    // A field of its own in release 2 alone; from release 3 on it is one of the flags.
     if (release == 2) s.skyCastsShadows = skyCastsShadows != 0;
     return s;
 }

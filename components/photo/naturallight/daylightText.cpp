@@ -122,7 +122,7 @@ private:
     static bool startsWith(const wchar_t* word, const wchar_t* start) {
         return std::wcsncmp(word, start, std::wcslen(start)) == 0;
     }
-    /// A number that no float holds is none: it could not be written.
+    /// A number that is too large for a float counts as missing, since it could not be written again.
     bool isWritable(float number, Ov::Message<> message) { return std::isfinite(number) || fail(message); }
     bool fail(Ov::Message<> message) {
         reportFormError(message, _in.computeLineNb());

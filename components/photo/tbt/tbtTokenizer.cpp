@@ -124,7 +124,7 @@ TbtToken TbtTokenizer::takeMark() {
     return TbtToken::other;
 }
 
-/// Skips white space and comments; the character that is ahead.
+/// Skips white space and comments. Returns the character ahead, which is not consumed; below 0 at the end.
 int TbtTokenizer::skipBlank() {
     const auto takeWhiteSpace = [&](int c) {
         if (c == '\n') ++_lineFeeds;

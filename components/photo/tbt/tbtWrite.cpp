@@ -69,7 +69,8 @@ std::wstring chooseTitle(const FileFacts& facts, const std::wstring& name) {
 bool isReadable(float value) { return std::isfinite(value) && !std::signbit(value); }
 bool isReadableShare(float value) { return isReadable(value) && value <= 1; }
 
-/// The reference flux of another file, and its flux where that is none: values then come out as they were.
+/// Takes the reference flux of another TBT file and, where that file has a flux of 0, the 0: values then come out as
+/// they were.
 void carryUnit(const FileFacts& facts, TbtFileRecord& rec) {
     float reference = 0;
     float flux = rec.flux;
