@@ -4,6 +4,8 @@ function(ovphoto_add_test_program source)
   add_executable(${name} ${source}.cpp ${ARGN})
   target_link_libraries(${name} PRIVATE ovphoto_builders ovphoto_test_support GTest::gmock GTest::gtest_main)
   target_compile_definitions(${name} PRIVATE _GLIBCXX_ASSERTIONS)
+  # Tests run once: what they test is optimised, they are soon compiled.
+  target_compile_options(${name} PRIVATE $<$<NOT:$<CONFIG:Debug>>:-O1>)
 endfunction()
 
 # ovphoto_add_test(<source without .cpp> [<more sources>]): one whose tests ctest runs.
