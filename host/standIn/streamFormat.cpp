@@ -1,8 +1,8 @@
 #include <algorithm>
 #include <cwchar>
 
-#include "components/support/arguments.h"
 #include "components/support/textFormat.h"
+#include "host/standIn/arguments.h"
 #include "host/standIn/streamState.h"
 
 namespace Ov {

@@ -6,9 +6,9 @@
 #include <string_view>
 #include <utility>
 
-#include "components/support/arguments.h"
 #include "components/support/textClass.h"
 #include "components/support/textNumber.h"
+#include "host/standIn/arguments.h"
 #include "host/standIn/streamState.h"
 
 // Formatted reading. A number that lies wholly in the device's window is converted in place; everything else goes

@@ -91,6 +91,15 @@ static_assert(!takes<messages::tbtFlux, std::wstring> && !takes<messages::tbtFlu
 static_assert(!takes<messages::fileNotRead, int> && !takes<messages::fileNotRead, std::string>);
 static_assert(!takes<messages::daylightLine, int, std::wstring>);  // in the other order
 
+// A module of its own has a list of its own.
+#define OTHER_MESSAGES(message) message(lineTooLong, 13100, int, std::wstring) message(endMissing, 13101)
+namespace otherMessages {
+OVPHOTO_DEFINE_MESSAGES(OTHER_MESSAGES)
+}
+static_assert(takes<otherMessages::lineTooLong, int, std::wstring> && !takes<otherMessages::endMissing, int>);
+static_assert(otherMessages::all[0].id == 13100 && otherMessages::all[0].arguments == std::string_view("ds"));
+static_assert(otherMessages::all[1].id == 13101 && otherMessages::all[1].arguments == std::string_view());
+
 TEST_P(MessageTexts, EveryNumberHasATextThatShowsItsArguments) {
     for (const MessageEntry& message : messages::all) {
         SCOPED_TRACE(message.id);
