@@ -4,10 +4,10 @@
 #include <cstdio>
 #include <random>
 
-#include "components/photo/files/fileFormat.h"
 #include "components/photo/files/webDistribution.h"
 #include "components/photo/lid/component.h"
 #include "components/support/devices.h"
+#include "ovphoto/photoFormat.h"
 
 namespace bench {
 
@@ -69,8 +69,8 @@ std::string fileText(const Ov::RnUid& classId, Ov::RnPhotoWebData& web) {
     const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
     Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
     const auto light = OvPhotometrics::makeWebDistribution(web);
-    dynamic_cast<OvPhotometrics::FileFormat*>(OvPhotometrics::builderTable().find(classId))
-        ->write(*light, stream, OvPhotometrics::FileForm::faithful, {});
+    Ov::rnCast<Ov::RnPhotoFormat>(OvPhotometrics::builderTable().find(classId))
+        ->write(*light, stream, Ov::FileForm::faithful, nullptr, 0);
     return io->bytes();
 }
 

@@ -2,8 +2,8 @@
 #include <cmath>
 
 #include "bench/bench.h"
-#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/files/webDistribution.h"
+#include "ovphoto/intensities.h"
 
 // Intensities of a web towards random directions, one by one and many at once, beside a bare lookup. Times are
 // those of one direction.

@@ -1,3 +1,9 @@
+# ovphoto_add_format(<folder> <source>...): the sources of a file format, in its folder below components/photo.
+function(ovphoto_add_format folder)
+  target_sources(ovphoto_core PRIVATE ${ARGN})
+  set_property(GLOBAL APPEND PROPERTY OVPHOTO_FORMATS ${folder})
+endfunction()
+
 # ovphoto_add_test_program(<source without .cpp> [<more sources>]): a program of tests over the core, below tests/.
 function(ovphoto_add_test_program source)
   string(REPLACE "/" "_" name ${source})

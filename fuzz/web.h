@@ -7,14 +7,16 @@
 #include <string>
 #include <vector>
 
-#include "components/photo/cibse/photoWebCIBSE.h"
-#include "components/photo/distributions/manyIntensities.h"
-#include "components/photo/ies/photoWebIES.h"
-#include "components/photo/lid/component.h"
-#include "components/photo/nimb/photoWebNIMB.h"
-#include "components/photo/tbt/photoWebTBT.h"
+#include "components/photo/files/fileFacts.h"
+#include "components/photo/files/recognition.h"
+#include "components/photo/files/webDistribution.h"
+#include "components/photo/lid/photoWeb.h"
+#include "components/support/devices.h"
 #include "fuzz/fuzz.h"
 #include "host/componentManager/componentManager.h"
+#include "host/componentManager/importer.h"
+#include "ovphoto/classIds.h"
+#include "ovphoto/intensities.h"
 #include "tests/support/plainDevice.h"
 
 // What is demanded of the builder of a file format: any bytes are refused with a message, or give, without one, a
@@ -108,13 +110,28 @@ inline void demandLight(const Ov::RnPhotoWebData& web, Ov::RnIntensityDist& ligh
     });
 }
 
+/// The formats of all builders, in the order in which an importer asks them.
+inline const std::vector<RnRef<Ov::RnPhotoFormat>>& formats() {
+    static const auto all = [] {
+        std::vector<RnRef<Ov::RnPhotoFormat>> found;
+        auto visitor =
+            Ov::rnVisitor<Ov::RnCPtr<Ov::RnImportBuilder>>([&](Ov::RnCPtr<Ov::RnImportBuilder> builder) {
+                found.push_back(Ov::rnCast<Ov::RnPhotoFormat>(const_cast<Ov::RnImportBuilder*>(builder.get())));
+            });
+        const auto manager = Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager());
+        const auto importer = manager->createObject(classIds::importer);
+        Ov::rnCast<Ov::RnImporter>(importer.get())->enumerateObjects(visitor);
+        return found;
+    }();
+    return all;
+}
+
 /// The web that a format's builder imports, checked; null when it is refused.
-template <class Format>
-RnRef<Ov::RnPhotoWebData> imported(Ov::RnBufferedIO& io, std::size_t size) {
+inline RnRef<Ov::RnPhotoWebData> imported(Ov::RnPhotoFormat& format, Ov::RnBufferedIO& io, std::size_t size) {
     RnRef<Ov::RnCastable> object;
     measured(size, [&] {
         try {
-            object = immortal<PhotoWebBuilder<Format>>().import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"web", nullptr);
+            object = format.import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"web", nullptr);
         } catch (const Ov::RnStreamEx::ExReadError&) {
         }
     });
@@ -126,20 +143,21 @@ RnRef<Ov::RnPhotoWebData> imported(Ov::RnBufferedIO& io, std::size_t size) {
     return web;
 }
 
-/// The class that the importer makes of an input; none when it knows no format.
-inline Ov::RnUid recognisedAs(Ov::RnBufferedIO& io) {
-    const auto manager = Ov::rnCast<Ov::RnComponentManager>(Ov::RnGetComponentManager());
-    const auto importers = manager->importersFor(photometricWebCategory, &io);
-    return importers.empty() ? Ov::RnUid{} : importers.front()->getClassId();
+/// The format that an input is taken for; null when there is none.
+inline Ov::RnPhotoFormat* recognisedFormat(Ov::RnBufferedIO& io) {
+    const Ov::RnUid id = recognisedClass(io);
+    for (const auto& format : formats())
+        if (Ov::rnCast<Ov::RnComponentBuilder>(format.get())->getClassId() == id) return format.get();
+    return nullptr;
 }
 
 /// Writes a web as a file for other programs, with the facts of the file that it came from, and reads that.
-template <class Format>
-void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
+inline void demandWritten(Ov::RnPhotoFormat& format, Ov::RnPhotoWebData& web, const FileFacts& facts) {
+    const std::vector<FileFact> given = facts.list();
     const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
     Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-    auto& builder = immortal<PhotoWebBuilder<Format>>();
-    const bool written = builder.write(*makeWebDistribution(web), stream, FileForm::faithful, facts);
+    const bool written = format.write(*makeWebDistribution(web), stream, FileForm::faithful, given.data(),
+                                      static_cast<std::int32_t>(given.size()));
     // What is written may have them, too: of texts that stand behind a blank.
     demand(takeMessages() > 0 || written, "what is not written has a message");
     const auto ordinary = [](float value) {
@@ -148,34 +166,33 @@ void demandWritten(Ov::RnPhotoWebData& web, const FileFacts& facts) {
     demand(written || !ordinary(web.getMaxCandela()) || !ordinary(web.getLumens()), "what is read is written");
     if (!written) return;
     io->seek(0, 0);
-    demand(recognisedAs(*io) == Format::info.classId, "what is written is recognised as its format");
-    demand(!!imported<Format>(*io, io->bytes().size()), "what is written is read");
+    demand(recognisedFormat(*io) == &format, "what is written is recognised as its format");
+    demand(!!imported(format, *io, io->bytes().size()), "what is written is read");
 }
 
 /// Tries bytes as a file of a format.
-template <class Format>
-void tryFile(std::string_view bytes) {
+inline void tryFile(Ov::RnPhotoFormat& format, std::string_view bytes) {
     const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>(bytes);
-    auto& builder = immortal<PhotoWebBuilder<Format>>();
-    builder.canImport(static_cast<Ov::RnBufferedIO*>(io.get()));
+    format.canImport(static_cast<Ov::RnBufferedIO*>(io.get()));
     demand(io->seek(0, 1) == 0 && takeMessages() == 0, "the content test leaves no trace");
-    const auto web = imported<Format>(*io, bytes.size());
+    const auto web = imported(format, *io, bytes.size());
     const auto plain = Ov::rnCreate<PlainDevice>(bytes);
-    demand(!!imported<Format>(*plain, bytes.size()) == !!web && plain->seek(0, 1) == io->seek(0, 1),
+    demand(!!imported(format, *plain, bytes.size()) == !!web && plain->seek(0, 1) == io->seek(0, 1),
            "every device is read the same");
     if (!web) return;
     const auto facts = [&] {
         FileFacts all;
+        auto visitor = Ov::rnVisitor<const FileFact&>(
+            [&](const FileFact& fact) { all.add(fact.key, std::wstring(fact.text), fact.kind); });
         io->seek(0, 0);
-        demand(builder.readFacts(*io, nullptr, all), "what is read has facts");
+        demand(format.readFacts(*io, nullptr, visitor), "what is read has facts");
         return all;
     };
     const auto values =
         static_cast<std::size_t>(web->getThetaCount()) * static_cast<std::size_t>(web->getPsiCount());
-    if (isDue(bytes, 0, values)) demandWritten<IesFormat>(*web, facts());
-    if (isDue(bytes, 1, values)) demandWritten<CibseFormat>(*web, facts());
-    if (isDue(bytes, 2, values)) demandWritten<NimbFormat>(*web, facts());
-    if (isDue(bytes, 3, values)) demandWritten<TbtFormat>(*web, facts());
+    std::size_t part = 0;
+    for (const auto& target : formats())
+        if (target->getTraits().writes && isDue(bytes, part++, values)) demandWritten(*target, *web, facts());
 }
 
 }  // namespace OvPhotometrics::fuzz

@@ -17,7 +17,8 @@
     message(outOfMemory,      12936) \
     message(fileNotRead,      12945, std::wstring)  /* detail */ \
     message(textSetOff,       13082, std::wstring)  /* the text */ \
-    message(webNotSaved,      13083, std::wstring)  /* name of the web */
+    message(webNotSaved,      13083, std::wstring)  /* name of the web */ \
+    message(formatOnlyRead,   13084, std::wstring)  /* name of the format */
 
 // Natural light, text form: the line that is missing or malformed. Put into 12896 as they stand.
 #define OVPHOTO_MESSAGES_NATURAL_LIGHT(message) \

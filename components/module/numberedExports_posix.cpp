@@ -1,7 +1,5 @@
 #include "ovphoto/numberedExports.h"
 
-#include "components/module/fileExports.h"
-#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/naturallight/calendar.h"
 #include "components/photo/naturallight/clock.h"
 #include "components/photo/naturallight/timeZones.h"

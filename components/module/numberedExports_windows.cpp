@@ -1,5 +1,3 @@
-#include "components/module/fileExports.h"
-#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/naturallight/calendar.h"
 #include "components/photo/naturallight/clock.h"
 #include "components/photo/naturallight/timeZones.h"

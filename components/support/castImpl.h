@@ -131,6 +131,10 @@ public:
 template <class Self, class Adapter, class Base, class... Interfaces>
 using RnDataObject = RnCastHeap<RnTempIface<RnCastImpl<Base, Interfaces...>, Self, Adapter>>;
 
+/// The same for a class with a second base.
+template <class Self, class Adapter, class Base, class Second, class... Interfaces>
+using RnDataObject2 = RnCastHeap<RnTempIface<RnCastImpl2<Base, Second, Interfaces...>, Self, Adapter>>;
+
 /// Base of such adapters: holds a reference to its data object, whose `Data::classId` is saved with it.
 template <class Data>
 class RnTempObject : public RnCastHeap<RnCastImpl<RnPersistant, RnPersistant>> {

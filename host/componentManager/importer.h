@@ -35,7 +35,8 @@ public:
     virtual const wchar_t* getDefaultSearch() = 0;
 };
 
-/// All of an importer but its category. Texts stay valid until the same operation is called again.
+/// All of an importer but its category. It imports by the first builder of its own walk that accepts the input. Texts
+/// stay valid until the same operation is called again.
 class OVHOST_API RnBaseImporter : public RnImporter {
 public:
     RnEnum::Action enumerateObjects(RnEnumerator<RnCPtr<RnImportBuilder>>& visitor) override;

@@ -53,12 +53,17 @@ std::vector<std::wstring> allPatterns(const std::vector<NamedBuilder>& builders)
     return patterns;
 }
 
-/// The first builder that accepts the input, or null.
-RnRef<RnImportBuilder> recognise(const wchar_t* category, RnBufferedIO* io) {
-    for (NamedBuilder& each : importBuilders(category)) {
-        if (each.builder->canImport(io)) return std::move(each.builder);
-    }
-    return {};
+/// The first builder of an importer's walk that accepts the input, or null.
+RnRef<RnImportBuilder> recognise(RnBaseImporter& importer, RnBufferedIO* io) {
+    RnRef<RnImportBuilder> found;
+    auto visitor = rnVisitor<RnCPtr<RnImportBuilder>>([&](RnCPtr<RnImportBuilder> each) {
+        auto* const builder = const_cast<RnImportBuilder*>(each.get());
+        if (!builder->canImport(io)) return RnEnum::goOn;
+        found = RnRef<RnImportBuilder>::share(builder);
+        return RnEnum::stop;
+    });
+    importer.enumerateObjects(visitor);
+    return found;
 }
 
 }  // namespace
@@ -93,7 +98,7 @@ RnRef<RnCastable> RnBaseImporter::import(const wchar_t* path, const wchar_t* bas
     if (!io) {
         throw RnStreamEx::ExReadError("host/componentManager/importer", __LINE__, openFailure(path).c_str());
     }
-    const RnRef<RnImportBuilder> builder = recognise(getImportCategory(), io.get());
+    const RnRef<RnImportBuilder> builder = recognise(*this, io.get());
     if (!builder) return {};
     recognised = true;
     const std::wstring folder = basePath && *basePath ? basePath : pathFolder(path);
@@ -106,7 +111,7 @@ RnRef<RnCastable> RnBaseImporter::import(const wchar_t* path, const wchar_t* bas
 }
 
 RnRef<RnCastable> RnBaseImporter::import(RnPtr<RnBufferedIO> io, const wchar_t* name, const wchar_t* basePath) {
-    const RnRef<RnImportBuilder> builder = recognise(getImportCategory(), io.get());
+    const RnRef<RnImportBuilder> builder = recognise(*this, io.get());
     return builder ? builder->import(io, name, basePath) : RnRef<RnCastable>();
 }
 

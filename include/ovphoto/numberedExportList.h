@@ -18,13 +18,6 @@
     entry(431, getMonthShortName) \
     entry(432, getDaysInMonth) \
     entry(433, dayOfYear) \
-    entry(434, monthAndDay) \
-    entry(435, writeIes) \
-    entry(436, writeCibse) \
-    entry(437, writeNimb) \
-    entry(438, writeTbt) \
-    entry(439, getIntensities) \
-    entry(440, readFileFacts) \
-    entry(441, importWithFacts)
+    entry(434, monthAndDay)
 
 // clang-format on

@@ -2,8 +2,6 @@
 
 #include <cmath>
 
-#include "host/componentManager/bufferedIO.h"
-#include "host/componentManager/builder.h"
 #include "ovphoto/photoWebData.h"
 
 // What files are beyond their webs: how they count angles, and what candela and lumens their values stand for.
@@ -68,33 +66,6 @@ public:
     /// The web with its peak in candela and with the lamps' lumens or, where the file has none, the luminaire's:
     /// itself where it is so, else another of the same name.
     virtual RnRef<RnPhotoWebData> inCandela() = 0;
-};
-
-/// What the values of a format's files are.
-enum class PhotoValueUnit : std::int32_t {
-    candela = 0,             ///< candela, with the factors of the file
-    candelaPerKilolumen = 1  ///< candela for every 1000 lm, or other reference, of the lamps' lumens
-};
-
-/// What a file format is like.
-struct PhotoFormatTraits {
-    /// What its values are.
-    PhotoValueUnit unit = PhotoValueUnit::candela;
-    /// Whether its files say what the lamps give off, be it any number of lumens.
-    bool holdsLampLumens = false;
-    /// Whether its files say how the light is turned, so that its webs can be saved faithfully
-    /// (ovphoto/saveForm.h).
-    bool holdsOrientation = false;
-};
-
-/// What the builder of a format's webs answers.
-class RnPhotoFormat : public RnImportBuilder {
-public:
-    /// Id of the interface.
-    static constexpr RnUid iid{0x7c1e9f21, 0x4a5b11ef, 0x9c6e0b62, 0x5d83a4f7};
-
-    /// The same for all files.
-    virtual PhotoFormatTraits getTraits() const = 0;
 };
 
 }  // namespace Ov

@@ -13,6 +13,7 @@
 #include "ovphoto/classIds.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
+#include "ovphoto/photoFormat.h"
 #include "support/paths.h"
 #include "tests/support/tempFolder.h"
 
@@ -103,10 +104,10 @@ TEST_F(Boundary, TheHostsHandlersCatchWhatTheModuleRaises) {
     std::ostringstream full;
     full.setstate(std::ios::badbit);
     RnStream out(rnCreate<RnOutBuffer>(&full).get(), RnStream::Form::text);
-    const auto functions = module.functions();
-    for (const auto write : {functions.writeIes, functions.writeCibse, functions.writeNimb, functions.writeTbt})
-        raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>(
-            [&] { write(*source, out, OvPhotometrics::FileForm::faithful, nullptr, 0); });
+    for (const auto& builder : manager()->builders(L"Photometric Web"))
+        if (const auto format = rnQuery<RnPhotoFormat>(builder.get()))
+            raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>(
+                [&] { format->write(*source, out, FileForm::faithful, nullptr, 0); });
     const auto object = importer->import(folder.write("good.ies", goodFile).c_str(), nullptr);
     raises<RnStreamEx::ExWriteError, RnStreamEx, std::runtime_error>([&] { out << object.get(); });
 }

@@ -3,7 +3,6 @@
 #include <fstream>
 #include <iterator>
 
-#include "components/module/fileExports.h"
 #include "components/photo/cibse/photoWebCIBSE.h"
 #include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
@@ -52,10 +51,10 @@ protected:
     RnRef<Ov::RnCastable> reread(const Ov::RnUid& format, Ov::RnIntensityDist& light) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), Form::text);
-        EXPECT_TRUE(writeFile(format, light, stream, FileForm::faithful, nullptr, 0)) << log.take();
+        const auto builder = Ov::rnCast<Ov::RnPhotoFormat>(builderTable().find(format));
+        EXPECT_TRUE(builder->write(light, stream, FileForm::faithful, nullptr, 0)) << log.take();
         io->seek(0, 0);
-        auto visitor = Ov::rnVisitor<const FileFact&>([](const FileFact&) {});
-        return importWithFacts(*io, format, L"", nullptr, visitor);
+        return builder->import(Ov::RnPtr<Ov::RnBufferedIO>(io.get()), L"", nullptr);
     }
 
     /// Everything that a device holds.
@@ -101,20 +100,20 @@ protected:
             EXPECT_EQ(outcome(GetParam().make, bytes, actual), expected) << what << ": " << bytes.substr(0, 200);
         };
         for (const auto& [id, builder] : builderTable()) {
-            const auto importer = Ov::rnQuery<Ov::RnImportBuilder>(builder);
+            const auto importer = Ov::rnQuery<Ov::RnPhotoFormat>(builder);
             if (!importer) continue;
             same("recognised", [&](auto& io, auto) { return importer->canImport(&io) ? "yes" : "no"; });
             same("imported", [&](auto& io, MakeDevice make) {
                 return savedIn(make, *importer->import(Ov::RnPtr<Ov::RnBufferedIO>(&io), L"web", L""));
             });
+            same("facts", [&](auto& io, auto) {
+                std::wstring all;
+                auto visitor = Ov::rnVisitor<const FileFact&>(
+                    [&](const FileFact& fact) { all += fact.key + std::wstring(fact.text); });
+                importer->readFacts(io, L"", visitor);
+                return Ov::toUtf8(all);
+            });
         }
-        same("facts", [&](auto& io, auto) {
-            std::wstring all;
-            auto visitor = Ov::rnVisitor<const FileFact&>(
-                [&](const FileFact& fact) { all += fact.key + std::wstring(fact.text); });
-            readFileFacts(io, nullptr, L"", visitor);
-            return Ov::toUtf8(all);
-        });
         for (const Form form : {Form::text, Form::binary}) {
             same("natural light", [&](auto& io, MakeDevice make) {
                 const auto light = Ov::rnCreate<DaylightData>();

@@ -3,7 +3,6 @@
 #include <new>
 
 #include "components/messageFile/messageIds.h"
-#include "components/module/fileExports.h"
 #include "components/photo/cibse/photoWebCIBSE.h"
 #include "components/photo/distributions/diffuse.h"
 #include "components/photo/distributions/isotropic.h"
@@ -167,7 +166,8 @@ protected:
             import(IesText{.lumens = 1000.0 * number, .horizontal = {0, 45.0 * number, 90.0 * number}}.text());
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), Form::text);
-        immortal<PhotoWebBuilder<Format>>().write(*makeWebDistribution(*source), stream, FileForm::faithful, {});
+        immortal<PhotoWebBuilder<Format>>().write(*makeWebDistribution(*source), stream, FileForm::faithful,
+                                                  nullptr, 0);
         return io->bytes();
     }
 };
@@ -305,18 +305,20 @@ TYPED_TEST(FailuresOfFiles, AreToldAndLeaveNothing) {
     this->atEveryPlace("facts", *web, [&] {
         int count = 0;
         auto visitor = Ov::rnVisitor<const FileFact&>([&](const FileFact&) { ++count; });
-        const bool well = readFileFacts(*Ov::rnCreate<FailingDevice>(text), nullptr, L"", visitor);
+        const bool well =
+            immortal<PhotoWebBuilder<TypeParam>>().readFacts(*Ov::rnCreate<FailingDevice>(text), L"", visitor);
         EXPECT_EQ(well, count > 0);
         return well;
     });
-    const FileFact facts[] = {{L"LUMINAIRE", L"a fact too long for its own place"}, {L"watts", L"12"}};
+    const FileFact facts[] = {{FactKind::keyword, L"LUMINAIRE", L"a fact too long for its own place"},
+                              {FactKind::value, L"watts", L"12"}};
     for (const FileForm form : {FileForm::asSaved, FileForm::faithful})
         this->atEveryPlace(
             "write", *light,
             [&] {
                 const auto io = this->spared([] { return Ov::rnCreate<FailingDevice>(); });
                 const auto stream = this->textStream(*io);
-                const bool well = writeFile(TypeParam::Web::classId, *light, *stream, form, facts, 2);
+                const bool well = immortal<PhotoWebBuilder<TypeParam>>().write(*light, *stream, form, facts, 2);
                 EXPECT_EQ(well, !io->bytes().empty());
                 return well;
             },

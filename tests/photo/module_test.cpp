@@ -14,6 +14,7 @@
 #include "ovphoto/intensities.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
+#include "ovphoto/photoFormat.h"
 #include "support/paths.h"
 #include "tests/support/tempFolder.h"
 
@@ -80,11 +81,11 @@ TEST_F(ModuleTest, TheRegistryFindsEveryBuilder) {
 }
 
 TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
-    for (std::uint32_t ordinal : {0U, 2U, 421U, 442U, 4711U, 65537U})
+    for (std::uint32_t ordinal : {0U, 2U, 421U, 435U, 441U, 4711U, 65537U})
         EXPECT_EQ(module->byOrdinal(ordinal), nullptr);
     std::set<void*> functions;
-    for (std::uint32_t ordinal = 422; ordinal <= 441; ++ordinal) functions.insert(module->byOrdinal(ordinal));
-    EXPECT_EQ(functions.size(), 20U);
+    for (std::uint32_t ordinal = 422; ordinal <= 434; ++ordinal) functions.insert(module->byOrdinal(ordinal));
+    EXPECT_EQ(functions.size(), 13U);
     EXPECT_FALSE(functions.contains(nullptr));
 
     EXPECT_EQ(module->byOrdinal<float(bool, int, int, bool)>(422)(true, 12, 30, true), 12.5F);
@@ -109,33 +110,32 @@ TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
 
 TEST_F(ModuleTest, AnImportTellsWhatElseTheFileSays) {
     std::wstring told;
-    auto visitor = Ov::rnVisitor<const OvPhotometrics::FileFact&>(
-        [&](const OvPhotometrics::FileFact& fact) { told += std::wstring(fact.key) + L"=" + fact.text + L";"; });
-    const auto import = [&](const char* text, const Ov::RnUid& format) {
-        return OvPhotometrics::numberedFunctions(*module).importWithFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text),
-                                                                          format, L"lamp", nullptr, visitor);
+    auto visitor = Ov::rnVisitor<const Ov::FileFact&>(
+        [&](const Ov::FileFact& fact) { told += std::wstring(fact.key) + L"=" + fact.text + L";"; });
+    const auto format =
+        Ov::rnCast<Ov::RnPhotoFormat>(manager->findBuilder(OvPhotometrics::classIds::iesWeb).get());
+    const auto import = [&](const char* text) {
+        return format->importWithFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), L"lamp", nullptr, visitor);
     };
     const char* const good = "IESNA91\n[LUMCAT] 7\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1";
-    const auto object = import(good, OvPhotometrics::classIds::iesWeb);
+    const auto object = import(good);
     EXPECT_STREQ(Ov::rnCast<Ov::RnPhotoWebData>(object.get())->getName(), L"lamp");
     EXPECT_NE(told.find(L"LUMCAT=7;"), std::wstring::npos);
     told.clear();
-    EXPECT_FALSE(import(good, OvPhotometrics::classIds::diffuse));
-    EXPECT_THROW(import("IESNA91\nTILT=NONE\n0", OvPhotometrics::classIds::iesWeb), Ov::RnStreamEx::ExReadError);
+    EXPECT_THROW(import("IESNA91\nTILT=NONE\n0"), Ov::RnStreamEx::ExReadError);
     EXPECT_EQ(told, L"");
 }
 
 TEST_F(ModuleTest, IntensitiesOfManyDirectionsTakeSpans) {
-    const auto functions = OvPhotometrics::numberedFunctions(*module);
     const auto lamp = manager->createObject(OvPhotometrics::classIds::diffuse);
     Ov::rnCast<Ov::RnIntensityDist>(lamp.get())->setPeakIntensity(2);
     const Ov::GeVector3<float> vectors[] = {{0, 0, 1}, {0, 0.6F, 0.8F}, {1, 0, 0}};
     const OvPhotometrics::DirectionAngles angles[] = {{}, {0.6435011F, 1}, {2, 1}};
     const auto answers = [&](auto ask, auto directions) {
         std::vector<float> candela(3);
-        EXPECT_FALSE(ask(functions, lamp.get(), directions, std::span(candela).first(2)));
-        EXPECT_FALSE(ask({}, lamp.get(), directions, candela));
-        EXPECT_TRUE(ask(functions, lamp.get(), directions, candela));
+        EXPECT_FALSE(ask(lamp.get(), directions, std::span(candela).first(2)));
+        EXPECT_FALSE(ask(nullptr, directions, candela));
+        EXPECT_TRUE(ask(lamp.get(), directions, candela));
         EXPECT_EQ(candela[0], 2);
         EXPECT_FLOAT_EQ(candela[1], 1.6F);
         EXPECT_EQ(candela[2], 0);

@@ -55,6 +55,13 @@ protected:
         return Ov::rnCast<Ov::RnPersistant>(&object)->load(stream, 0, name, nullptr);
     }
 
+    static bool writeFaithfully(Ov::RnPhotoFormat& format, Ov::RnIntensityDist& dist, Ov::RnStream& stream,
+                                const FileFacts& facts = {}) {
+        const std::vector<FileFact> given = facts.list();
+        return format.write(dist, stream, FileForm::faithful, given.data(),
+                            static_cast<std::int32_t>(given.size()));
+    }
+
     RnRef<Ov::RnWebIntensityDist> distributionOf(Ov::RnPhotoWebData& web) { return makeWebDistribution(web); }
 
     MessageLog log;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <sstream>
 
+#include "components/support/devices.h"
 #include "tools/numbers/numbers.h"
 
 namespace OvTool {
@@ -47,18 +48,20 @@ bool isEulumdat(const std::string& bytes) {
 
 }  // namespace
 
-std::string closeFormat(Ov::RnBufferedIO& io) {
+std::string closeFormat(Ov::RnBufferedIO& io, const Formats& formats) {
     const std::string bytes = firstBytes(io);
     if (bytes.empty()) return "it is empty";
     if (bytes.starts_with("\x1F\x8B")) return "it is compressed by gzip, to be unpacked first";
     if (bytes.starts_with("PK\3\4"sv)) return "it is a zip archive, to be unpacked first";
     if (isUtf16(bytes)) return "it is text in UTF-16, to be saved in UTF-8 or ANSI first";
     if (isEulumdat(bytes)) return "it looks like EULUMDAT, which is not read";
-    if (bytes.find('\r') != std::string::npos && bytes.find('\n') == std::string::npos) {
-        return std::string("its lines end in carriage returns alone") +
-               (bytes.find("\rTILT=") == std::string::npos ? "" : "; --as ies takes them");
-    }
-    return {};
+    if (bytes.find('\r') == std::string::npos || bytes.find('\n') != std::string::npos) return {};
+    // Readers take such lines where content tests do not.
+    std::string other = bytes;
+    std::replace(other.begin(), other.end(), '\r', '\n');
+    const Format* const reader = formats.recognise(*Ov::rnCreate<Ov::RnMemoryBuffer>(other));
+    return "its lines end in carriage returns alone" +
+           (reader ? "; --as " + reader->extension + " takes them" : std::string());
 }
 
 }  // namespace OvTool

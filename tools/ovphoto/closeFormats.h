@@ -2,12 +2,12 @@
 
 #include <string>
 
-#include "host/componentManager/bufferedIO.h"
+#include "tools/ovphoto/format.h"
 
 namespace OvTool {
 
 /// What an input that no reader takes may be, by the look of its first bytes: nothing at all, something compressed,
 /// UTF-16, EULUMDAT, or text whose lines end in carriage returns alone. Else empty. The position goes back to the start.
-std::string closeFormat(Ov::RnBufferedIO& io);
+std::string closeFormat(Ov::RnBufferedIO& io, const Formats& formats);
 
 }  // namespace OvTool

@@ -15,7 +15,6 @@
 namespace OvTool {
 
 using namespace Ov;
-using OvPhotometrics::FileForm;
 
 namespace {
 
@@ -49,10 +48,10 @@ void reportLoss(Json& report, const Conversion& conversion, RnWebIntensityDist& 
 }
 
 /// What the output does not hold of the source, the flux of its lamps included.
-Json droppedOf(const ReadResult& source, const LightFile& made) {
+Json droppedOf(const ReadResult& source, const Format& target, const LightFile& made) {
     Json dropped = factsToJson(droppedFacts(source.facts, made.facts));
     const float lamps = fileInfoOf(*source.web).lampLumens;
-    if (lamps > 0 && !made.traits.holdsLampLumens && made.lampLumens != lamps)
+    if (lamps > 0 && !target.traits.holdsLampLumens && made.lampLumens != lamps)
         dropped.push_back({{"key", "lampLumens"}, {"value", exactNumber(lamps)}});
     return dropped;
 }
@@ -68,7 +67,7 @@ Json convert(const Conversion& conversion, const HostSession& session, const Rea
     std::vector<std::string> messages;
     const auto made = writeAnew(conversion, session, source, facts, light, messages);
     if (made && made->light) {
-        report["dropped"] = droppedOf(source, *made);
+        report["dropped"] = droppedOf(source, *conversion.target, *made);
         if (const auto warning = lostTypeB(source, made->facts)) append(report["warnings"], {*warning});
         reportLoss(report, conversion, *light, *made);
     } else if (made) {

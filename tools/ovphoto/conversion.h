@@ -5,7 +5,6 @@
 
 #include "tools/ovphoto/hostSession.h"
 #include "tools/ovphoto/json.h"
-#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
@@ -13,7 +12,7 @@ struct Conversion {
     std::string in;
     std::string out;
     std::string as;  // format to read as; empty: told by content
-    const TargetFormat* target;
+    const Format* target = nullptr;
     bool asSaved = false;
     bool brief = false;  // messages are for people: see ReadResult::told
 };

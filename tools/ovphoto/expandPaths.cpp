@@ -6,7 +6,6 @@
 #include "components/support/path.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/standardStreams.h"
-#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
@@ -16,19 +15,15 @@ namespace {
 
 void addFolder(const fs::path& folder, std::vector<FoundFile>& files) {
     std::error_code error;
-    std::vector<fs::directory_entry> entries;
-    for (fs::directory_iterator entry(folder, error), end; !error && entry != end; entry.increment(error)) {
-        entries.push_back(*entry);
-    }
+    const std::vector<fs::path> entries = pathsIn(folder, error);
     if (error) files.push_back({pathText(folder), false, "cannot be listed: " + error.message()});
-    std::sort(entries.begin(), entries.end());
-    for (const fs::directory_entry& entry : entries) {
+    for (const fs::path& entry : entries) {
         std::error_code ignored;
         // Links to folders are not followed: they may lead in circles.
-        if (entry.is_directory(ignored) && !isLink(entry.path())) {
-            addFolder(entry.path(), files);
-        } else if (!entry.is_directory(ignored)) {
-            files.push_back({pathText(entry.path()), true, {}});
+        if (!fs::is_directory(entry, ignored)) {
+            files.push_back({pathText(entry), true, {}});
+        } else if (!isLink(entry)) {
+            addFolder(entry, files);
         }
     }
 }
@@ -54,7 +49,5 @@ std::string pathText(const fs::path& path) {
     if (fs::path::preferred_separator != '/') std::replace(text.begin(), text.end(), '\\', '/');
     return text;
 }
-
-bool hasPhotometricExtension(const std::string& path) { return targetOf(path) != nullptr; }
 
 }  // namespace OvTool

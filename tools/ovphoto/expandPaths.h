@@ -20,7 +20,4 @@ std::vector<FoundFile> expandPaths(const std::vector<std::string>& paths);
 /// A path as the tool shows it: with slashes, on every system.
 std::string pathText(const std::filesystem::path& path);
 
-/// Whether the file's extension is that of a photometric format: ies, cib, nmb or tbt.
-bool hasPhotometricExtension(const std::string& path);
-
 }  // namespace OvTool

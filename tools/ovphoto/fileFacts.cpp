@@ -15,42 +15,6 @@ using namespace Ov;
 
 namespace {
 
-/// Header keywords are in capitals.
-bool isKeyword(std::wstring_view key) {
-    return std::none_of(key.begin(), key.end(), [](wchar_t c) { return c >= L'a' && c <= L'z'; });
-}
-
-bool isLabel(std::wstring_view key) {
-    return key == L"title" || key == L"line" || key.starts_with(L"line ") || key.starts_with(L"label ") ||
-           isKeyword(key);
-}
-
-bool isOfWeb(std::wstring_view key) {
-    static constexpr std::wstring_view keys[] = {
-        L"lumensPerLamp",     L"photometry",       L"ballastFactor", L"flux",
-        L"ballastLampFactor", L"photometricType",  L"symmetryCode",  L"symmetryCode1",
-        L"symmetryCode2",     L"orientationAngle", L"referenceFlux", L"encoding"};
-    return std::find(std::begin(keys), std::end(keys), key) != std::end(keys);
-}
-
-/// Whether a file holds the value for want of another.
-bool saysNothing(const Fact& fact) {
-    static constexpr std::pair<std::wstring_view, std::wstring_view> defaults[] = {
-        {L"tilt", L"NONE"},     {L"lamps", L"1"},           {L"format", L"IESNA91"},
-        {L"leadInteger", L"1"}, {L"trailerInteger", L"99"}, {L"kindCode", L"3"},
-        {L"auxValue1", L"1"},   {L"auxValue2", L"5"},       {L"unitTriple", L"1 1 1"}};
-    return fact.text.find_first_not_of(L"0 ") == std::wstring::npos ||
-           std::find(std::begin(defaults), std::end(defaults),
-                     std::pair<std::wstring_view, std::wstring_view>(fact.key, fact.text)) != std::end(defaults);
-}
-
-/// Units mean nothing without a dimension.
-bool hasDimension(const std::vector<Fact>& facts) {
-    return std::any_of(facts.begin(), facts.end(), [](const Fact& fact) {
-        return (fact.key == L"width" || fact.key == L"length" || fact.key == L"height") && !saysNothing(fact);
-    });
-}
-
 std::wstring withoutBlanks(std::wstring text) {
     std::erase_if(text, [](wchar_t c) { return c <= L' ' || c == 127; });
     return text;
@@ -62,7 +26,7 @@ constexpr std::wstring_view other = L"[OTHER]";
 /// A label line without its blanks, the keyword in front.
 std::wstring lineOf(const Fact& fact) {
     const std::wstring text = withoutBlanks(fact.text);
-    return isKeyword(fact.key) ? L"[" + fact.key + L"]" + text : text;
+    return fact.kind == FactKind::keyword ? L"[" + fact.key + L"]" + text : text;
 }
 
 /// The label lines of a file; each stands for one of another file.
@@ -75,7 +39,7 @@ public:
             whole.clear();
         };
         for (const Fact& fact : facts) {
-            if (!isLabel(fact.key)) continue;
+            if (!fact.isLabel()) continue;
             const std::wstring line = lineOf(fact);
             _lines.insert(line);
             if (!line.starts_with(more)) addWhole();
@@ -117,29 +81,11 @@ private:
     std::map<std::wstring, std::size_t> _continued;  // those that go on in further lines, whole, and where
 };
 
-/// The first of several numbers, and the others.
-std::pair<std::wstring, std::wstring> firstAndRest(const std::wstring& numbers) {
-    const std::size_t blank = std::min(numbers.find(L' '), numbers.size());
-    return {numbers.substr(0, blank), numbers.substr(blank)};
-}
-
-/// What of a fact is no matter of the web: of several factors all but the first.
-Fact ownPart(const Fact& fact) {
-    return {fact.key, fact.key == L"factors" ? firstAndRest(fact.text).second : fact.text};
-}
-
-/// Whether a file has a multiplier beside its fluxes that is not their quotient, as written with two decimals.
-bool hasOwnMultiplier(const std::vector<Fact>& facts) {
-    const auto flux = factNumber(facts, L"flux"), reference = factNumber(facts, L"referenceFlux");
-    const auto multiplier = factNumber(facts, L"multiplier");
-    return flux && reference && multiplier &&
-           std::abs(double{*multiplier} * *reference - *flux) > 0.005 + 1e-6 * *flux;
-}
-
 /// Whether another file has the same number or choice.
 bool holds(const std::vector<Fact>& facts, const Fact& own) {
-    const std::wstring* text = findFact(facts, own.key);
-    return text && ownPart({own.key, *text}).text == own.text;
+    return std::any_of(facts.begin(), facts.end(), [&](const Fact& fact) {
+        return fact.key == own.key && (fact.own == own.own || fact.text == own.text);
+    });
 }
 
 }  // namespace
@@ -162,13 +108,8 @@ Json factsToJson(const std::vector<Fact>& facts) {
 
 std::vector<Fact> droppedFacts(const std::vector<Fact>& source, const std::vector<Fact>& output) {
     LabelLines labels(output);
-    const bool sized = hasDimension(source);
-    const bool multiplied = hasOwnMultiplier(source) && !hasOwnMultiplier(output);
     const auto isKept = [&](const Fact& fact) {
-        if (isLabel(fact.key)) return labels.take(fact);
-        if (fact.key == L"multiplier") return !multiplied;
-        const Fact own = ownPart(fact);
-        return isOfWeb(own.key) || saysNothing(own) || (own.key == L"units" && !sized) || holds(output, own);
+        return fact.isLabel() ? labels.take(fact) : fact.own.empty() || holds(output, fact);
     };
     std::vector<Fact> dropped;
     for (const Fact& fact : source)

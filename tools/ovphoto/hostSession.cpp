@@ -14,15 +14,12 @@
 #include "tools/ovphoto/messageCollector.h"
 #include "tools/ovphoto/platform.h"
 #include "tools/ovphoto/standardStreams.h"
-#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
 using namespace Ov;
 
 namespace {
-
-constexpr const wchar_t* webCategory = L"Photometric Web";
 
 std::wstring findModule() {
     const std::filesystem::path folder = executableFolder();
@@ -34,15 +31,22 @@ std::wstring findModule() {
                    " lies neither beside the tool nor in ../lib; --module names it");
 }
 
-RnRef<RnComponentBuilder> chooseBuilder(const HostSession& session, RnBufferedIO& io, const std::string& as) {
-    if (as.empty()) {
-        const auto accepting = session.webImportersFor(io);
-        return accepting.empty() ? RnRef<RnComponentBuilder>() : accepting.front();
+/// "libOVphoto.so" and the like; not the companion with its texts, on systems where that is named so, too.
+bool isModuleName(const std::filesystem::path& file) {
+    const std::wstring stem = widePath(file.stem());
+    return stem.starts_with(L"libOV") && !stem.ends_with(L"Res") &&
+           file.extension() == std::filesystem::path(moduleFileName()).extension();
+}
+
+/// Loads the modules that lie beside one: what is named as such and has the entry point of one.
+void loadNeighbours(RnComponentManager& manager, const Module& module) {
+    const std::filesystem::path own = nativePath(module.path());
+    std::error_code ignored;
+    for (const std::filesystem::path& path : pathsIn(own.parent_path(), ignored)) {
+        const std::wstring name = widePath(path);
+        if (path != own && isModuleName(path.filename()) && Module(name).byName("RnGetComponentDescription"))
+            manager.loadModule(name.c_str());
     }
-    for (const auto& builder : session.webImporters()) {
-        if (formatName(*builder) == as) return builder;
-    }
-    return {};
 }
 
 std::wstring pathOf(const std::string& file) { return fromUtf8(isStandardStream(file) ? "stdin" : file); }
@@ -118,6 +122,8 @@ HostSession::HostSession(const std::string& modulePath)
     : _manager(rnCast<RnComponentManager>(RnGetComponentManager())) {
     const std::wstring path = modulePath.empty() ? findModule() : fromUtf8(modulePath);
     _module = &_manager->loadModule(path.c_str());
+    loadNeighbours(*_manager, *_module);
+    _formats = Formats(*_manager);
 }
 
 OvPhotometrics::NumberedFunctions HostSession::functions() const {
@@ -127,16 +133,6 @@ OvPhotometrics::NumberedFunctions HostSession::functions() const {
     OVPHOTO_NUMBERED_EXPORTS(OVPHOTO_CHECK_EXPORT)
 #undef OVPHOTO_CHECK_EXPORT
     return functions;
-}
-
-std::vector<RnRef<RnComponentBuilder>> HostSession::webImporters() const {
-    auto all = _manager->builders(webCategory);
-    std::erase_if(all, [](const auto& builder) { return !builder->hasInterface(RnImportBuilder::iid); });
-    return all;
-}
-
-std::vector<RnRef<RnComponentBuilder>> HostSession::webImportersFor(RnBufferedIO& io) const {
-    return _manager->importersFor(webCategory, &io);
 }
 
 ReadResult HostSession::read(const std::string& file, const std::string& as) const {
@@ -173,11 +169,10 @@ ReadResult HostSession::readFrom(const std::string& file, const std::string& as,
 void HostSession::explainRefusal(RnBufferedIO& io, ReadResult& result, const std::vector<long>& positions,
                                  const std::string& as) const {
     try {
-        const std::string close = result.format.empty() || !as.empty() ? closeFormat(io) : "";
+        const std::string close = result.format.empty() || !as.empty() ? closeFormat(io, _formats) : "";
         if (!close.empty()) result.error += (result.error.empty() ? "" : ": ") + close;
-        const TargetFormat* format = targetNamed(result.format);
-        if (format && !format->namesLines && !positions.empty() && !canBeRead(io, result))
-            result.lines = linesAt(io, positions);
+        const bool namesLines = !result.reader || result.reader->traits.namesLines;
+        if (!namesLines && !positions.empty() && !canBeRead(io, result)) result.lines = linesAt(io, positions);
     } catch (...) {  // of a device that fails
     }
 }
@@ -186,26 +181,25 @@ void HostSession::explainRefusal(RnBufferedIO& io, ReadResult& result, const std
 bool HostSession::canBeRead(RnBufferedIO& io, const ReadResult& result) const {
     std::vector<std::string> unheard;
     const MessageCollector collector(unheard);
-    auto skip = rnVisitor<const OvPhotometrics::FileFact&>([](const OvPhotometrics::FileFact&) {});
+    auto skip = rnVisitor<const FileFact&>([](const FileFact&) {});
     io.seek(0, 0);
-    return functions().readFileFacts(io, &result.classId, pathFolder(pathOf(result.file)).c_str(), skip);
+    return result.reader->own && result.reader->own->readFacts(io, pathFolder(pathOf(result.file)).c_str(), skip);
 }
 
 void HostSession::import(RnBufferedIO& io, ReadResult& result, const std::string& as) const {
-    const RnRef<RnComponentBuilder> builder = chooseBuilder(*this, io, as);
-    if (!builder) {
+    const Format* const format = as.empty() ? _formats.recognise(io) : _formats.named(as);
+    if (!format) {
         result.error = as.empty() ? unknownFormat : "the module has no reader for " + as + " files";
         return;
     }
-    result.format = formatName(*builder);
-    result.classId = builder->getClassId();
-    if (const auto format = rnQuery<RnPhotoFormat>(builder.get())) result.traits = format->getTraits();
-    const std::wstring path = pathOf(result.file);
-    auto collect = rnVisitor<const OvPhotometrics::FileFact&>([&result](const OvPhotometrics::FileFact& fact) {
-        result.facts.push_back({fact.key, fact.text});
+    result.format = format->name;
+    result.reader = format;
+    const std::wstring path = pathOf(result.file), name = pathStem(path), folder = pathFolder(path);
+    auto collect = rnVisitor<const FileFact&>([&result](const FileFact& fact) {
+        result.facts.push_back({fact.kind, fact.key, fact.text, fact.own});
     });
-    const auto object =
-        functions().importWithFacts(io, result.classId, pathStem(path).c_str(), pathFolder(path).c_str(), collect);
+    const auto object = format->own ? format->own->importWithFacts(io, name.c_str(), folder.c_str(), collect)
+                                    : format->builder->import(&io, name.c_str(), folder.c_str());
     result.web = rnCast<RnPhotoWebData>(object.get());
 }
 
@@ -223,22 +217,6 @@ RnRef<RnWebIntensityDist> HostSession::distribute(RnPhotoWebData& web, float lum
     distribution->setWeb(&web);
     distribution->setFlux(lumens);
     return distribution;
-}
-
-std::string formatName(const RnBuilderDescription& builder) {
-    std::string name = toUtf8(builder.getName());
-    if (name.ends_with(" Web")) name.resize(name.size() - 4);
-    return name;
-}
-
-std::string extensionOf(RnComponentBuilder& builder) {
-    std::string first;
-    auto takeFirst = rnVisitor<const wchar_t*>([&first](const wchar_t* extension) {
-        first = toUtf8(extension);
-        return RnEnum::stop;
-    });
-    if (const auto importer = rnQuery<RnImportBuilder>(&builder)) importer->enumerateExtensions(takeFirst);
-    return first;
 }
 
 namespace {

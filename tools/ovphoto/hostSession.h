@@ -9,21 +9,25 @@
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
 #include "ovphoto/photoFile.h"
+#include "tools/ovphoto/format.h"
 
 namespace OvTool {
 
-/// One thing that a file says beyond its web; the keys are listed in ovphoto/numberedExports.h.
+/// One thing that a file says beyond its web, as Ov::FileFact has it.
 struct Fact {
+    Ov::FactKind kind;
     std::wstring key;
     std::wstring text;
+    std::wstring own;
+
+    bool isLabel() const { return kind == Ov::FactKind::label || kind == Ov::FactKind::keyword; }
 };
 
 /// What became of a file that was read. Texts are UTF-8, but for file names, which may hold any bytes.
 struct ReadResult {
     std::string file;                   // as the user gave it
     std::string format;                 // name of the reader's format ("IES"); empty when none was found
-    Ov::RnUid classId{};                // of the format's webs
-    Ov::PhotoFormatTraits traits;       // of the format
+    const Format* reader = nullptr;     // that format, of the session
     Ov::RnRef<Ov::RnPhotoWebData> web;  // null when the file was refused
     std::vector<Fact> facts;            // in the order of the file; none when it was refused
     std::vector<std::string> messages;  // texts that the reader reported, in order
@@ -41,8 +45,8 @@ struct ReadResult {
 /// The tool as a host: the module is loaded, and files are read through whatever builders it brings.
 class HostSession {
 public:
-    /// Loads the module at `modulePath`, or, when that is empty, the one beside the tool or in ../lib from there.
-    /// Raises ExModule.
+    /// Loads the module at `modulePath`, or, when that is empty, the one beside the tool or in ../lib from there, and
+    /// the other modules that lie beside it. Raises ExModule.
     explicit HostSession(const std::string& modulePath);
 
     /// Lets people be told everything of what is read from now on.
@@ -54,10 +58,8 @@ public:
     /// What the module exports by number. Raises ExModule when one is missing.
     OvPhotometrics::NumberedFunctions functions() const;
 
-    /// The builders that import photometric webs, in order of their names.
-    std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImporters() const;
-    /// Those that accept the content of the input, the one to take first.
-    std::vector<Ov::RnRef<Ov::RnComponentBuilder>> webImportersFor(Ov::RnBufferedIO& io) const;
+    /// The formats that the modules import.
+    const Formats& formats() const { return _formats; }
 
     /// Reads a file, with the reader of the format `as` ("IES") or, when that is empty, of the one whose content
     /// test accepts it. Never throws for what a file holds or because it cannot be read.
@@ -81,13 +83,9 @@ private:
 
     Ov::RnRef<Ov::RnComponentManager> _manager;
     const Ov::Module* _module;
+    Formats _formats;
     bool _verbose = false;
 };
-
-/// "IES" for the builder named "IES Web".
-std::string formatName(const Ov::RnBuilderDescription& builder);
-/// The first extension that the builder imports, or empty.
-std::string extensionOf(Ov::RnComponentBuilder& builder);
 
 /// @{
 /// The size of the largest input that `openFile` takes, in bytes: 256 MiB when it was not set.

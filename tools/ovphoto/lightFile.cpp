@@ -15,51 +15,48 @@ namespace {
 
 constexpr double tolerated = 1;  // per cent, of fluxes
 
-std::optional<std::string> fileBytes(const HostSession& session, const TargetFormat& target,
-                                     RnIntensityDist& light, OvPhotometrics::FileForm form,
+std::optional<std::string> fileBytes(const Format& target, RnIntensityDist& light, FileForm form,
                                      const std::vector<Fact>& facts, std::vector<std::string>& messages) {
-    std::vector<OvPhotometrics::FileFact> given;
-    for (const Fact& fact : facts) given.push_back({fact.key.c_str(), fact.text.c_str()});
+    std::vector<FileFact> given;
+    for (const Fact& fact : facts) given.push_back({fact.kind, fact.key.c_str(), fact.text.c_str()});
     const auto buffer = rnCreate<RnMemoryBuffer>();
     RnStream stream(buffer.get(), RnStream::Form::text);
     const MessageCollector collector(messages);
     const std::size_t before = messages.size();
-    const auto write = session.functions().*target.write;
-    if (write(light, stream, form, given.data(), static_cast<std::int32_t>(given.size()))) return buffer->bytes();
-    if (messages.size() == before)
-        messages.push_back(std::string("the module does not write this as ") + target.name);
+    const auto count = static_cast<std::int32_t>(given.size());
+    if (target.own && target.own->write(light, stream, form, given.data(), count)) return buffer->bytes();
+    if (messages.size() == before) messages.push_back("the module does not write this as " + target.name);
     return {};
 }
 
 }  // namespace
 
-std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const TargetFormat& target,
-                                  RnIntensityDist& light, OvPhotometrics::FileForm form,
-                                  const std::vector<Fact>& facts, std::vector<std::string>& messages) {
-    auto bytes = fileBytes(session, target, light, form, facts, messages);
+std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const Format& target,
+                                  RnIntensityDist& light, FileForm form, const std::vector<Fact>& facts,
+                                  std::vector<std::string>& messages) {
+    auto bytes = fileBytes(target, light, form, facts, messages);
     if (!bytes) return {};
-    LightFile made{std::move(*bytes), {}, 0, {}, {}, {}};
+    LightFile made{std::move(*bytes), {}, 0, {}, {}};
     ReadResult again = session.readBytes(made.bytes, file, target.name);
     if (again.web) {
         made.light = session.lightOf(*again.web);
         made.lampLumens = fileInfoOf(*again.web).lampLumens;
-        made.traits = again.traits;
         made.facts = std::move(again.facts);
     } else {
-        made.refusal = std::string("the output is no readable ") + target.name + " file";
+        made.refusal = "the output is no readable " + target.name + " file";
         for (const std::string& reason : again.told()) made.refusal += ": " + reason;
     }
     return made;
 }
 
-std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFormat& target,
+std::vector<std::string> lossWarnings(const ConversionLoss& loss, const Format& target,
                                       const RnIntensityDist& light, const LightFile& made) {
     std::vector<std::string> warnings;
     const double lamps = light.getFlux();
-    if (!made.traits.holdsLampLumens && made.lampLumens > 0 &&
+    if (!target.traits.holdsLampLumens && made.lampLumens > 0 &&
         std::abs(made.lampLumens - lamps) > lamps * tolerated / 100)
-        warnings.push_back(std::string(target.name) + " holds no flux of lamps: readers take " +
-                           shortNumber(made.lampLumens) + " lm instead of " + shortNumber(lamps) + " lm");
+        warnings.push_back(target.name + " holds no flux of lamps: readers take " + shortNumber(made.lampLumens) +
+                           " lm instead of " + shortNumber(lamps) + " lm");
     if (loss.candelaPercent > keptPercent) {
         warnings.push_back("the candela differ by up to " + shortNumber(loss.candela) + " cd, " +
                            shortNumber(loss.candelaPercent) + " % of the peak");

@@ -7,7 +7,6 @@
 #include "tools/ovphoto/conversionLoss.h"
 #include "tools/ovphoto/fileFacts.h"
 #include "tools/ovphoto/hostSession.h"
-#include "tools/ovphoto/targetFormat.h"
 
 // Between files and lights.
 
@@ -18,20 +17,19 @@ using WebLight = Ov::RnRef<Ov::RnWebIntensityDist>;
 /// A light as a file that is not yet in its place.
 struct LightFile {
     std::string bytes;
-    WebLight light;        // as the format's reader reads it, in candela; null when it refuses to
-    float lampLumens = 0;  // that it stands for; 0: none
-    Ov::PhotoFormatTraits traits;
+    WebLight light;           // as the format's reader reads it, in candela; null when it refuses to
+    float lampLumens = 0;     // that it stands for; 0: none
     std::string refusal;      // then why
     std::vector<Fact> facts;  // as they are read
 };
 
 /// Writes a light for `file` and reads it again. None after messages, to which the writer's are added.
-std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const TargetFormat& target,
-                                  Ov::RnIntensityDist& light, OvPhotometrics::FileForm form,
-                                  const std::vector<Fact>& facts, std::vector<std::string>& messages);
+std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const Format& target,
+                                  Ov::RnIntensityDist& light, Ov::FileForm form, const std::vector<Fact>& facts,
+                                  std::vector<std::string>& messages);
 
 /// What a user should know of a file that differs from the light by `loss`.
-std::vector<std::string> lossWarnings(const ConversionLoss& loss, const TargetFormat& target,
+std::vector<std::string> lossWarnings(const ConversionLoss& loss, const Format& target,
                                       const Ov::RnIntensityDist& light, const LightFile& made);
 
 }  // namespace OvTool

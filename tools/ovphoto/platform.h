@@ -24,6 +24,8 @@ bool standardOutputIsClosedPipe();
 /// What `main` was given behind the program's name, in UTF-8; wildcards that a shell has left are expanded.
 std::vector<std::string> commandLine(int argc, char** argv);
 std::filesystem::path executableFolder();
+/// The paths of what stands in a folder, by name; where it cannot be listed, of what was found by then, and why.
+std::vector<std::filesystem::path> pathsIn(const std::filesystem::path& folder, std::error_code& error);
 /// Whether a folder is a link to another.
 bool isLink(const std::filesystem::path& folder);
 /// File name of the module, "libOVphoto.so".

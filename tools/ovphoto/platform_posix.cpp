@@ -1,5 +1,6 @@
 #include "tools/ovphoto/platform.h"
 
+#include <dirent.h>
 #include <fcntl.h>
 #include <poll.h>
 #include <spawn.h>
@@ -138,6 +139,21 @@ bool standardOutputIsClosedPipe() {
 std::vector<std::string> commandLine(int argc, char** argv) { return {argv + std::min(argc, 1), argv + argc}; }
 
 std::filesystem::path executableFolder() { return executable().parent_path(); }
+
+// The standard library's own iterator ends the process where memory runs out.
+std::vector<std::filesystem::path> pathsIn(const std::filesystem::path& folder, std::error_code& error) {
+    std::vector<std::filesystem::path> paths;
+    const std::unique_ptr<DIR, int (*)(DIR*)> opened(opendir(folder.empty() ? "." : folder.c_str()), closedir);
+    errno = opened ? 0 : errno;
+    while (const dirent* const entry = opened ? readdir(opened.get()) : nullptr) {
+        const std::string_view name = entry->d_name;
+        if (name != "." && name != "..") paths.push_back(folder / name);
+        errno = 0;
+    }
+    error.assign(errno, std::generic_category());
+    std::sort(paths.begin(), paths.end());
+    return paths;
+}
 
 bool isLink(const std::filesystem::path& folder) {
     std::error_code ignored;

@@ -142,6 +142,15 @@ std::vector<std::string> commandLine(int, char**) {
 
 std::filesystem::path executableFolder() { return std::filesystem::path(executablePath()).parent_path(); }
 
+std::vector<std::filesystem::path> pathsIn(const std::filesystem::path& folder, std::error_code& error) {
+    std::vector<std::filesystem::path> paths;
+    for (std::filesystem::directory_iterator entry(folder, error), end; !error && entry != end;
+         entry.increment(error))
+        paths.push_back(entry->path());
+    std::sort(paths.begin(), paths.end());
+    return paths;
+}
+
 bool isLink(const std::filesystem::path& folder) {
     WIN32_FIND_DATAW found{};
     const HANDLE search = FindFirstFileW(folder.c_str(), &found);

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 
+#include "components/support/path.h"
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
 
@@ -25,21 +26,25 @@ std::optional<std::string> negativeValues(const RnPhotoWebData& web) {
     return std::to_string(negative) + (negative == 1 ? " candela value is" : " candela values are") + " negative";
 }
 
-/// The factor of an IES file, if any, that makes all of its values 0.
-const char* zeroFactor(const std::vector<Fact>& facts) {
-    static constexpr std::pair<const wchar_t*, const char*> factors[] = {
+/// The factor of a file, if any, that makes all of its values 0.
+std::string zeroFactor(const std::vector<Fact>& facts) {
+    static constexpr std::pair<const wchar_t*, const char*> names[] = {
         {L"multiplier", "candela multiplier"},
         {L"ballastFactor", "ballast factor"},
         {L"ballastLampFactor", "ballast-lamp factor (future use)"}};
-    for (const auto& [key, name] : factors)
-        if (factNumber(facts, key) == 0.0F) return name;
-    return nullptr;
+    const auto zero = std::find_if(facts.begin(), facts.end(), [](const Fact& fact) {
+        return fact.kind == FactKind::factor && parseFloat(toUtf8(fact.text)) == 0.0F;
+    });
+    if (zero == facts.end()) return {};
+    for (const auto& [key, name] : names)
+        if (zero->key == key) return name;
+    return toUtf8(zero->key);
 }
 
 std::optional<std::string> darkness(const ReadResult& result) {
     if (result.web->getMaxCandela() > 0) return {};
-    const char* factor = result.format == "IES" ? zeroFactor(result.facts) : nullptr;
-    if (factor) return std::string("all values are 0, because the ") + factor + " is 0";
+    const std::string factor = zeroFactor(result.facts);
+    if (!factor.empty()) return "all values are 0, because the " + factor + " is 0";
     return "no value is above 0: the light is dark";
 }
 

@@ -36,13 +36,13 @@ void carryLines(const FileFacts& facts, const std::wstring& name, CibseRecord& r
 void cibseDescribe(const CibseRecord& rec, FileFacts& facts) {
     for (std::size_t i = 0; i < rec.labels.size(); ++i)
         if (rec.labels[i].find_first_not_of(L' ') != std::wstring::npos)
-            facts.add(labelKey(i), facts.decoded(rec.labels[i], cibseLabelLimit));
-    facts.add(L"leadInteger", rec.leadInteger);
-    facts.add(L"photometricType", static_cast<std::int32_t>(rec.photometricType));
+            facts.add(labelKey(i), facts.decoded(rec.labels[i], cibseLabelLimit), FactKind::label);
+    facts.add(L"leadInteger", rec.leadInteger, FactKind::value, L"1");
+    facts.add(L"photometricType", static_cast<std::int32_t>(rec.photometricType), FactKind::ofLight);
     facts.add(L"leadValues", rec.leadValues);
-    facts.add(L"factors", rec.factors);
+    facts.add(L"factors", rec.factors, {}, 1);
     facts.add(L"singleValue", rec.singleValue);
-    facts.add(L"trailerInteger", rec.trailerInteger);
+    facts.add(L"trailerInteger", rec.trailerInteger, FactKind::value, L"99");
     facts.add(L"trailerValues", rec.trailerValues);
 }
 

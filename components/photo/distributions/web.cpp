@@ -43,7 +43,8 @@ float Web::localIntensityAtUnit(const Vector& direction) const {
     return _maxCandela > 0 && anglesOf(direction, theta, psi) ? localIntensity(theta, psi) : 0;
 }
 
-bool Web::intensities(DirectionForm form, const float* directions, std::size_t count, float* out) const {
+bool Web::getIntensities(DirectionForm form, const float* directions, std::int64_t wanted, float* out) const {
+    const auto count = static_cast<std::size_t>(wanted);
     // Other webs, and dark ones, are asked direction by direction.
     const auto web = Ov::rnQuery<RnBasePhotoWebData>(_web.get());
     if (!web || !(_maxCandela > 0)) return false;

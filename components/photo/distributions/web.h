@@ -1,13 +1,12 @@
 #pragma once
 
-#include "components/photo/distributions/manyIntensities.h"
 #include "components/photo/distributions/singlePrecision.h"
 #include "components/photo/files/savedWeb.h"
 #include "components/photo/lid/lidBuilder.h"
 #include "components/photo/lid/photoWeb.h"
 #include "components/support/castImpl.h"
 #include "ovphoto/classIds.h"
-#include "ovphoto/intensityDist.h"
+#include "ovphoto/intensities.h"
 #include "ovphoto/saveForm.h"
 
 namespace OvPhotometrics {
@@ -24,8 +23,8 @@ public:
 };
 
 /// Any photometric web as an intensity distribution. Without a web it is dark, axial, with the ranges {0, 0}.
-class Web final : public Ov::RnDataObject<Web, WebPersistant, ManyIntensities, Ov::RnWebIntensityDist,
-                                          Ov::RnIntensityDist, ManyIntensities> {
+class Web final : public Ov::RnDataObject2<Web, WebPersistant, Ov::RnWebIntensityDist, Ov::RnManyIntensities,
+                                           Ov::RnWebIntensityDist, Ov::RnIntensityDist> {
 public:
     static constexpr BuilderInfo info{classIds::webDistribution, distributionCategory, L"Web Distribution",
                                       L"Web Light Intensity Distribution"};
@@ -55,7 +54,8 @@ public:
     void hook() override {}
     Ov::RnPhotoWebData* getWeb() const override { return _web.get(); }
     void setWeb(Ov::RnCastable* web) override;
-    bool intensities(DirectionForm form, const float* directions, std::size_t count, float* out) const override;
+    bool getIntensities(Ov::DirectionForm form, const float* directions, std::int64_t count,
+                        float* out) const override;
 
 private:
     friend class WebPersistant;

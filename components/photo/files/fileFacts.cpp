@@ -34,30 +34,50 @@ bool parseNumbers(std::wstring_view text, std::span<Number> values) {
     return true;
 }
 
-/// Keywords are written in capitals, the names of numbers are not.
-bool isKeyword(std::wstring_view key) {
-    return !key.empty() && std::none_of(key.begin(), key.end(), [](wchar_t c) { return c >= L'a' && c <= L'z'; });
-}
-
 constexpr std::wstring_view encodingKey = L"encoding";
 constexpr std::wstring_view windows1252Name = L"Windows-1252";
 
-bool isLabel(std::wstring_view key) {
-    return key == L"title" || key == L"line" || key.starts_with(L"line ") || key.starts_with(L"label ");
+/// Where the part of a text starts that says something: at its end where none does.
+std::size_t ownPart(const std::wstring& text, FactKind kind, std::wstring_view usual, std::size_t from = 0) {
+    if (kind == FactKind::label || kind == FactKind::keyword) return 0;
+    const bool saysNothing = text == usual || text.find_first_not_of(L"0 ", from) == std::wstring::npos;
+    return kind == FactKind::value && !saysNothing ? from : text.size();
 }
 
 }  // namespace
 
-void FileFacts::add(std::wstring key, std::wstring text) { _facts.push_back({std::move(key), std::move(text)}); }
+FileFacts::FileFacts(const FileFact* facts, std::int32_t count) {
+    for (std::int32_t i = 0; i < count; ++i) add(facts[i].key, std::wstring(facts[i].text), facts[i].kind);
+}
 
-void FileFacts::add(std::wstring key, std::int32_t value) { add(std::move(key), numberText(value)); }
+void FileFacts::add(std::wstring key, std::wstring text, FactKind kind, std::wstring_view usual) {
+    const std::size_t ownFrom = ownPart(text, kind, usual);
+    _facts.push_back({std::move(key), std::move(text), kind, ownFrom});
+}
 
-void FileFacts::add(std::wstring key, float value) { add(std::move(key), numberText(value)); }
+void FileFacts::add(std::wstring key, std::int32_t value, FactKind kind, std::wstring_view usual) {
+    add(std::move(key), numberText(value), kind, usual);
+}
 
-void FileFacts::add(std::wstring key, std::span<const float> values) {
+void FileFacts::add(std::wstring key, float value, FactKind kind, std::wstring_view usual) {
+    add(std::move(key), numberText(value), kind, usual);
+}
+
+void FileFacts::add(std::wstring key, std::span<const float> values, std::wstring_view usual,
+                    std::size_t ofLight) {
     std::wstring text;
-    for (const float value : values) text += (text.empty() ? L"" : L" ") + numberText(value);
-    add(std::move(key), std::move(text));
+    std::size_t from = 0;
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        if (i == ofLight) from = text.size();
+        text += (text.empty() ? L"" : L" ") + numberText(values[i]);
+    }
+    const std::size_t ownFrom = ownPart(text, FactKind::value, usual, from);
+    _facts.push_back({std::move(key), std::move(text), FactKind::value, ownFrom});
+}
+
+void FileFacts::disown(std::wstring_view key) {
+    for (Fact& fact : _facts)
+        if (fact.key == key) fact.ownFrom = fact.text.size();
 }
 
 std::wstring FileFacts::decoded(std::wstring_view bytes, std::size_t limit) {
@@ -69,7 +89,7 @@ std::wstring FileFacts::decoded(std::wstring_view bytes, std::size_t limit) {
 void FileFacts::addEncoding() {
     if (_encoding)
         add(std::wstring(encodingKey),
-            *_encoding == LabelEncoding::utf8 ? L"UTF-8" : std::wstring(windows1252Name));
+            *_encoding == LabelEncoding::utf8 ? L"UTF-8" : std::wstring(windows1252Name), FactKind::ofLight);
 }
 
 std::wstring FileFacts::take(std::wstring_view& text, std::size_t limit) const {
@@ -97,16 +117,29 @@ bool FileFacts::read(std::wstring_view key, std::span<float> values) const {
 
 std::vector<std::wstring> FileFacts::textLines() const {
     std::vector<std::wstring> lines;
-    for (const auto& [key, text] : _facts) {
-        if (!isKeyword(key) && !isLabel(key)) continue;
-        const std::wstring line = labelText(text, anyLength);
+    for (const Fact& fact : _facts) {
+        if (fact.kind != FactKind::keyword && fact.kind != FactKind::label) continue;
+        const std::wstring line = labelText(fact.text, anyLength);
         const bool bare = line.find_first_not_of(L' ') == std::wstring::npos;
-        if (isKeyword(key))
-            lines.push_back(L"[" + key + (bare ? L"]" : L"] " + line));
+        if (fact.kind == FactKind::keyword)
+            lines.push_back(L"[" + fact.key + (bare ? L"]" : L"] " + line));
         else if (!bare)
             lines.push_back(line);
     }
     return lines;
+}
+
+std::vector<FileFact> FileFacts::list() const {
+    std::vector<FileFact> facts;
+    for (const auto& [key, text, kind, ownFrom] : _facts)
+        facts.push_back({kind, key.c_str(), text.c_str(), text.c_str() + ownFrom});
+    return facts;
+}
+
+void FileFacts::visit(Ov::RnEnumerator<const FileFact&>& visitor) const {
+    for (const FileFact& fact : list())
+        if (visitor.visit(fact) != Ov::RnEnum::goOn) return;
+    visitor.finish();
 }
 
 bool isBareKeyword(std::wstring_view line) { return line.starts_with(L'[') && line.find(L']') == line.size() - 1; }

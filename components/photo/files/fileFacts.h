@@ -7,27 +7,41 @@
 #include <vector>
 
 #include "components/photo/files/labelText.h"
+#include "ovphoto/photoFormat.h"
 
 // What a file says beyond its web: label lines and the numbers of its header, as pairs of a key and a text.
 
 namespace OvPhotometrics {
 
-/// Pairs in the order of their file. Keys of label lines are header keywords ("MANUFAC"), "line", "line 1",
-/// "label 1" or "title"; every other key names a number or choice of the format. "encoding" ("UTF-8" or
-/// "Windows-1252") stands behind them where a label has more than ASCII.
+using Ov::FactKind;
+using Ov::FileFact;
+using Ov::FileForm;
+
+/// Facts in the order of their file. "encoding" ("UTF-8" or "Windows-1252") stands behind them where a label has more
+/// than ASCII.
 class FileFacts {
 public:
     struct Fact {
         std::wstring key;
         std::wstring text;
+        FactKind kind;
+        std::size_t ownFrom;  // where the part of the text starts that FileFact::own is
     };
 
-    void add(std::wstring key, std::wstring text);
+    FileFacts() = default;
+    /// Those that a host gives.
+    FileFacts(const FileFact* facts, std::int32_t count);
+
+    /// Adds a line or choice. `usual` is the text of a value that says nothing; one of zeros alone never does.
+    void add(std::wstring key, std::wstring text, FactKind kind, std::wstring_view usual = {});
     /// The shortest text that reads back as the same number.
-    void add(std::wstring key, std::int32_t value);
-    void add(std::wstring key, float value);
-    /// Numbers with one blank between them.
-    void add(std::wstring key, std::span<const float> values);
+    void add(std::wstring key, std::int32_t value, FactKind kind = FactKind::value, std::wstring_view usual = {});
+    void add(std::wstring key, float value, FactKind kind = FactKind::value, std::wstring_view usual = {});
+    /// Numbers with one blank between them, the first `ofLight` of which follow from the light.
+    void add(std::wstring key, std::span<const float> values, std::wstring_view usual = {},
+             std::size_t ofLight = 0);
+    /// Makes of a value one that says nothing of its own.
+    void disown(std::wstring_view key);
 
     /// The text of a label's bytes, see `textOfLabel`; their encoding is remembered.
     std::wstring decoded(std::wstring_view bytes, std::size_t limit = std::wstring::npos);
@@ -50,6 +64,11 @@ public:
     /// The label lines as texts that any format can take: "[MANUFAC] Acme" for a keyword's, "[BLOCK]" for one
     /// without a text, else as it stands. None is empty, and control characters are blanks.
     std::vector<std::wstring> textLines() const;
+
+    /// As hosts take and give them; their texts are those of these facts.
+    std::vector<FileFact> list() const;
+    /// Visits them, until the visitor stops.
+    void visit(Ov::RnEnumerator<const FileFact&>& visitor) const;
 
     auto begin() const { return _facts.begin(); }
     auto end() const { return _facts.end(); }

@@ -10,11 +10,13 @@
 
 #include "components/photo/lid/reportMessage.h"
 #include "components/support/streamText.h"
-#include "ovphoto/numberedExports.h"
+#include "ovphoto/photoFormat.h"
 
 // Lines, free-form numbers and value lists of text formats.
 
 namespace OvPhotometrics {
+
+using Ov::FileForm;
 
 /// Reads one line through `format` ("%80[^\r\n]": up to 80 characters, the most there may be), and its end: CR LF,
 /// LF or a lone CR. A longer line goes on as the next. False at the end of the input.

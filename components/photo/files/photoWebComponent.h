@@ -3,8 +3,9 @@
 #include <span>
 
 #include "components/messageFile/messageIds.h"
-#include "components/photo/files/fileFormat.h"
+#include "components/photo/files/fileFacts.h"
 #include "components/photo/files/numberText.h"
+#include "components/photo/files/recognition.h"
 #include "components/photo/files/savedWeb.h"
 #include "components/photo/files/webDistribution.h"
 #include "components/photo/lid/gridEvaluation.h"
@@ -12,6 +13,7 @@
 #include "components/photo/lid/photoWeb.h"
 #include "components/photo/lid/reportMessage.h"
 #include "components/photo/lid/webEvaluation.h"
+#include "components/photo/lid/withinMemory.h"
 #include "components/support/castImpl.h"
 #include "components/support/devices.h"
 #include "host/componentManager/stream.h"
@@ -23,7 +25,7 @@
 //         using Web = PhotoWebIES;               // final, derived from PhotoWebOf<PhotoWebIES, IesFormat>
 //         using Record = IesFileRecord;          // the file as plain values; owns its parts
 //         static constexpr BuilderInfo info;   // class id and texts
-//         static constexpr PhotoFormatTraits traits;  // what its files are like
+//         static constexpr PhotoFormatTraits traits;  // what its files are like; the builder adds what it can do
 //         static constexpr const wchar_t* extension;
 //         static constexpr const char* source;   // what stream exceptions carry: source path, lines, stream name
 //         static constexpr int saveLine, loadLine;
@@ -32,12 +34,14 @@
 //         // These two may do without `basePath`, the folder of the file.
 //         static bool read(Record&, RnStream&, const wchar_t* basePath);
 //         static bool toWeb(const Record&, Web&, bool loaded, const wchar_t* name, const wchar_t* basePath);
+//         // The facts that a record holds beyond its web. A format may go without.
+//         static void describe(const Record&, FileFacts&);
+//         // All that follows is of formats that are written, too.
 //         static bool fromDistribution(RnIntensityDist&, Record&);
 //         static bool write(const Record&, RnStream&, FileForm);  // or without a form, where it makes no odds
-//         // For files that other programs read: a record with absolute candela, the facts that a record holds
-//         // beyond its web, and the facts and name that a record to be written takes over.
+//         // For files that other programs read: a record with absolute candela, and the facts and name that it
+//         // takes over.
 //         static bool fromDistributionFaithfully(RnIntensityDist&, Record&);
-//         static void describe(const Record&, FileFacts&);
 //         static void carry(const FileFacts&, const std::wstring& name, Record&);
 //         // Of a format whose texts can make its file look like one of another: these texts, as bytes, and how many
 //         // bytes one takes.
@@ -51,6 +55,15 @@ namespace OvPhotometrics {
 
 template <class Format>
 class PhotoWebPersistant;
+
+template <class Format>
+constexpr bool isDescribed = requires {
+    Format::describe;
+};
+template <class Format>
+constexpr bool isWritten = requires {
+    Format::write;
+};
 
 template <class Format>
 bool readRecord(typename Format::Record& record, Ov::RnStream& in, const wchar_t* basePath) {
@@ -134,13 +147,7 @@ public:
     using Ov::RnTempObject<typename Format::Web>::RnTempObject;
 
     void save(Ov::RnStream& out) override {
-        const auto distribution = makeWebDistribution(this->data());
-        const bool isFaithful = Format::traits.holdsOrientation && websAreSavedFaithfully();
-        Record record;
-        if (!(isFaithful ? takeFaithfully(*distribution, record)
-                         : Format::fromDistribution(*distribution, record)) ||
-            !writeRecord<Format>(record, out, isFaithful ? FileForm::faithful : FileForm::asSaved))
-            throw Ov::RnStreamEx::ExWriteError(Format::source, Format::saveLine, Format::streamName);
+        if (!write(out)) throw Ov::RnStreamEx::ExWriteError(Format::source, Format::saveLine, Format::streamName);
     }
 
     bool load(Ov::RnStream& in, int, const wchar_t* name, const wchar_t* basePath) override {
@@ -151,6 +158,21 @@ public:
 
 private:
     using Record = typename Format::Record;
+
+    /// False after a message.
+    bool write(Ov::RnStream& out) {
+        if constexpr (isWritten<Format>) {
+            const auto distribution = makeWebDistribution(this->data());
+            const bool isFaithful = Format::traits.holdsOrientation && websAreSavedFaithfully();
+            Record record;
+            return (isFaithful ? takeFaithfully(*distribution, record)
+                               : Format::fromDistribution(*distribution, record)) &&
+                   writeRecord<Format>(record, out, isFaithful ? FileForm::faithful : FileForm::asSaved);
+        } else {
+            reportMessage(messages::formatOnlyRead, Format::traits.name);
+            return false;
+        }
+    }
 
     /// False after a message, also where the light would not come back the same.
     bool takeFaithfully(Ov::RnWebIntensityDist& distribution, Record& record) {
@@ -165,17 +187,22 @@ private:
     }
 };
 
-/// Builds webs of a format and imports them.
+/// Builds webs of a format, imports them, and tells what the format is like.
 template <class Format>
 class PhotoWebBuilder final
-    : public InfoBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
-                                                               Ov::RnComponentBuilder, Ov::RnBuilderDescription>>,
-      public FileFormat {
+    : public InfoBuilder<typename Format::Web,
+                          Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
+                                          Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
 public:
     using Ov::RnImportBuilder::canImport;
     using Ov::RnImportBuilder::import;
 
-    Ov::PhotoFormatTraits getTraits() const override { return Format::traits; }
+    Ov::PhotoFormatTraits getTraits() const override {
+        Ov::PhotoFormatTraits traits = Format::traits;
+        traits.readsFacts = isDescribed<Format>;
+        traits.writes = isWritten<Format>;
+        return traits;
+    }
 
     RnEnum::Action enumerateExtensions(Ov::RnEnumerator<const wchar_t*>& visitor) override {
         const auto action = visitor.visit(Format::extension);
@@ -194,61 +221,76 @@ public:
         return web;
     }
 
-    bool recognises(Ov::RnBufferedIO& io) override { return Format::canImport(io); }
-
-    bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath, FileFacts& facts) override {
+    bool readFacts(Ov::RnBufferedIO& io, const wchar_t* basePath,
+                   Ov::RnEnumerator<const FileFact&>& visitor) override {
         Ov::RnStream stream(&io, Ov::RnStream::Form::text);
         Record record;
         if (!readRecord<Format>(record, stream, basePath)) return false;
-        describe(record, facts);
+        factsOf(record).visit(visitor);
         return true;
     }
 
     RnRef<Ov::RnCastable> importWithFacts(Ov::RnBufferedIO& io, const wchar_t* name, const wchar_t* basePath,
-                                          FileFacts& facts) override {
+                                          Ov::RnEnumerator<const FileFact&>& visitor) override {
         Ov::RnStream stream(&io, Ov::RnStream::Form::text);
         Record record;
         const auto web = Ov::rnCreate<typename Format::Web>();
         loadWeb<Format>(record, stream, *web, name, basePath);
-        describe(record, facts);
+        factsOf(record).visit(visitor);
         return web;
     }
 
-    bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFacts& facts) override {
-        const bool isFaithful = form == FileForm::faithful;
-        Record record;
-        if (isFaithful ? !takeFaithfully(dist, facts, record) : !Format::fromDistribution(dist, record))
+    bool write(Ov::RnIntensityDist& dist, Ov::RnStream& out, FileForm form, const FileFact* facts,
+               std::int32_t count) override {
+        if constexpr (isWritten<Format>) {
+            return withinMemory([&] {
+                const auto text =
+                    form == FileForm::faithful ? faithfulText(dist, FileFacts(facts, count)) : savedText(dist);
+                if (text) writeText(text->bytes(), out);
+                return !!text;
+            });
+        } else {
+            reportMessage(messages::formatOnlyRead, Format::traits.name);
             return false;
-        auto text = textOfRecord<Format>(record, form);
-        if (isFaithful && text && !isOwn(*text)) {
-            setTextsOff(record, facts);
-            text = textOfRecord<Format>(record, form);
         }
-        if (!text || (isFaithful && !isReadBack(*text))) return false;
-        writeText(text->bytes(), out);
-        return true;
     }
 
 private:
     using Record = typename Format::Record;
 
-    static bool takeFaithfully(Ov::RnIntensityDist& dist, const FileFacts& facts, Record& record) {
-        if (!Format::fromDistributionFaithfully(dist, record)) return false;
-        const auto web = webOf(dist);
-        Format::carry(facts, web ? web->getName() : L"", record);
-        return true;
+    static FileFacts factsOf(const Record& record) {
+        FileFacts facts;
+        if constexpr (isDescribed<Format>) Format::describe(record, facts);
+        facts.addEncoding();
+        return facts;
     }
 
-    static void describe(const Record& record, FileFacts& facts) {
-        Format::describe(record, facts);
-        facts.addEncoding();
+    // The text of a file; null after messages.
+
+    static RnRef<Ov::RnMemoryBuffer> savedText(Ov::RnIntensityDist& dist) {
+        Record record;
+        if (!Format::fromDistribution(dist, record)) return {};
+        return textOfRecord<Format>(record, FileForm::asSaved);
+    }
+
+    static RnRef<Ov::RnMemoryBuffer> faithfulText(Ov::RnIntensityDist& dist, const FileFacts& facts) {
+        Record record;
+        if (!Format::fromDistributionFaithfully(dist, record)) return {};
+        const auto web = webOf(dist);
+        Format::carry(facts, web ? web->getName() : L"", record);
+        auto text = textOfRecord<Format>(record, FileForm::faithful);
+        if (text && !isOwn(*text)) {
+            setTextsOff(record, facts);
+            text = textOfRecord<Format>(record, FileForm::faithful);
+        }
+        return text && isReadBack(*text) ? text : RnRef<Ov::RnMemoryBuffer>();
     }
 
     /// Whether an importer takes the text for a file of this format.
-    bool isOwn(Ov::RnBufferedIO& text) { return recognise(text) == this; }
+    static bool isOwn(Ov::RnBufferedIO& text) { return recognisedClass(text) == Format::info.classId; }
 
     /// Puts a blank in front of those texts that let importers take the file for one of another format, and tells.
-    void setTextsOff(Record& record, const FileFacts& facts) {
+    static void setTextsOff(Record& record, const FileFacts& facts) {
         if constexpr (requires { Format::texts(record); }) {
             const auto isWell = [&] {
                 const auto text = textOfRecord<Format>(record, FileForm::faithful);
@@ -269,7 +311,7 @@ private:
         }
     }
 
-    bool isReadBack(Ov::RnMemoryBuffer& text) { return isOwn(text) && webOfText<Format>(text); }
+    static bool isReadBack(Ov::RnMemoryBuffer& text) { return isOwn(text) && webOfText<Format>(text); }
 };
 
 }  // namespace OvPhotometrics

@@ -58,9 +58,12 @@ void describeLine(const std::wstring& bytes, bool first, FileFacts& facts) {
     const std::size_t length = keywordLength(line);
     if (length > 0) {
         const std::size_t start = line.find_first_not_of(L" \t", length + 2);
-        facts.add(line.substr(1, length), start == std::wstring::npos ? L"" : line.substr(start));
+        facts.add(line.substr(1, length), start == std::wstring::npos ? L"" : line.substr(start),
+                  FactKind::keyword);
+    } else if (first && line.starts_with(edition)) {
+        facts.add(L"format", line, FactKind::value, L"IESNA91");
     } else {
-        facts.add(first && line.starts_with(edition) ? L"format" : L"line", line);
+        facts.add(L"line", line, FactKind::label);
     }
 }
 
@@ -82,18 +85,20 @@ void iesDescribe(const IesFileRecord& rec, FileFacts& facts) {
         const bool first = i == 0;
         describeLine(wholeLine(rec.lines, i), first, facts);
     }
-    facts.add(L"lamps", rec.lampCount);
-    facts.add(L"lumensPerLamp", rec.lumensPerLamp);
-    facts.add(L"photometry", rec.lumensPerLamp < 0 ? L"absolute" : L"relative");
-    facts.add(L"multiplier", rec.candelaMultiplier);
-    facts.add(L"photometricType", typeName(rec.photometricType));
-    facts.add(L"tilt", facts.decoded(tiltText(rec), lineLimit - std::wstring_view(L"TILT=").size()));
-    facts.add(L"units", rec.unitsType == feet ? L"feet" : L"metres");
+    facts.add(L"lamps", rec.lampCount, FactKind::value, L"1");
+    facts.add(L"lumensPerLamp", rec.lumensPerLamp, FactKind::ofLight);
+    facts.add(L"photometry", rec.lumensPerLamp < 0 ? L"absolute" : L"relative", FactKind::ofLight);
+    facts.add(L"multiplier", rec.candelaMultiplier, FactKind::factor);
+    facts.add(L"photometricType", typeName(rec.photometricType), FactKind::ofLight);
+    facts.add(L"tilt", facts.decoded(tiltText(rec), lineLimit - std::wstring_view(L"TILT=").size()),
+              FactKind::value, L"NONE");
+    facts.add(L"units", rec.unitsType == feet ? L"feet" : L"metres", FactKind::value);
+    if (rec.width == 0 && rec.length == 0 && rec.height == 0) facts.disown(L"units");
     facts.add(L"width", rec.width);
     facts.add(L"length", rec.length);
     facts.add(L"height", rec.height);
-    facts.add(L"ballastFactor", rec.ballastFactor);
-    facts.add(L"ballastLampFactor", rec.ballastLampFactor);
+    facts.add(L"ballastFactor", rec.ballastFactor, FactKind::factor);
+    facts.add(L"ballastLampFactor", rec.ballastLampFactor, FactKind::factor);
     facts.add(L"watts", rec.inputWatts);
 }
 

@@ -12,8 +12,9 @@ struct IesFormat {
     using Web = PhotoWebIES;
     using Record = IesFileRecord;
     static constexpr BuilderInfo info{classIds::iesWeb, photometricWebCategory, L"IES Web",
-                                      L"IES Photometric Web"};
-    static constexpr Ov::PhotoFormatTraits traits{.holdsLampLumens = true, .holdsOrientation = true};
+                                        L"IES Photometric Web"};
+    static constexpr Ov::PhotoFormatTraits traits{
+        .name = L"IES", .preference = 200, .holdsLampLumens = true, .holdsOrientation = true};
     static constexpr const wchar_t* extension = L"ies";
     static constexpr const char* source = "components/photo/ies/ies";
     static constexpr int saveLine = 246;

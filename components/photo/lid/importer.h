@@ -3,6 +3,7 @@
 #include "components/photo/lid/lidBuilder.h"
 #include "host/componentManager/importer.h"
 #include "ovphoto/classIds.h"
+#include "ovphoto/photoFormat.h"
 
 namespace OvPhotometrics {
 
@@ -18,6 +19,9 @@ public:
 
     bool isCreatable() const override { return false; }
     const wchar_t* getImportCategory() const override { return info.category; }
+    /// Visits the builders in the order of their formats' preference, equals in that of their names, so that the first
+    /// that accepts an input is the one to take.
+    Ov::RnEnum::Action enumerateObjects(Ov::RnEnumerator<Ov::RnCPtr<Ov::RnImportBuilder>>& visitor) override;
 };
 
 }  // namespace OvPhotometrics

@@ -96,11 +96,11 @@ void carryNumber(const FileFacts& facts, const wchar_t* key, bool (*fits)(std::i
 
 void nimbDescribe(const NimbRecord& rec, FileFacts& facts) {
     for (std::size_t k = 0; k < rec.lines.size(); ++k)
-        facts.add(lineKeys[k], facts.decoded(rec.lines[k], nimbLineLength));
+        facts.add(lineKeys[k], facts.decoded(rec.lines[k], nimbLineLength), FactKind::label);
     facts.add(L"identifier", rec.identifier);
-    facts.add(L"orientationAngle", rec.orientationAngle);
-    facts.add(L"symmetryCode1", rec.symmetryCode1);
-    facts.add(L"symmetryCode2", rec.symmetryCode2);
+    facts.add(L"orientationAngle", rec.orientationAngle, FactKind::ofLight);
+    facts.add(L"symmetryCode1", rec.symmetryCode1, FactKind::ofLight);
+    facts.add(L"symmetryCode2", rec.symmetryCode2, FactKind::ofLight);
     facts.add(L"spare1", rec.spare1);
     facts.add(L"spare2", rec.spare2);
     facts.add(L"spare3", rec.spare3);

@@ -12,8 +12,9 @@ struct NimbFormat {
     using Web = PhotoWebNIMB;
     using Record = NimbRecord;
     static constexpr BuilderInfo info{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
-                                      L"NIMB Photometric Web"};
-    static constexpr Ov::PhotoFormatTraits traits{};
+                                        L"NIMB Photometric Web"};
+    static constexpr Ov::PhotoFormatTraits traits{
+        .name = L"NIMB", .preference = 300, .grids = Ov::PhotoGrids::even, .namesLines = true};
     static constexpr const wchar_t* extension = L"nmb";
     static constexpr const char* source = "components/photo/nimb/nimb";
     static constexpr int saveLine = 237;

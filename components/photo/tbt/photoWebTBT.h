@@ -12,8 +12,13 @@ struct TbtFormat {
     using Web = PhotoWebTBT;
     using Record = TbtFileRecord;
     static constexpr BuilderInfo info{classIds::tbtWeb, photometricWebCategory, L"TBT Web",
-                                      L"TBT Photometric Web"};
-    static constexpr Ov::PhotoFormatTraits traits{Ov::PhotoValueUnit::candelaPerKilolumen, true};
+                                        L"TBT Photometric Web"};
+    static constexpr Ov::PhotoFormatTraits traits{.name = L"TBT",
+                                                  .preference = 900,
+                                                  .unit = Ov::PhotoValueUnit::candelaPerKilolumen,
+                                                  .grids = Ov::PhotoGrids::even,
+                                                  .holdsLampLumens = true,
+                                                  .namesLines = true};
     static constexpr const wchar_t* extension = L"tbt";
     static constexpr const char* source = "components/photo/tbt/tbt";
     static constexpr int saveLine = 230;

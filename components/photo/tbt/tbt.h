@@ -9,7 +9,7 @@
 #include "components/photo/lid/photoWeb.h"
 #include "host/componentManager/stream.h"
 #include "ovphoto/intensityDist.h"
-#include "ovphoto/numberedExports.h"
+#include "ovphoto/photoFormat.h"
 
 // TBT: photometric webs of the QRT kind.
 //

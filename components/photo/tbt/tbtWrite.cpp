@@ -79,15 +79,19 @@ void carryUnit(const FileFacts& facts, TbtFileRecord& rec) {
     tbtSetFlux(rec, flux, reference);
 }
 
-/// Carries a multiplier that says more than the quotient of the two fluxes, which a record to be written has.
+/// Whether a multiplier says more than the quotient of the two fluxes, which a record to be written has.
+bool isOwnMultiplier(float multiplier, float flux, float referenceFlux) {
+    constexpr double rounding = 0.005;  // of a flux with two decimals
+    const double said = double{multiplier} * referenceFlux;
+    return std::fabs(said - flux) > rounding + 1e-6 * flux;
+}
+
 void carryMultiplier(const FileFacts& facts, TbtFileRecord& rec) {
     float flux = 0, reference = 0, multiplier = 0;
     if (!facts.read(L"flux", flux) || !facts.read(L"referenceFlux", reference) ||
         !facts.read(L"multiplier", multiplier) || !isReadable(multiplier))
         return;
-    constexpr double rounding = 0.005;  // of a flux with two decimals
-    const double said = double{multiplier} * reference;
-    if (std::fabs(said - flux) > rounding + 1e-6 * flux) rec.multiplier = multiplier;
+    if (isOwnMultiplier(multiplier, flux, reference)) rec.multiplier = multiplier;
 }
 
 void carryValue(const FileFacts& facts, const wchar_t* key, float& value) {
@@ -110,19 +114,20 @@ bool tbtWrite(const TbtFileRecord& rec, Ov::RnStream& out, FileForm form) {
 }
 
 void tbtDescribe(const TbtFileRecord& rec, FileFacts& facts) {
-    facts.add(L"title", facts.decoded(rec.title, tbtTitleLength));
-    facts.add(L"kindCode", rec.kindCode);
+    facts.add(L"title", facts.decoded(rec.title, tbtTitleLength), FactKind::label);
+    facts.add(L"kindCode", rec.kindCode, FactKind::value, L"3");
     const int values = tbtKindValues(rec.kindCode);
     if (values >= 1) facts.add(L"kindValue1", rec.kindValue1);
     if (values == 2) facts.add(L"kindValue2", rec.kindValue2);
-    facts.add(L"unitTriple", rec.unitTriple);
-    facts.add(L"flux", rec.flux);
-    facts.add(L"referenceFlux", rec.referenceFlux);
-    facts.add(L"multiplier", rec.multiplier);
-    facts.add(L"auxValue1", rec.auxValue1);
-    facts.add(L"auxValue2", rec.auxValue2);
+    facts.add(L"unitTriple", rec.unitTriple, L"1 1 1");
+    facts.add(L"flux", rec.flux, FactKind::ofLight);
+    facts.add(L"referenceFlux", rec.referenceFlux, FactKind::ofLight);
+    const bool isOwn = isOwnMultiplier(rec.multiplier, rec.flux, rec.referenceFlux);
+    facts.add(L"multiplier", rec.multiplier, isOwn ? FactKind::value : FactKind::ofLight);
+    facts.add(L"auxValue1", rec.auxValue1, FactKind::value, L"1");
+    facts.add(L"auxValue2", rec.auxValue2, FactKind::value, L"5");
     facts.add(L"auxValue3", rec.auxValue3);
-    facts.add(L"symmetryCode", rec.symmetryCode);
+    facts.add(L"symmetryCode", rec.symmetryCode, FactKind::ofLight);
 }
 
 void tbtCarry(const FileFacts& facts, const std::wstring& name, TbtFileRecord& rec) {

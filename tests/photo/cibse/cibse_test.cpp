@@ -145,7 +145,8 @@ TEST_F(Cibse, LabelsAreLinesOrPiecesOfThem) {
         read("CIBSE/1\r\na\r\n\r\n" + std::string(70, 'x') + "\n\n\n\n1 1 0 0 0 1 0 0 0 2 1 0 90 0 1 1 0 0 0 0"));
     EXPECT_EQ(rec.labels, (Labels{L"a", L"", std::wstring(60, L'x'), std::wstring(10, L'x')}));
     FileFacts other;
-    for (int i = 0; i < 9; ++i) other.add(i == 0 ? L"MANUFAC" : L"line", std::to_wstring(i));
+    other.add(L"MANUFAC", L"0", FactKind::keyword);
+    for (int i = 1; i < 9; ++i) other.add(L"line", std::to_wstring(i), FactKind::label);
     CibseRecord named, unnamed;
     cibseCarry(other, L"name", named);
     EXPECT_EQ(named.labels, (Labels{L"name", L"[MANUFAC] 0", L"1", L"2", L"3", L"4", L"5"}));

@@ -22,14 +22,16 @@ protected:
     std::string written(Ov::RnIntensityDist& dist, const FileFacts& facts = {}) {
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-        const bool well = immortal<PhotoWebBuilder<Format>>().write(dist, stream, FileForm::faithful, facts);
+        const bool well = writeFaithfully(immortal<PhotoWebBuilder<Format>>(), dist, stream, facts);
         EXPECT_EQ(well, !io->bytes().empty());
         return io->bytes();
     }
 
-    static FileFacts describe(FileFormat& format, const std::string& text) {
+    static FileFacts describe(Ov::RnPhotoFormat& format, const std::string& text) {
         FileFacts facts;
-        EXPECT_TRUE(format.readFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), nullptr, facts)) << text;
+        auto visitor = Ov::rnVisitor<const FileFact&>(
+            [&](const FileFact& fact) { facts.add(fact.key, std::wstring(fact.text), fact.kind); });
+        EXPECT_TRUE(format.readFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), nullptr, visitor)) << text;
         return facts;
     }
 
@@ -305,7 +307,7 @@ TEST_F(Faithful, NothingIsWrittenThatItsReaderRefuses) {
     facts.add(L"leadInteger", -4);
     facts.add(L"kindCode", 9);
     facts.add(L"identifier", 123456789);
-    facts.add(L"title", L" /* no title\n7");
+    facts.add(L"title", L" /* no title\n7", FactKind::label);
     light->setPeakIntensity(80);
     EXPECT_TRUE(import <CibseFormat>(written<CibseFormat>(*light, facts)));
     EXPECT_TRUE(import <NimbFormat>(written<NimbFormat>(*light, facts)));
@@ -343,8 +345,8 @@ TEST_F(Faithful, LabelsAndNumbersTravelWithTheLight) {
     EXPECT_EQ(*nimb.find(L"line 3"), L"lantern");
     EXPECT_TRUE(written<TbtFormat>(*dist, facts).starts_with("lantern\n3\n"));
     FileFacts other;  // what fills its line is not continued, and every control character is a blank
-    other.add(L"LAMP", std::wstring(73, L'y'));
-    other.add(L"line", L"a\x1f\x20\x21\x7fz");
+    other.add(L"LAMP", std::wstring(73, L'y'), FactKind::keyword);
+    other.add(L"line", L"a\x1f\x20\x21\x7fz", FactKind::label);
     EXPECT_NE(written<IesFormat>(*dist, other).find("y\n[OTHER] a  ! z\n[LUMINAIRE]"), std::string::npos);
     // And back: the keywords are known again.
     EXPECT_NE(written<IesFormat>(*dist, cibse).find("\n[MANUFAC] Alder\n"), std::string::npos);
@@ -376,7 +378,7 @@ TEST_F(Faithful, LabelsKeepTheirTextAndTheirBytes) {
         const FileFacts facts = describe(immortal<IESBuilder>(), source.text());
         ASSERT_EQ(*facts.find(L"LUMINAIRE"), c.text);
         ASSERT_EQ(c.encoding.empty() ? L"" : *facts.find(L"encoding"), c.encoding);
-        const auto keeps = [&](FileFormat& format, const std::string& file, const wchar_t* key,
+        const auto keeps = [&](Ov::RnPhotoFormat& format, const std::string& file, const wchar_t* key,
                                std::size_t limit) {
             const FileFacts again = describe(format, file);
             const std::wstring* text = again.find(key);
@@ -393,8 +395,8 @@ TEST_F(Faithful, LabelsKeepTheirTextAndTheirBytes) {
     }
     // What only looks like UTF-8 in Windows-1252 is written as UTF-8; a character that the reader cut is left out.
     FileFacts facts;
-    facts.add(L"title", L"\u00c3\u00bc");
-    facts.add(L"encoding", windows);
+    facts.add(L"title", L"\u00c3\u00bc", FactKind::label);
+    facts.add(L"encoding", windows, FactKind::ofLight);
     const auto light = Ov::rnCreate<Isotropic>();
     light->setPeakIntensity(80);
     EXPECT_TRUE(written<TbtFormat>(*light, facts).starts_with("\xc3\x83\xc2\xbc\n"));
@@ -413,10 +415,10 @@ TEST_F(Faithful, NoTextMakesAFileLookLikeOneOfAnotherFormat) {
          {std::wstring(L"IESNA91"), std::wstring(L"CIBSE/1"), std::wstring(L"TILT=NONE"), column}) {
         FileFacts facts;
         for (const wchar_t* key : {L"title", L"label 1", L"label 2", L"line 1", L"line 3", L"TEST"})
-            facts.add(key, text);
-        facts.add(L"line 2", fine);
+            facts.add(key, text, key == std::wstring(L"TEST") ? FactKind::keyword : FactKind::label);
+        facts.add(L"line 2", fine, FactKind::label);
         const auto takenFor = [](const std::string& file) {
-            return recognise(*Ov::rnCreate<Ov::RnMemoryBuffer>(file));
+            return builderTable().find(recognisedClass(*Ov::rnCreate<Ov::RnMemoryBuffer>(file)));
         };
         const std::string narrow(text.begin(), text.end());
         const auto told = [&](int times) {

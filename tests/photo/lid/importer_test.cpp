@@ -21,7 +21,7 @@ protected:
         lamp->setFlux(1000);
         const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
         Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-        ASSERT_TRUE(immortal<PhotoWebBuilder<Format>>().write(*lamp, stream, FileForm::asSaved, {}));
+        ASSERT_TRUE(immortal<PhotoWebBuilder<Format>>().write(*lamp, stream, FileForm::asSaved, nullptr, 0));
         const std::wstring path = folder.write("lamp.any", io->bytes());
         io->seek(0, 0);
         bool recognised = false;

@@ -178,8 +178,8 @@ TEST_F(Nimb, CarriesWhatFilesSay) {
     EXPECT_EQ(carried, rec);
 
     FileFacts other;
-    other.add(L"MANUFAC", L"Maker");
-    other.add(L"LUMCAT", L"L\n1");
+    other.add(L"MANUFAC", L"Maker", FactKind::keyword);
+    other.add(L"LUMCAT", L"L\n1", FactKind::keyword);
     other.add(L"identifier", 100000000);
     carried.lines = {L"1", L"2", L"3", L"4"};
     nimbCarry(other, std::wstring(80, L'n'), carried);

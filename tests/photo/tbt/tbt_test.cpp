@@ -192,10 +192,10 @@ TEST_F(Tbt, FactsAreCarriedWhereTheReaderAcceptsThem) {
 
     const auto title = [](const wchar_t* key, const wchar_t* text, const wchar_t* name) {
         FileFacts facts;
-        facts.add(L"MANUFAC", L"Acme");
-        facts.add(key, text);
-        facts.add(L"auxValue1", L"-1");
-        facts.add(L"unitTriple", L"1 1 1.01");
+        facts.add(L"MANUFAC", L"Acme", FactKind::keyword);
+        facts.add(key, text, FactKind::keyword);
+        facts.add(L"auxValue1", -1);
+        facts.add(L"unitTriple", std::array{1.0f, 1.0f, 1.01f});
         TbtFileRecord record;
         tbtCarry(facts, name, record);
         EXPECT_EQ(record.auxValue1 + record.unitTriple[2], 2);

@@ -41,7 +41,7 @@ void printTexts(const char* label, const std::vector<std::string>& texts) {
 
 void printText(const ReadResult& result, const std::vector<std::string>& warnings) {
     std::string format = result.format.empty() ? "-" : result.format;
-    format.resize(5, ' ');
+    format.resize(std::max<std::size_t>(format.size(), 5), ' ');
     const char* verdict = !result.web ? "refused  " : warnings.empty() ? "ok       " : "warning  ";
     say(verdict + format + "  " + result.file);
     printTexts("", result.told());
@@ -69,7 +69,7 @@ ReadResult readFound(const FoundFile& file, const CheckOptions& options, const H
 void checkFile(const FoundFile& file, const CheckOptions& options, const HostSession& session, CheckTotals& totals,
                const Progress& progress) {
     const ReadResult result = readFound(file, options, session);
-    const bool foreign = file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
+    const bool foreign = file.fromFolder && result.format.empty() && !session.formats().ofExtension(file.path);
     if (foreign) {
         ++totals.skipped;
         return;
@@ -104,7 +104,10 @@ Action declareCheck(CLI::App& app) {
         ->required();
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
-    return [options](const HostSession& session) { return runCheck(*options, session); };
+    return [options](const HostSession& session) {
+        options->as = sourceFormat(session, options->as);
+        return runCheck(*options, session);
+    };
 }
 
 }  // namespace OvTool

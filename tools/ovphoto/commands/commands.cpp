@@ -31,35 +31,43 @@ std::span<const Command> commands() { return allCommands; }
 
 void addJsonFlag(CLI::App& app, bool& json) { app.add_flag("--json", json, "Print JSON, one object a line"); }
 
+void addAsOption(CLI::App& app, std::string& as) {
+    app.add_option("--as", as, "Read as this format, such as ies, whatever the content looks like")
+        ->type_name("FORMAT");
+}
+
+CLI::Option* addToOption(CLI::App& app, std::string& to) {
+    return app
+        .add_option("--to", to, "Write as this format, such as ies; without it the output's extension says which")
+        ->type_name("FORMAT");
+}
+
 namespace {
 
-CLI::Validator formatNames() {
-    return CLI::IsMember({"IES", "CIBSE", "NIMB", "TBT"}, CLI::ignore_case).description("");
+const Format& namedBy(const char* option, const std::string& name, const Formats& formats) {
+    if (const Format* format = formats.named(name)) return *format;
+    throw CLI::ValidationError(option, name + " not in {" + formats.list(&Format::name) + "}");
+}
+
+/// ".ies, .cib or .tbt".
+std::string extensions(const Formats& formats) {
+    std::string list = "." + formats.list(&Format::extension);
+    for (std::size_t comma = list.rfind(','), last = comma; comma != list.npos; comma = list.rfind(',', comma - 1))
+        list.replace(comma, 1, comma == last ? " or ." : ", .");
+    return list;
 }
 
 }  // namespace
 
-void addAsOption(CLI::App& app, std::string& as) {
-    app.add_option("--as", as, "Read as ies, cibse, nimb or tbt, whatever the content looks like")
-        ->type_name("FORMAT")
-        ->transform(formatNames());
+std::string sourceFormat(const HostSession& session, const std::string& as) {
+    return as.empty() ? as : namedBy("--as", as, session.formats()).name;
 }
 
-CLI::Option* addToOption(CLI::App& app, const TargetFormat*& target) {
-    const auto take = [&target](const std::string& name) { target = targetNamed(name); };
-    return app
-        .add_option_function<std::string>(
-            "--to", take,
-            "Write as ies, cibse, nimb or tbt; without it the output's extension says "
-            "which (ies, cib, nmb, tbt)")
-        ->type_name("FORMAT")
-        ->transform(formatNames());
-}
-
-const TargetFormat* targetForOutput(const std::string& out) {
-    if (const TargetFormat* target = targetOf(out)) return target;
-    throw CLI::ValidationError("OUT",
-                               "'" + out + "' does not end in .ies, .cib, .nmb or .tbt; --to names the format");
+const Format& targetFormat(const HostSession& session, const std::string& to, const std::string& out) {
+    if (!to.empty()) return namedBy("--to", to, session.formats());
+    if (const Format* format = session.formats().ofExtension(out)) return *format;
+    throw CLI::ValidationError(
+        "OUT", "'" + out + "' does not end in " + extensions(session.formats()) + "; --to names the format");
 }
 
 void showReasons(const std::string& file, const std::vector<std::string>& reasons) {

@@ -5,7 +5,6 @@
 #include <string>
 
 #include "tools/ovphoto/hostSession.h"
-#include "tools/ovphoto/targetFormat.h"
 
 namespace CLI {
 class App;
@@ -49,14 +48,17 @@ Action declareSettings(CLI::App& app);
 Action declareZones(CLI::App& app);
 Action declareMonths(CLI::App& app);
 
-/// Options that several commands have: --json, and --as FORMAT (kept in capitals: "IES").
+/// @{
+/// Options that several commands have: --json, --as FORMAT, --to FORMAT. Formats are those of the loaded modules.
 void addJsonFlag(CLI::App& app, bool& json);
 void addAsOption(CLI::App& app, std::string& as);
+CLI::Option* addToOption(CLI::App& app, std::string& to);
+/// @}
 
-/// The option --to FORMAT.
-CLI::Option* addToOption(CLI::App& app, const TargetFormat*& target);
-/// The format that a file's extension asks for; wrong usage where it asks for none.
-const TargetFormat* targetForOutput(const std::string& out);
+/// What --as names, in the letters of the format's name; wrong usage where it names none. Empty where it is not given.
+std::string sourceFormat(const HostSession& session, const std::string& as);
+/// What --to names or, where it is not given, the extension of a file; wrong usage where that is none.
+const Format& targetFormat(const HostSession& session, const std::string& to, const std::string& out);
 
 /// Shows on standard error, as `FILE: text`, what was reported while the file was read and why it was refused.
 void showReasons(const std::string& file, const std::vector<std::string>& reasons);

@@ -41,7 +41,6 @@ void checkArguments(ConvertOptions& options) {
     if (options.paths.size() != 2) throw CLI::ValidationError("IN OUT", "two files are wanted, or --into FOLDER");
     if (options.json && isStandardStream(options.paths[1]))
         throw CLI::ValidationError("--json", "standard output takes the file");
-    if (!options.target) options.target = targetForOutput(options.paths[1]);
 }
 
 }  // namespace
@@ -53,7 +52,7 @@ Action declareConvert(CLI::App& app) {
                    "--into, any number of files, or folders "
                    "to search for them")
         ->required();
-    CLI::Option* to = addToOption(app, options->target);
+    CLI::Option* to = addToOption(app, options->to);
     CLI::Option* into = app.add_option("--into", options->folder,
                                        "Write into this folder, under the names of the files with the format's "
                                        "extension; no file is written twice or over one that is read")
@@ -71,6 +70,8 @@ Action declareConvert(CLI::App& app) {
     addJsonFlag(app, options->json);
     app.callback([options] { checkArguments(*options); });
     return [options](const HostSession& session) {
+        options->as = sourceFormat(session, options->as);
+        options->target = &targetFormat(session, options->to, options->paths.back());
         return options->folder.empty() ? convertOne(*options, session) : convertIntoFolder(*options, session);
     };
 }

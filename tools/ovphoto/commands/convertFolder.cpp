@@ -49,10 +49,10 @@ fs::path placeOf(const std::string& path) {
 
 /// Whether a file that was found in a folder is none of ours.
 bool isForeign(const FoundFile& file, const ConvertOptions& options, const HostSession& session) {
-    if (!file.fromFolder || !options.as.empty() || hasPhotometricExtension(file.path)) return false;
+    if (!file.fromFolder || !options.as.empty() || session.formats().ofExtension(file.path)) return false;
     std::string error;
     const auto io = openFile(file.path, error);
-    return !io || session.webImportersFor(*io).empty();
+    return !io || !session.formats().recognise(*io);
 }
 
 /// Gives every file its output, and none to two.

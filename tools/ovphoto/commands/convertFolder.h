@@ -4,7 +4,6 @@
 #include <vector>
 
 #include "tools/ovphoto/hostSession.h"
-#include "tools/ovphoto/targetFormat.h"
 
 namespace OvTool {
 
@@ -12,7 +11,8 @@ struct ConvertOptions {
     std::vector<std::string> paths;  // the input and the output where there is no folder
     std::string folder;
     std::string as;
-    const TargetFormat* target = nullptr;
+    std::string to;
+    const Format* target = nullptr;  // as the session knows what `to` names
     std::size_t jobs = 1;
     bool asSaved = false;
     bool json = false;

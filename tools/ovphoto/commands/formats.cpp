@@ -33,7 +33,8 @@ int listBuilders(const FormatsOptions& options, const HostSession& session) {
         const std::string category = toUtf8(builder->getCategory());
         const std::string description = toUtf8(builder->getDescription());
         const std::string id = uidText(builder->getClassId());
-        const std::string extension = extensionOf(*builder);
+        const Format* const format = session.formats().ofClass(builder->getClassId());
+        const std::string extension = format ? format->extension : "";
         if (options.json) {
             printLine(Json{{"name", name},
                            {"category", category},
@@ -69,11 +70,9 @@ int detect(const FormatsOptions& options, const HostSession& session) {
         return exitFailed;
     }
     Json canImport = Json::object();
-    for (const auto& builder : session.webImporters()) {
-        canImport[formatName(*builder)] = rnCast<RnImportBuilder>(builder.get())->canImport(io.get());
-    }
-    const auto accepting = session.webImportersFor(*io);
-    const std::string taken = accepting.empty() ? std::string() : formatName(*accepting.front());
+    for (const Format& format : session.formats()) canImport[format.name] = format.builder->canImport(io.get());
+    const Format* const format = session.formats().recognise(*io);
+    const std::string taken = format ? format->name : "";
     if (options.json) {
         printLine(Json{
             {"file", options.detect}, {"format", taken.empty() ? Json() : Json(taken)}, {"canImport", canImport}});

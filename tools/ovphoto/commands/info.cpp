@@ -59,7 +59,7 @@ void printJson(const ReadResult& result, bool withValues) {
                 {"psiTruncated", web.isPsiTruncated()},
                 {"files", filesOf(web)},
                 {"unit", "cd"},
-                {"fileUnit", unitName(result.traits.unit)},
+                {"fileUnit", unitName(result.reader->traits.unit)},
                 {"facts", factsToJson(result.facts)}};
     if (withValues) object["values"] = valuesOf(web);
     printLine(object);
@@ -124,7 +124,10 @@ Action declareInfo(CLI::App& app) {
     addJsonFlag(app, options->json);
     app.add_flag("--values", options->values, "Print the relative values too, a row for each psi (JSON only)")
         ->needs("--json");
-    return [options](const HostSession& session) { return runInfo(*options, session); };
+    return [options](const HostSession& session) {
+        options->as = sourceFormat(session, options->as);
+        return runInfo(*options, session);
+    };
 }
 
 }  // namespace OvTool

@@ -176,7 +176,10 @@ Action declareIntensity(CLI::App& app) {
     });
     addAsOption(app, options->as);
     addJsonFlag(app, options->json);
-    return [options](const HostSession& session) { return runIntensity(*options, session); };
+    return [options](const HostSession& session) {
+        options->as = sourceFormat(session, options->as);
+        return runIntensity(*options, session);
+    };
 }
 
 }  // namespace OvTool

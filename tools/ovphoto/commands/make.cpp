@@ -28,7 +28,7 @@ constexpr float usualFlux = 1000;  // lumens
 struct MakeOptions {
     std::string kind;
     std::string out;
-    const TargetFormat* target = nullptr;
+    std::string to;
     std::optional<float> candela;
     std::optional<float> flux;
     std::optional<float> hotspot;
@@ -56,9 +56,8 @@ RnRef<RnIntensityDist> makeLight(const MakeOptions& options, const HostSession& 
 
 /// Writes the light; none, with the reasons, when there is no file then.
 std::optional<LightFile> writeLight(RnIntensityDist& light, const MakeOptions& options, const HostSession& session,
-                                    std::vector<std::string>& reasons) {
-    auto made =
-        makeFile(session, options.out, *options.target, light, OvPhotometrics::FileForm::faithful, {}, reasons);
+                                    const Format& target, std::vector<std::string>& reasons) {
+    auto made = makeFile(session, options.out, target, light, FileForm::faithful, {}, reasons);
     if (!made) return {};
     const std::string error = made->light ? writeFile(options.out, made->bytes) : made->refusal;
     if (error.empty()) return made;
@@ -67,15 +66,16 @@ std::optional<LightFile> writeLight(RnIntensityDist& light, const MakeOptions& o
 }
 
 int runMake(const MakeOptions& options, const HostSession& session) {
+    const Format& target = targetFormat(session, options.to, options.out);
     const auto light = makeLight(options, session);
     std::vector<std::string> reasons;
-    const auto made = writeLight(*light, options, session, reasons);
+    const auto made = writeLight(*light, options, session, target, reasons);
     showReasons(options.out, reasons);
     if (!made) return exitFailed;
     sayOf(options.out, options.out + ": " + options.kind + ", " + shortNumber(light->getPeakIntensity()) +
                            " cd, " + shortNumber(light->getFlux()) + " lm");
     const ConversionLoss loss = measureLoss(*light, *made->light);
-    for (const std::string& warning : lossWarnings(loss, *options.target, *light, *made))
+    for (const std::string& warning : lossWarnings(loss, target, *light, *made))
         complain(options.out + ": warning: " + warning);
     return exitWell;
 }
@@ -124,7 +124,6 @@ void checkArguments(MakeOptions& options) {
     if (hotspot > falloff)
         throw CLI::ValidationError(
             "--hotspot", shortNumber(hotspot) + " degrees are more than the falloff's " + shortNumber(falloff));
-    if (!options.target) options.target = targetForOutput(options.out);
 }
 
 }  // namespace
@@ -135,7 +134,7 @@ Action declareMake(CLI::App& app) {
         ->required()
         ->check(CLI::IsMember({"isotropic", "diffuse", "spotlight"}).description(""));
     app.add_option("OUT", options->out, "File to write")->required();
-    addToOption(app, options->target);
+    addToOption(app, options->to);
     addStrength(app, *options);
     addSpotlight(app, *options);
     app.callback([options] { checkArguments(*options); });

@@ -128,7 +128,10 @@ Action declarePlot(CLI::App& app) {
     addAsOption(app, options.as);
     addLightOptions(app, options.light);
     app.final_callback([shared] { checkArguments(*shared); });
-    return [shared](const HostSession& session) { return runPlot(*shared, session); };
+    return [shared](const HostSession& session) {
+        shared->as = sourceFormat(session, shared->as);
+        return runPlot(*shared, session);
+    };
 }
 
 }  // namespace OvTool

@@ -16,7 +16,10 @@ Action declareReport(CLI::App& app) {
         ->required()
         ->type_name("OUT");
     addAsOption(app, options->as);
-    return [options](const HostSession& session) { return runReport(*options, session); };
+    return [options](const HostSession& session) {
+        options->as = sourceFormat(session, options->as);
+        return runReport(*options, session);
+    };
 }
 
 }  // namespace OvTool

@@ -225,8 +225,8 @@ private:
 };
 
 /// Whether a file that was found in a folder is none of ours.
-bool isForeign(const FoundFile& file, const ReadResult& result) {
-    return file.fromFolder && result.format.empty() && !hasPhotometricExtension(file.path);
+bool isForeign(const FoundFile& file, const ReadResult& result, const HostSession& session) {
+    return file.fromFolder && result.format.empty() && !session.formats().ofExtension(file.path);
 }
 
 int reportMany(const ReportOptions& options, const HostSession& session) {
@@ -243,7 +243,7 @@ int reportMany(const ReportOptions& options, const HostSession& session) {
             result.file = file.path;
             result.error = file.error;
             if (file.error.empty()) result = session.read(file.path, options.as);
-            if (!isForeign(file, result)) maker.add(std::move(result), session);
+            if (!isForeign(file, result, session)) maker.add(std::move(result), session);
             if (!maker.error().empty()) break;
         }
         maker.finish();

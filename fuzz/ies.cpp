@@ -1,3 +1,0 @@
-#include "fuzz/web.h"
-
-void OvPhotometrics::fuzz::tryInput(std::string_view bytes) { tryFile<IesFormat>(bytes); }
