@@ -10,7 +10,7 @@ struct CibseFormat {
     using Web = PhotoWebCIBSE;
     using Record = CibseRecord;
     static constexpr BuilderInfo info{classIds::cibseWeb, photometricWebCategory, L"CIBSE Web",
-                                        L"CIBSE Photometric Web"};
+                                      L"CIBSE Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{.name = L"CIBSE", .preference = 100, .holdsOrientation = true};
     static constexpr const wchar_t* extension = L"cib";
     static constexpr const char* source = "components/photo/cibse/cibse";

@@ -190,9 +190,8 @@ private:
 /// Builds webs of a format, imports them, and tells what the format is like.
 template <class Format>
 class PhotoWebBuilder final
-    : public InfoBuilder<typename Format::Web,
-                          Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
-                                          Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
+    : public InfoBuilder<typename Format::Web, Ov::RnCastImpl2<LidBuilder, Ov::RnPhotoFormat, Ov::RnImportBuilder,
+                                                               Ov::RnComponentBuilder, Ov::RnBuilderDescription>> {
 public:
     using Ov::RnImportBuilder::canImport;
     using Ov::RnImportBuilder::import;

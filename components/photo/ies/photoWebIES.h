@@ -12,7 +12,7 @@ struct IesFormat {
     using Web = PhotoWebIES;
     using Record = IesFileRecord;
     static constexpr BuilderInfo info{classIds::iesWeb, photometricWebCategory, L"IES Web",
-                                        L"IES Photometric Web"};
+                                      L"IES Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{
         .name = L"IES", .preference = 200, .holdsLampLumens = true, .holdsOrientation = true};
     static constexpr const wchar_t* extension = L"ies";

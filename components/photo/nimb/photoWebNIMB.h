@@ -12,7 +12,7 @@ struct NimbFormat {
     using Web = PhotoWebNIMB;
     using Record = NimbRecord;
     static constexpr BuilderInfo info{classIds::nimbWeb, photometricWebCategory, L"NIMB Web",
-                                        L"NIMB Photometric Web"};
+                                      L"NIMB Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{
         .name = L"NIMB", .preference = 300, .grids = Ov::PhotoGrids::even, .namesLines = true};
     static constexpr const wchar_t* extension = L"nmb";

@@ -12,7 +12,7 @@ struct TbtFormat {
     using Web = PhotoWebTBT;
     using Record = TbtFileRecord;
     static constexpr BuilderInfo info{classIds::tbtWeb, photometricWebCategory, L"TBT Web",
-                                        L"TBT Photometric Web"};
+                                      L"TBT Photometric Web"};
     static constexpr Ov::PhotoFormatTraits traits{.name = L"TBT",
                                                   .preference = 900,
                                                   .unit = Ov::PhotoValueUnit::candelaPerKilolumen,
