@@ -34,6 +34,9 @@ inline constexpr std::size_t cibseLabelLimit = 60;
 /// Planes through the vertical axis, or through a horizontal one.
 enum class CibsePhotometricType : std::int32_t { type1 = 1, type2 = 2 };
 
+/// What a file starts with.
+inline constexpr const wchar_t* cibseSignature = L"CIBSE/1";
+
 /// A file as it was read, or as it is to be written. What has no comment is kept and written back, no more.
 struct CibseRecord {
     std::array<std::wstring, 7> labels;  // lines 2 to 8; an empty line has none

@@ -54,6 +54,15 @@ struct NimbRecord {
     bool operator==(const NimbRecord&) const = default;
 };
 
+/// @{
+/// The largest numbers that the header's fields hold, and whether they hold one.
+inline constexpr int nimbLargestField = 9999;
+inline constexpr int nimbLargestIdentifier = 99999999;
+
+inline bool nimbFitsField(std::int32_t number) { return number >= -999 && number <= nimbLargestField; }
+inline bool nimbFitsIdentifier(std::int32_t number) { return number >= -999 && number <= nimbLargestIdentifier; }
+/// @}
+
 /// Whether the input looks like a NIMB file: it has 72 bytes, and "NIMB" in its place. The position is kept.
 bool nimbCanRead(Ov::RnBufferedIO& io);
 
