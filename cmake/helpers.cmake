@@ -4,6 +4,14 @@ function(ovphoto_add_format folder)
   set_property(GLOBAL APPEND PROPERTY OVPHOTO_FORMATS ${folder})
 endfunction()
 
+# ovphoto_add_module(<name> <source>...): a loadable module around the core, with the entry that every module has. One
+# of its sources, or a library that it links, says which builders it has (components/module/registration.h).
+function(ovphoto_add_module name)
+  set(entry ${PROJECT_SOURCE_DIR}/components/module/moduleEntry)
+  add_library(${name} MODULE ${entry}.cpp ${entry}_${OVPHOTO_PLATFORM}.cpp ${ARGN})
+  target_link_libraries(${name} PRIVATE ovphoto_core)
+endfunction()
+
 # ovphoto_add_test_program(<source without .cpp> [<more sources>]): a program of tests over the core, below tests/.
 function(ovphoto_add_test_program source)
   string(REPLACE "/" "_" name ${source})
