@@ -4,6 +4,7 @@
 #include <cmath>
 #include <iostream>
 
+#include "components/support/path.h"
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
 #include "tools/ovphoto/lightFile.h"
@@ -17,10 +18,6 @@ namespace OvTool {
 using namespace Ov;
 
 namespace {
-
-void append(Json& array, const std::vector<std::string>& texts) {
-    for (const std::string& text : texts) array.push_back(text);
-}
 
 /// What a file was read from: itself, and its tilt file.
 InputFiles inputsOf(const ReadResult& source) {
@@ -39,79 +36,84 @@ std::optional<LightFile> writeAnew(const Conversion& conversion, const HostSessi
     return makeFile(session, conversion.out, *conversion.target, *asRead, FileForm::asSaved, {}, messages);
 }
 
-void reportLoss(Json& report, const Conversion& conversion, RnWebIntensityDist& light, const LightFile& made) {
+void append(std::vector<std::string>& all, std::vector<std::string> texts) {
+    all.insert(all.end(), std::move_iterator(texts.begin()), std::move_iterator(texts.end()));
+}
+
+void reportLoss(ConversionReport& report, const Conversion& conversion, RnWebIntensityDist& light,
+                const LightFile& made) {
     const ConversionLoss loss = measureLoss(light, *made.light);
-    report["maxCandelaDifference"] = static_cast<float>(loss.candela);
-    report["maxCandelaDifferencePercent"] = static_cast<float>(loss.candelaPercent);
-    report["fluxDifferencePercent"] = static_cast<float>(loss.fluxPercent);
-    append(report["warnings"], lossWarnings(loss, *conversion.target, light, made));
+    report.loss = {static_cast<float>(loss.candela), static_cast<float>(loss.candelaPercent),
+                   static_cast<float>(loss.fluxPercent)};
+    append(report.warnings, lossWarnings(loss, *conversion.target, light, made));
 }
 
 /// What the output does not hold of the source, the flux of its lamps included.
-Json droppedOf(const ReadResult& source, const Format& target, const LightFile& made) {
-    Json dropped = factsToJson(droppedFacts(source.facts, made.facts));
+std::vector<ConversionReport::Dropped> droppedOf(const ReadResult& source, const Format& target,
+                                                 const LightFile& made) {
+    std::vector<ConversionReport::Dropped> dropped;
+    for (const Fact& fact : droppedFacts(source.facts, made.facts))
+        dropped.push_back({toUtf8(fact.key), toUtf8(fact.text)});
     const float lamps = fileInfoOf(*source.web).lampLumens;
     if (lamps > 0 && !target.traits.holdsLampLumens && made.lampLumens != lamps)
-        dropped.push_back({{"key", "lampLumens"}, {"value", exactNumber(lamps)}});
+        dropped.push_back({"lampLumens", exactNumber(lamps)});
     return dropped;
 }
 
-Json convert(const Conversion& conversion, const HostSession& session, const ReadResult& source) {
-    Json report = unconverted(conversion, conversion.brief ? source.told() : source.reasons());
-    if (!source.format.empty()) report["format"] = source.format;
+ConversionReport convert(const Conversion& conversion, const HostSession& session, const ReadResult& source) {
+    ConversionReport report = unconverted(conversion, conversion.brief ? source.told() : source.reasons());
+    report.format = source.format;
     if (!source.web) return report;
 
     const std::vector<Fact>& facts = source.facts;
     const WebLight light = session.lightOf(*source.web);
-    if (const auto warning = negativeFlux(*source.web)) append(report["warnings"], {*warning});
+    if (const auto warning = negativeFlux(*source.web)) report.warnings.push_back(*warning);
     std::vector<std::string> messages;
     const auto made = writeAnew(conversion, session, source, facts, light, messages);
     if (made && made->light) {
-        report["dropped"] = droppedOf(source, *conversion.target, *made);
-        if (const auto warning = lostTypeB(source, made->facts)) append(report["warnings"], {*warning});
+        report.dropped = droppedOf(source, *conversion.target, *made);
+        if (const auto warning = lostTypeB(source, made->facts)) report.warnings.push_back(*warning);
         reportLoss(report, conversion, *light, *made);
     } else if (made) {
         // A save is what it is, readable or not.
-        append(report[conversion.asSaved ? "warnings" : "messages"], {made->refusal});
+        (conversion.asSaved ? report.warnings : report.messages).push_back(made->refusal);
     }
     if (made && (made->light || conversion.asSaved)) {
         std::string error = inputsOf(source).refusal(conversion.out);
         if (error.empty()) error = writeFile(conversion.out, made->bytes);
         if (!error.empty()) messages.push_back(conversion.out + ": " + error);
-        report["ok"] = error.empty();
+        report.ok = error.empty();
     }
-    append(report["messages"], messages);
+    append(report.messages, std::move(messages));
     return report;
 }
 
 /// The keys, each once.
-std::string keysOf(const Json& facts) {
+std::string keysOf(const std::vector<ConversionReport::Dropped>& facts) {
     std::vector<std::string> keys;
-    for (const Json& fact : facts) {
-        const auto key = fact["key"].get<std::string>();
+    for (const auto& [key, value] : facts)
         if (std::find(keys.begin(), keys.end(), key) == keys.end()) keys.push_back(key);
-    }
     std::string text;
     for (const std::string& key : keys) text += (text.empty() ? "" : ", ") + key;
     return text;
 }
 
-std::string percentText(const Json& percent) {
-    return shortNumber(std::round(percent.get<double>() * 1000) / 1000 + 0.0) + " %";
-}
+std::string percentText(double percent) { return shortNumber(std::round(percent * 1000) / 1000 + 0.0) + " %"; }
 
-std::string lossText(const Json& report) {
-    if (report["maxCandelaDifference"].is_null()) return "cannot be read back";
-    std::string text = "largest difference " + shortNumber(report["maxCandelaDifference"].get<double>()) +
-                       " cd (" + percentText(report["maxCandelaDifferencePercent"]) + "), flux " +
-                       percentText(report["fluxDifferencePercent"]);
-    if (!report["dropped"].empty()) text += "; dropped " + keysOf(report["dropped"]);
+std::string lossText(const ConversionReport& report) {
+    if (!report.loss) return "cannot be read back";
+    std::string text = "largest difference " + shortNumber(report.loss->candela) + " cd (" +
+                       percentText(report.loss->candelaPercent) + "), flux " +
+                       percentText(report.loss->fluxPercent);
+    if (!report.dropped.empty()) text += "; dropped " + keysOf(report.dropped);
     return text;
 }
 
+std::vector<std::string> textsOf(const Json& array) { return array.get<std::vector<std::string>>(); }
+
 }  // namespace
 
-Json convertFile(const Conversion& conversion, const HostSession& session) {
+ConversionReport convertFile(const Conversion& conversion, const HostSession& session) {
     try {
         return convert(conversion, session, session.read(conversion.in, conversion.as));
     } catch (...) {
@@ -119,32 +121,61 @@ Json convertFile(const Conversion& conversion, const HostSession& session) {
     }
 }
 
-Json unconverted(const Conversion& conversion, const std::vector<std::string>& reasons) {
-    return {{"file", conversion.in},
-            {"out", conversion.out},
-            {"format", Json()},
-            {"target", conversion.target->name},
-            {"maxCandelaDifference", Json()},
-            {"maxCandelaDifferencePercent", Json()},
-            {"fluxDifferencePercent", Json()},
-            {"dropped", Json::array()},
-            {"warnings", Json::array()},
-            {"ok", false},
-            {"messages", reasons}};
+ConversionReport unconverted(const Conversion& conversion, std::vector<std::string> reasons) {
+    ConversionReport report;
+    report.file = conversion.in;
+    report.out = conversion.out;
+    report.target = conversion.target->name;
+    report.messages = std::move(reasons);
+    return report;
 }
 
-void printReport(const Json& report, const Conversion& conversion, bool json) {
+Json toJson(const ConversionReport& report) {
+    const auto lost = [&](float ConversionReport::Loss::*what) {
+        return report.loss ? Json(*report.loss.*what) : Json();
+    };
+    Json dropped = Json::array();
+    for (const auto& [key, value] : report.dropped) dropped.push_back({{"key", key}, {"value", value}});
+    return {{"file", report.file},
+            {"out", report.out},
+            {"format", report.format.empty() ? Json() : Json(report.format)},
+            {"target", report.target},
+            {"maxCandelaDifference", lost(&ConversionReport::Loss::candela)},
+            {"maxCandelaDifferencePercent", lost(&ConversionReport::Loss::candelaPercent)},
+            {"fluxDifferencePercent", lost(&ConversionReport::Loss::fluxPercent)},
+            {"dropped", dropped},
+            {"warnings", report.warnings},
+            {"ok", report.ok},
+            {"messages", report.messages}};
+}
+
+std::optional<ConversionReport> reportOf(const Json& json) {
+    if (!json.is_object()) return {};
+    ConversionReport report;
+    report.file = json["file"];
+    report.out = json["out"];
+    if (!json["format"].is_null()) report.format = json["format"];
+    report.target = json["target"];
+    if (!json["maxCandelaDifference"].is_null())
+        report.loss = {json["maxCandelaDifference"], json["maxCandelaDifferencePercent"],
+                       json["fluxDifferencePercent"]};
+    for (const Json& fact : json["dropped"]) report.dropped.push_back({fact["key"], fact["value"]});
+    report.warnings = textsOf(json["warnings"]);
+    report.ok = json["ok"];
+    report.messages = textsOf(json["messages"]);
+    return report;
+}
+
+void printReport(const ConversionReport& report, bool json) {
     if (json) {
-        printLine(report);
+        printLine(toJson(report));
         std::cout.flush();  // what is done is told even if a later file ends the process
-    } else if (report["ok"].get<bool>()) {
-        sayOf(conversion.out, conversion.in + " -> " + conversion.out + ": " +
-                                  report["format"].get<std::string>() + " to " + conversion.target->name + ", " +
-                                  lossText(report));
+    } else if (report.ok) {
+        sayOf(report.out, report.file + " -> " + report.out + ": " + report.format + " to " + report.target +
+                              ", " + lossText(report));
     }
-    for (const Json& message : report["messages"]) complain(conversion.in + ": " + message.get<std::string>());
-    for (const Json& warning : report["warnings"])
-        complain(conversion.in + ": warning: " + warning.get<std::string>());
+    for (const std::string& message : report.messages) complain(report.file + ": " + message);
+    for (const std::string& warning : report.warnings) complain(report.file + ": warning: " + warning);
 }
 
 }  // namespace OvTool

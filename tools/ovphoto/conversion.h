@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -17,22 +18,46 @@ struct Conversion {
     bool brief = false;  // messages are for people: see ReadResult::told
 };
 
-/// Converts a file and reads the result again before it is put in place. The report has the members
-///
-///     file, out          as they were given
-///     format, target     names of the formats; `format` is null where none was found
-///     maxCandelaDifference, maxCandelaDifferencePercent, fluxDifferencePercent
-///                        what was lost, see ConversionLoss; null where nothing was written or it cannot be read
-///     dropped            array of {"key", "value"}: facts that the output does not hold, and "lampLumens"
-///     warnings           array of texts
-///     ok                 whether the output was written
-///     messages           array of texts: what the reader and the writer reported, and why nothing was written
-Json convertFile(const Conversion& conversion, const HostSession& session);
+/// What became of a file that was to be converted.
+struct ConversionReport {
+    /// What the output does not hold of the source: facts, and the lumens of its lamps.
+    struct Dropped {
+        std::string key;
+        std::string value;
+    };
+    /// What was lost, see ConversionLoss.
+    struct Loss {
+        float candela;
+        float candelaPercent;
+        float fluxPercent;
+    };
+
+    std::string file;  // as they were given
+    std::string out;
+    std::string format;        // of the file; empty where none was found
+    std::string target;        // format of the output
+    std::optional<Loss> loss;  // none where nothing was written or it cannot be read
+    std::vector<Dropped> dropped;
+    std::vector<std::string> warnings;
+    bool ok = false;                    // whether the output was written
+    std::vector<std::string> messages;  // what the reader and the writer reported, and why nothing was written
+};
+
+/// Converts a file and reads the result again before it is put in place.
+ConversionReport convertFile(const Conversion& conversion, const HostSession& session);
 /// The report on a file that was not converted.
-Json unconverted(const Conversion& conversion, const std::vector<std::string>& reasons);
+ConversionReport unconverted(const Conversion& conversion, std::vector<std::string> reasons);
+
+/// @{
+/// A report as JSON, one member for each of its own and, for the loss, "maxCandelaDifference",
+/// "maxCandelaDifferencePercent" and "fluxDifferencePercent"; what is not there is null. And back: none of JSON that is
+/// no report.
+Json toJson(const ConversionReport& report);
+std::optional<ConversionReport> reportOf(const Json& json);
+/// @}
 
 /// Prints a report: as a line of JSON or, of a file that was converted, as a line of text. Messages and warnings
 /// go to standard error, behind the file's name.
-void printReport(const Json& report, const Conversion& conversion, bool json);
+void printReport(const ConversionReport& report, bool json);
 
 }  // namespace OvTool

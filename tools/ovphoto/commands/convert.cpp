@@ -25,9 +25,9 @@ std::optional<std::size_t> parseJobs(const std::string& text) {
 int convertOne(const ConvertOptions& options, const HostSession& session) {
     const Conversion conversion{options.paths[0], options.paths[1], options.as,
                                 options.target,   options.asSaved,  options.brief};
-    const Json report = convertFile(conversion, session);
-    printReport(report, conversion, options.json);
-    return report["ok"].get<bool>() ? exitWell : exitFailed;
+    const ConversionReport report = convertFile(conversion, session);
+    printReport(report, options.json);
+    return report.ok ? exitWell : exitFailed;
 }
 
 /// What depends on more than one argument.

@@ -118,7 +118,7 @@ public:
         if (options.jobs > 1) startProcesses(jobs, options);
     }
 
-    Json report(const Job& job) {
+    ConversionReport report(const Job& job) {
         if (!job.refusal.empty()) return unconverted(job.conversion, {job.refusal});
         return _runner ? fromProcess(job.conversion) : convertFile(job.conversion, _session);
     }
@@ -141,13 +141,12 @@ private:
         _runner = std::make_unique<SelfRunner>(std::move(runs), options.jobs);
     }
 
-    Json fromProcess(const Conversion& conversion) {
+    ConversionReport fromProcess(const Conversion& conversion) {
         if (_left == 0) takeShare();
         --_left;
         std::string line;
         std::getline(_lines, line);
-        Json report = Json::parse(line, nullptr, false);
-        if (report.is_object()) return report;
+        if (auto report = reportOf(Json::parse(line, nullptr, false))) return std::move(*report);
         // A process that broke off did so at the first file without a report; the rest of its share is done here.
         if (!_failure.empty()) return unconverted(conversion, {std::exchange(_failure, {})});
         return convertFile(conversion, _session);
@@ -177,12 +176,11 @@ ConversionTotals carryOut(const Plan& plan, const ConvertOptions& options, const
     for (const Job& job : plan.jobs) {
         if (!std::cout) break;
         progress.next();
-        const Json report = worker.report(job);
-        const bool ok = report["ok"].get<bool>();
-        ++(ok ? totals.converted : totals.failed);
-        if (ok && !report["warnings"].empty()) ++totals.withWarnings;
+        const ConversionReport report = worker.report(job);
+        ++(report.ok ? totals.converted : totals.failed);
+        if (report.ok && !report.warnings.empty()) ++totals.withWarnings;
         progress.clear();
-        printReport(report, job.conversion, options.json);
+        printReport(report, options.json);
     }
     return totals;
 }
