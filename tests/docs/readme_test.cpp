@@ -1,6 +1,5 @@
 #include <gmock/gmock.h>
 
-#include <cstdio>
 #include <filesystem>
 #include <fstream>
 #include <regex>
@@ -35,8 +34,7 @@ struct Example {
 /// The commands of a document's fenced blocks, lines that start with "$ ", and what stands below each.
 std::vector<Example> examplesOf(const fs::path& document) {
     std::vector<Example> examples;
-    bool fenced = false;
-    bool commandSeen = false;
+    bool fenced = false, commandSeen = false;
     std::istringstream lines(readText(document));
     for (std::string line; std::getline(lines, line);) {
         if (line.starts_with("```")) {
@@ -52,18 +50,10 @@ std::vector<Example> examplesOf(const fs::path& document) {
     return examples;
 }
 
-/// What a shell in the source folder, where `ovphoto` is the built tool, prints; and the status when that is not
-/// 0.
+/// What a command prints in the source folder, and its status when that is not 0.
 std::string runInSources(const std::string& command) {
-    const std::string line = "export LC_ALL=C PATH='" + toolFolder() + "':\"$PATH\" && cd '" + sourceFolder() +
-                             "' && { " + command + "\n} 2>&1";
-    FILE* pipe = popen(line.c_str(), "r");
-    if (!pipe) return "no shell";
-    std::string output;
-    for (int c; (c = std::fgetc(pipe)) != EOF;) output += static_cast<char>(c);
-    const int status = pclose(pipe);
-    if (status != 0) output += "status " + std::to_string(WEXITSTATUS(status)) + '\n';
-    return output;
+    const ToolResult result = runShell("cd '" + sourceFolder() + "' && { " + command + "\n} 2>&1", TempFolder());
+    return result.out + (result.status == 0 ? "" : "status " + std::to_string(result.status) + '\n');
 }
 
 /// What stands in `text` wherever the pattern's group is found.
@@ -111,17 +101,13 @@ TEST(ManPage, NamesEveryCommandAndOptionAndNoOther) {
 }
 
 TEST(Documents, LinksLeadToFiles) {
-    const std::regex link(R"(\]\(([^)#\s]+)(#[^)]*)?\))");
     int links = 0;
-    for (const fs::path& document : documents()) {
-        const std::string text = readText(document);
-        for (std::sregex_iterator found(text.begin(), text.end(), link), end; found != end; ++found) {
-            const std::string target = (*found)[1];
+    for (const fs::path& document : documents())
+        for (const std::string& target : allOf(readText(document), R"(\]\(([^)#\s]+)(?:#[^)]*)?\))")) {
             if (target.starts_with("http")) continue;
             ++links;
             EXPECT_TRUE(fs::exists(document.parent_path() / target)) << document << " links to " << target;
         }
-    }
     EXPECT_GT(links, 5);
 }
 

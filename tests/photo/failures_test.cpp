@@ -164,11 +164,7 @@ protected:
     std::string file(int number) {
         const auto source =
             import(IesText{.lumens = 1000.0 * number, .horizontal = {0, 45.0 * number, 90.0 * number}}.text());
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), Form::text);
-        immortal<PhotoWebBuilder<Format>>().write(*makeWebDistribution(*source), stream, FileForm::faithful,
-                                                  nullptr, 0);
-        return io->bytes();
+        return fileOf(immortal<PhotoWebBuilder<Format>>(), *makeWebDistribution(*source));
     }
 };
 

@@ -11,7 +11,6 @@
 #include "host/componentManager/streamEx.h"
 #include "host/sdk/util.h"
 #include "ovphoto/classIds.h"
-#include "ovphoto/intensities.h"
 #include "ovphoto/intensityDist.h"
 #include "ovphoto/numberedExports.h"
 #include "ovphoto/photoFormat.h"
@@ -106,45 +105,6 @@ TEST_F(ModuleTest, NumberedExportsAnswerByTheirOrdinals) {
     EXPECT_TRUE(module->byOrdinal<bool(int, int*, int*)>(434)(172, &month, &day));
     EXPECT_TRUE(month == 6 && day == 21);
     EXPECT_STREQ(OvPhotometrics::numberedFunctions(*module).getMonthShortName(5), L"May");
-}
-
-TEST_F(ModuleTest, AnImportTellsWhatElseTheFileSays) {
-    std::wstring told;
-    auto visitor = Ov::rnVisitor<const Ov::FileFact&>(
-        [&](const Ov::FileFact& fact) { told += std::wstring(fact.key) + L"=" + fact.text + L";"; });
-    const auto format =
-        Ov::rnCast<Ov::RnPhotoFormat>(manager->findBuilder(OvPhotometrics::classIds::iesWeb).get());
-    const auto import = [&](const char* text) {
-        return format->importWithFacts(*Ov::rnCreate<Ov::RnMemoryBuffer>(text), L"lamp", nullptr, visitor);
-    };
-    const char* const good = "IESNA91\n[LUMCAT] 7\nTILT=NONE\n1 100 1 2 1 1 2 0 0 0 1 1 0 0 90 0 5 1";
-    const auto object = import(good);
-    EXPECT_STREQ(Ov::rnCast<Ov::RnPhotoWebData>(object.get())->getName(), L"lamp");
-    EXPECT_NE(told.find(L"LUMCAT=7;"), std::wstring::npos);
-    told.clear();
-    EXPECT_THROW(import("IESNA91\nTILT=NONE\n0"), Ov::RnStreamEx::ExReadError);
-    EXPECT_EQ(told, L"");
-}
-
-TEST_F(ModuleTest, IntensitiesOfManyDirectionsTakeSpans) {
-    const auto lamp = manager->createObject(OvPhotometrics::classIds::diffuse);
-    Ov::rnCast<Ov::RnIntensityDist>(lamp.get())->setPeakIntensity(2);
-    const Ov::GeVector3<float> vectors[] = {{0, 0, 1}, {0, 0.6F, 0.8F}, {1, 0, 0}};
-    const OvPhotometrics::DirectionAngles angles[] = {{}, {0.6435011F, 1}, {2, 1}};
-    const auto answers = [&](auto ask, auto directions) {
-        std::vector<float> candela(3);
-        EXPECT_FALSE(ask(lamp.get(), directions, std::span(candela).first(2)));
-        EXPECT_FALSE(ask(nullptr, directions, candela));
-        EXPECT_TRUE(ask(lamp.get(), directions, candela));
-        EXPECT_EQ(candela[0], 2);
-        EXPECT_FLOAT_EQ(candela[1], 1.6F);
-        EXPECT_EQ(candela[2], 0);
-    };
-    for (const auto ask : {OvPhotometrics::intensities, OvPhotometrics::localIntensities})
-        answers(ask, std::span<const OvPhotometrics::DirectionAngles>(angles));
-    for (const auto ask : {OvPhotometrics::intensitiesAt, OvPhotometrics::intensitiesAtUnit,
-                           OvPhotometrics::localIntensitiesAt, OvPhotometrics::localIntensitiesAtUnit})
-        answers(ask, std::span<const Ov::GeVector3<float>>(vectors));
 }
 
 TEST(CompanionPath, ReplacesTheExtensionOfTheFile) {

@@ -55,11 +55,15 @@ protected:
         return Ov::rnCast<Ov::RnPersistant>(&object)->load(stream, 0, name, nullptr);
     }
 
-    static bool writeFaithfully(Ov::RnPhotoFormat& format, Ov::RnIntensityDist& dist, Ov::RnStream& stream,
-                                const FileFacts& facts = {}) {
+    /// The file that a format writes of a light; empty when it is refused.
+    static std::string fileOf(Ov::RnPhotoFormat& format, Ov::RnIntensityDist& light, const FileFacts& facts = {},
+                              FileForm form = FileForm::faithful) {
+        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
+        Ov::RnStream stream(io.get(), Form::text);
         const std::vector<FileFact> given = facts.list();
-        return format.write(dist, stream, FileForm::faithful, given.data(),
-                            static_cast<std::int32_t>(given.size()));
+        const bool well = format.write(light, stream, form, given.data(), static_cast<std::int32_t>(given.size()));
+        EXPECT_EQ(well, !io->bytes().empty());
+        return io->bytes();
     }
 
     RnRef<Ov::RnWebIntensityDist> distributionOf(Ov::RnPhotoWebData& web) { return makeWebDistribution(web); }

@@ -96,36 +96,23 @@ TEST_F(ToolConversion, FilesOfOneFormatKeepEveryValue) {
     }
 }
 
-TEST_F(ToolConversion, LossIsMeasuredBetweenTheAnglesAndAtPolesOnce) {
-    // Steps of 1 degree hold every angle of this file, but not its curve from 0 to 1 degree.
-    IesFile steep{.verticals = {0, 1, 90}};
-    steep.candela = [](double v, double) { return v == 0 ? 100 : v == 1 ? 1000 : 0; };
-    folder.write("steep.ies", steep.text());
-    EXPECT_GT(convert("steep.ies out.nmb")["maxCandelaDifferencePercent"], 3);
-    // A pole with another value in each plane, in a file that is turned and in one that is laid down.
-    IesFile poles{.verticals = angles(0, 90, 5), .horizontals = angles(90, 270, 45)};
-    poles.candela = [](double v, double h) { return v == 0 ? h : 200 + v; };
-    folder.write("poles.ies", poles.text());
-    EXPECT_LT(convert("poles.ies out.tbt")["maxCandelaDifferencePercent"], 10);
-    IesFile laid{.type = 2, .verticals = {-90, 90}, .horizontals = angles(-90, 90, 45)};
-    laid.candela = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
-    folder.write("laid.ies", laid.text());
-    EXPECT_LT(convert("laid.ies out.tbt")["maxCandelaDifferencePercent"], 1);
-    laid.candela = [](double, double) { return 100; };  // and dark behind
-    folder.write("laid.ies", laid.text());
-    EXPECT_LT(convert("laid.ies out.tbt")["maxCandelaDifferencePercent"], 1);
-}
-
 TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
-    IesFile spot{.verticals = angles(0, 90, 0.5)};
-    spot.candela = [](double v, double) { return 5000 * std::exp(-v * v / 13); };
-    folder.write("spot.ies", spot.text());
-    IesFile ends{.verticals = angles(0, 90, 10)};
-    ends.candela = [](double v, double) { return 1000 - 11 * v; };
-    folder.write("ends.ies", ends.text());
-    IesFile laid{.type = 2, .verticals = {-90, 90}, .horizontals = angles(-90, 90, 45)};
-    laid.candela = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
-    folder.write("laid.ies", laid.text());
+    const auto falling = [](double v, double) { return 1000 - 11 * v; };
+    const auto beam = [](double v, double) { return 5000 * std::exp(-v * v / 13); };
+    const auto narrow = [](double v, double h) { return 5000 * std::exp(-v * v / 4 - h * h / 8); };
+    const auto tilted = [](double v, double h) { return 100 + h + (v > 0 ? 10 : 0); };
+    const auto steep = [](double v, double) { return v == 0 ? 100 : v == 1 ? 1000 : 0; };
+    const auto poles = [](double v, double h) { return v == 0 ? h : 200 + v; };
+    const auto few = angles(-10, 10, 0.5), laid = angles(-90, 90, 45);
+    const std::pair<const char*, IesFile> files[] = {
+        {"spot.ies", {.verticals = angles(0, 90, 0.5), .candela = beam}},
+        {"ends.ies", {.verticals = angles(0, 90, 10), .candela = falling}},
+        {"laid.ies", {.type = 2, .verticals = {-90, 90}, .horizontals = laid, .candela = tilted}},
+        {"half.ies", {.type = 2, .verticals = {-90, 90}, .horizontals = laid}},
+        {"narrow.ies", {.type = 3, .verticals = few, .horizontals = few, .candela = narrow}},
+        {"steep.ies", {.verticals = {0, 1, 90}, .candela = steep}},
+        {"poles.ies", {.verticals = angles(0, 90, 5), .horizontals = angles(90, 270, 45), .candela = poles}}};
+    for (const auto& [name, file] : files) folder.write(name, file.text());
     folder.write("jump.tbt", "t\n3\n1 1 1\n1000 1000 1 1 5 0\n4 3 5\n9 9 9\n9 9 9\n9 9 9\n9 9 9\n9 5 9\n-1\n");
     std::string behind = "CIBSE/1\n\n\n\n\n\n\n\n1 2 0 0 0 1 0 0 0\n19 10\n";
     for (const double v : angles(-90, 90, 10)) behind += std::to_string(v) + "\n";
@@ -134,23 +121,28 @@ TEST_F(ToolConversion, WhatIsLostIsToldWhereverItIs) {
     for (const double h : angles(0, 90, 10))
         for (const double v : angles(-90, 90, 10)) behind += std::to_string(1000 * cosine(v) * cosine(h)) + "\n";
     folder.write("behind.cib", behind + "99 0 0 0\n");
-    IesFile narrow{.type = 3, .verticals = angles(-10, 10, 0.5), .horizontals = angles(-10, 10, 0.5)};
-    narrow.candela = [](double v, double h) { return 5000 * std::exp(-v * v / 4 - h * h / 8); };
-    folder.write("narrow.ies", narrow.text());
     const struct {
         const char* files;
+        double least, most;  // percent
         const char* warning;
     } cases[] = {
-        {"spot.ies out.nmb", "the candela differ"},               // what steps of 1 degree lose,
-        {"spot.ies out.tbt", "[]"},                               // finer ones keep
-        {"ends.ies out.tbt", "at the rim of its range"},          // at 90 degrees, behind which it is dark
-        {"laid.ies out.tbt", "a pole where planes"},              // 10 to 200 cd
-        {"jump.tbt out.ies", "the candela differ by up to 3.9"},  // next to plane 360
-        {"behind.cib out.nmb", "the candela differ"},             // where the values go on below 0 and count as 0
-        {"narrow.ies out.tbt", "the candela differ"},             // finer steps were too many
+        {"spot.ies out.nmb", 0.1, 100, "the candela differ"},     // what steps of 1 degree lose,
+        {"spot.ies out.tbt", 0, 0.1, "[]"},                       // finer ones keep
+        {"ends.ies out.tbt", 0, 0.1, "at the rim of its range"},  // at 90 degrees, behind which it is dark
+        {"laid.ies out.tbt", 0, 1, "a pole where planes"},        // 10 to 200 cd
+        {"half.ies out.tbt", 0, 1, ""},                           // and dark behind
+        {"jump.tbt out.ies", 0.1, 100, "the candela differ by up to 3.9"},  // next to plane 360
+        {"behind.cib out.nmb", 0.1, 100, "the candela differ"},             // where values go on below 0, as 0
+        {"narrow.ies out.tbt", 0.1, 100, "the candela differ"},             // finer steps were too many
+        {"steep.ies out.nmb", 3, 100, "the candela differ"},  // the angles are held, the curve to 1 degree is not
+        {"poles.ies out.tbt", 0, 10, ""},                     // another value in each plane, in a turned file
     };
-    for (const auto& c : cases)
-        EXPECT_THAT(texts(convert(c.files)["warnings"]), testing::HasSubstr(c.warning)) << c.files;
+    for (const auto& c : cases) {
+        const Json report = convert(c.files);
+        EXPECT_GE(report["maxCandelaDifferencePercent"], c.least) << c.files;
+        EXPECT_LT(report["maxCandelaDifferencePercent"], c.most) << c.files;
+        EXPECT_THAT(texts(report["warnings"]), testing::HasSubstr(c.warning)) << c.files;
+    }
 }
 
 TEST_F(ToolConversion, ANegativeFluxIsToldAndTheLightStays) {
@@ -320,21 +312,6 @@ TEST_F(ToolConversion, GoesThroughFoldersInOrderWithAnyNumberOfJobs) {
     EXPECT_EQ(outputs(), written);
     EXPECT_TRUE(runTool("convert --jobs 2" + rest, folder)
                     .says("7 files: 4 converted, 3 failed; 2 more of no known format"));
-}
-
-TEST_F(ToolConversion, NeverWritesOverAFileThatItReads) {
-    fs::create_directory(folder.path() / "out");
-    fs::create_symlink("../in.ies", folder.path() / "out/in.ies");
-    const std::string before = readBytes(folder.path() / "in.ies");
-    std::vector<std::string> folders{"."};
-    if (!windowsTool()) folders.push_back("out");  // the link may be none there
-    for (const std::string& into : folders) {
-        const ToolResult result = runTool("convert ./in.ies --to ies --into " + into, folder);
-        EXPECT_EQ(result.status, 1);
-        EXPECT_TRUE(result.says(into + "/in.ies is not written: it is one of the files to read")) << result.err;
-        EXPECT_EQ(readBytes(folder.path() / "in.ies"), before);
-    }
-    EXPECT_EQ(runTool("convert in.ies --to ies --into in.ies", folder).status, 1);  // no folder
 }
 
 TEST_F(ToolConversion, MakesDistributionsThatReadBack) {

@@ -6,14 +6,10 @@
 #include "components/photo/distributions/isotropic.h"
 #include "components/photo/distributions/spotlight.h"
 #include "components/photo/distributions/web.h"
-#include "components/photo/naturallight/daylightData.h"
-#include "components/photo/tbt/photoWebTBT.h"
 #include "tests/photo/photoFixture.h"
 
 namespace OvPhotometrics {
 namespace {
-
-class Distributions : public Photo {};
 
 float cosineOf(double degrees) { return static_cast<float>(std::cos(inRadians(degrees))); }
 
@@ -24,6 +20,22 @@ RnRef<Spotlight> makeSpotlight(double hotspot, double falloff, float candela) {
     spot->setPeakIntensity(candela);
     return spot;
 }
+
+class Distributions : public Photo {
+protected:
+    /// Lights of every kind; of webs, whole and part, turned and not.
+    std::vector<RnRef<Ov::RnIntensityDist>> lights() {
+        std::vector<RnRef<Ov::RnIntensityDist>> all = {Ov::rnCreate<Isotropic>(), Ov::rnCreate<Diffuse>(),
+                                                       makeSpotlight(30, 60, 9), Ov::rnCreate<Web>()};
+        for (const IesText& file : {IesText{.vertical = {0, 45, 90}},
+                                    IesText{.horizontal = {90, 150, 270}, .values = "1 2 3 4 5 6 7 8 9"},
+                                    IesText{.horizontal = {0, 90, 180, 360}},
+                                    IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}}})
+            all.push_back(distributionOf(*import(file.text())));
+        for (const auto& light : all) light->setFlux(1000);
+        return all;
+    }
+};
 
 /// The flux of an axial distribution, in rings.
 double integrateSphere(const Ov::RnIntensityDist& dist) {
@@ -136,29 +148,6 @@ TEST_F(Distributions, ASpotlightReadsBackExactlyOrStays) {
     EXPECT_EQ(loaded->intensity(0, 0) + loaded->getFlux(), 0);
 }
 
-TEST_F(Distributions, ObjectsFollowEachOtherInAStream) {
-    const auto lamp = Ov::rnCreate<Isotropic>();
-    lamp->candela = 1 / 3.0f;
-    const auto sun = Ov::rnCreate<DaylightData>();
-    sun->setDayOfYear(7);
-    const auto first = distributionOf(*import(IesText{.values = "4 2 1"}.text()));
-    const auto second = distributionOf(*import(IesText{.horizontal = {0, 180}, .values = "4 2 1 4 1 2"}.text()));
-    const auto tbt = import <TbtFormat>("QRT photometric web\n3\n1 1 1\n1000 1000 1 1 1 0\n3 3 2\n4 2 1 4 1 1 -1");
-    Ov::RnCastable* const objects[] = {lamp.get(), first.get(), tbt.get(), sun.get(), second.get()};
-    for (const Form form : {Form::text, Form::binary}) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), form);
-        for (Ov::RnCastable* object : objects) stream << object;
-        stream << static_cast<const Ov::RnCastable*>(Ov::rnCreate<Web>()->getCastable());  // without a web
-        io->seek(0, 0);
-        for (Ov::RnCastable* object : objects) {
-            const auto read = stream.readObject(nullptr, L"name");
-            EXPECT_EQ(saved(*read, Form::binary), saved(*object, Form::binary));
-        }
-        EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
-    }
-}
-
 TEST_F(Distributions, AWebGivesItsCandelas) {
     const auto web = import(IesText{.lumens = 1000, .vertical = {0, 45, 90}, .values = "200 500 100"}.text());
     const auto light = Ov::rnCreate<Web>();
@@ -204,23 +193,11 @@ TEST_F(Distributions, OneWebIsShared) {
 }
 
 TEST_F(Distributions, AnyLengthHasTheDirectionOfItsUnitVector) {
-    const auto lamp = Ov::rnCreate<Isotropic>();
-    const auto diffuse = Ov::rnCreate<Diffuse>();
-    const RnRef<Ov::RnIntensityDist> lights[] = {
-        lamp,
-        diffuse,
-        makeSpotlight(30, 60, 9),
-        Ov::rnCreate<Web>(),
-        makeWebDistribution(*import(IesText{.vertical = {0, 45, 90}}.text())),
-        makeWebDistribution(*import(IesText{.horizontal = {90, 150, 270}, .values = "1 2 3 4 5 6 7 8 9"}.text())),
-        makeWebDistribution(
-            *import(IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}}.text()))};
     const GeVector3<float> directions[] = {{0, 0, 1}, {3, -2, 7}, {1, 1, 1}, {-7, 5, -3}, {0, 1, 0}};
-    for (const auto& light : lights) {
-        light->setFlux(1000);
+    for (const auto& light : lights())
         for (const GeVector3<float>& d : directions)
             for (int power = -149; power < 126; ++power) {
-                SCOPED_TRACE(testing::Message() << &light - lights << " 2^" << power);
+                SCOPED_TRACE(testing::Message() << d.x << " 2^" << power);
                 const float scale = std::ldexp(1.0f, power);
                 const GeVector3<float> scaled{d.x * scale, d.y * scale, d.z * scale};
                 ASSERT_EQ(light->intensityAt(scaled), light->intensityAt(d));
@@ -230,15 +207,14 @@ TEST_F(Distributions, AnyLengthHasTheDirectionOfItsUnitVector) {
                 getIntensities(light.get(), DirectionForm::vectors, &scaled.x, 1, &candela);
                 ASSERT_EQ(candela, light->intensityAt(d));
             }
-    }
 }
 
 TEST_F(Distributions, LightIsFiniteAndNeverNegative) {
     constexpr float inf = std::numeric_limits<float>::infinity(), nan = std::numeric_limits<float>::quiet_NaN();
     const float numbers[] = {0, 1e-45f, 1e-38f, 1e-30f, 1e-6f, 1, 1e6f, 1e30f, 3e38f};
     const float angles[] = {0, 0.3f, 1, 2, 2.5f, 3};
-    std::vector<RnRef<Ov::RnIntensityDist>> lights = {Ov::rnCreate<Isotropic>(), Ov::rnCreate<Diffuse>(),
-                                                      makeSpotlight(1, 80, 1), Ov::rnCreate<Web>()};
+    auto lights = this->lights();
+    lights.push_back(makeSpotlight(1, 80, 1));
     for (const float lumens : numbers)
         for (const float peak : numbers)
             for (const float valley : {0.0f, -peak, -3e38f}) {
@@ -290,76 +266,61 @@ TEST_F(Distributions, ManyIntensitiesAreTheSingleOnes) {
     using Light = Ov::RnIntensityDist;
     using Vector = GeVector3<float>;
     constexpr float inf = std::numeric_limits<float>::infinity();
-    const auto lamp = Ov::rnCreate<Isotropic>();
-    lamp->setFlux(1000);
-    const auto diffuse = Ov::rnCreate<Diffuse>();
-    diffuse->setFlux(1000);
-    const auto turned = import(IesText{.horizontal = {90, 180, 270}}.text());
     const auto stripes = Ov::rnCreate<Stripes>();
     PhotoWebRecord rec;
     photoWebRecordInit(rec, 2, 1, PhotoWebSymmetry::Axial, false, true, nullptr);
     rec.thetas[0] = 0, rec.thetas[1] = 3;
     for (int i : {0, 1}) photoWebRecordSetCandela(rec, i, 0, 5);
     ASSERT_TRUE(photoWebInstall(*stripes, rec));
-    const auto upsideDown = makeWebDistribution(*turned);
+    const auto upsideDown = makeWebDistribution(*import(IesText{.horizontal = {90, 180, 270}}.text()));
     upsideDown->setPeakIntensity(-3);  // dark is 0, not -0, where the web does not reach
-    const RnRef<Light> lights[] = {
-        lamp,
-        diffuse,
-        makeSpotlight(30, 60, 9),
-        Ov::rnCreate<Web>(),
-        makeWebDistribution(*import(IesText{.vertical = {0, 45, 90}}.text())),
-        makeWebDistribution(*import(IesText{.horizontal = {0, 90, 180, 360}}.text())),
-        makeWebDistribution(
-            *import(IesText{.type = 2, .vertical = {-90, 0, 90}, .horizontal = {-90, 0, 90}}.text())),
-        makeWebDistribution(*stripes),
-        upsideDown};
+    auto lights = this->lights();
+    lights.insert(lights.end(), {makeWebDistribution(*stripes), upsideDown});
 
     const float marks[] = {0,          -0.0f,  1,     -1,  0.6f, 1.57079633f,
                            3.1415927f, 1e-30f, 1e30f, inf, -inf, std::nanf("")};
-    std::vector<float> pairs, triples;
+    std::vector<DirectionAngles> pairs;
+    std::vector<Vector> triples;
     for (const float a : marks)
         for (const float b : marks) {
-            pairs.insert(pairs.end(), {a, b});
-            for (const float c : marks) triples.insert(triples.end(), {a, b, c});
+            pairs.push_back({a, b});
+            for (const float c : marks) triples.push_back({a, b, c});
         }
     std::mt19937 random(5);
     std::normal_distribution<float> normal;
-    for (int k = 0; k < 2 * 999; ++k) pairs.push_back(3 * normal(random));
     for (int k = 0; k < 999; ++k) {
-        const Vector v = Vector{normal(random), normal(random), normal(random)}.normalized();
-        triples.insert(triples.end(), {v.x, v.y, v.z});
+        pairs.push_back({3 * normal(random), 3 * normal(random)});
+        triples.push_back(Vector{normal(random), normal(random), normal(random)}.normalized());
     }
 
     for (const RnRef<Light>& light : lights) {
-        const auto compare = [&](DirectionForm form, const std::vector<float>& directions, std::size_t floats,
-                                 auto single) {
-            SCOPED_TRACE(testing::Message() << &light - lights << " form " << static_cast<int>(form));
-            std::vector<float> accepted, expected;
-            for (const float* d = directions.data(); d != directions.data() + directions.size(); d += floats) {
+        const auto compare = [&](const char* what, auto ask, const auto& directions, auto single) {
+            SCOPED_TRACE(testing::Message() << &light - lights.data() << what);
+            std::remove_cvref_t<decltype(directions)> accepted;
+            std::vector<float> expected;
+            for (const auto& d : directions) {
                 float candela = 7;
                 try {
                     expected.push_back(single(d));
-                    accepted.insert(accepted.end(), d, d + floats);
+                    accepted.push_back(d);
                 } catch (const Ov::ExAssertion&) {
-                    EXPECT_THROW(getIntensities(light.get(), form, d, 1, &candela), Ov::ExAssertion);
+                    EXPECT_THROW(ask(light.get(), {&d, 1}, {&candela, 1}), Ov::ExAssertion);
                 }
             }
             std::vector<float> candela(expected.size(), 7);
-            const auto count = static_cast<std::int64_t>(expected.size());
-            EXPECT_TRUE(getIntensities(light.get(), form, accepted.data(), count, candela.data()));
+            EXPECT_TRUE(ask(light.get(), accepted, candela));
             for (std::size_t k = 0; k < expected.size(); ++k)
                 ASSERT_EQ(std::bit_cast<std::uint32_t>(candela[k]), std::bit_cast<std::uint32_t>(expected[k]))
                     << k;
         };
-        const auto vector = [](const float* d) { return Vector{d[0], d[1], d[2]}; };
-        using enum DirectionForm;
-        compare(angles, pairs, 2, [&](auto d) { return light->intensity(d[0], d[1]); });
-        compare(vectors, triples, 3, [&](auto d) { return light->intensityAt(vector(d)); });
-        compare(unitVectors, triples, 3, [&](auto d) { return light->intensityAtUnit(vector(d)); });
-        compare(localAngles, pairs, 2, [&](auto d) { return light->localIntensity(d[0], d[1]); });
-        compare(localVectors, triples, 3, [&](auto d) { return light->localIntensityAt(vector(d)); });
-        compare(localUnitVectors, triples, 3, [&](auto d) { return light->localIntensityAtUnit(vector(d)); });
+        compare(" angles", intensities, pairs, [&](auto d) { return light->intensity(d.theta, d.psi); });
+        compare(" vectors", intensitiesAt, triples, [&](auto d) { return light->intensityAt(d); });
+        compare(" units", intensitiesAtUnit, triples, [&](auto d) { return light->intensityAtUnit(d); });
+        compare(" local angles", localIntensities, pairs,
+                [&](auto d) { return light->localIntensity(d.theta, d.psi); });
+        compare(" local vectors", localIntensitiesAt, triples, [&](auto d) { return light->localIntensityAt(d); });
+        compare(" local units", localIntensitiesAtUnit, triples,
+                [&](auto d) { return light->localIntensityAtUnit(d); });
     }
 }
 
@@ -386,6 +347,8 @@ TEST_F(Distributions, WhatCannotBeAnsweredIsRefused) {
                   c.answered);
         EXPECT_EQ(candela, c.answered && c.count ? light->intensityAt({0, 0, 1}) : 7);
     }
+    const DirectionAngles two[2];
+    EXPECT_FALSE(intensities(light.get(), two, {&candela, 1}));
 }
 
 TEST_F(Distributions, OnlyAWebIsLoadedAsTheWebOfOne) {
@@ -401,6 +364,11 @@ TEST_F(Distributions, OnlyAWebIsLoadedAsTheWebOfOne) {
         EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
         EXPECT_LT(device->seek(0, 1), 200);
     }
+    const auto device = Ov::rnCreate<Ov::RnMemoryBuffer>();
+    Ov::RnStream stream(device.get(), Form::binary);
+    stream << static_cast<const Ov::RnCastable*>(Ov::rnCreate<Web>()->getCastable());  // without one
+    device->seek(0, 0);
+    EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
 }
 
 TEST_F(Distributions, LoadingBringsDerivedValuesUpToDate) {

@@ -17,14 +17,9 @@ namespace {
 
 class Faithful : public Photo {
 protected:
-    /// The text of a faithful file; empty when it is refused.
     template <class Format>
     std::string written(Ov::RnIntensityDist& dist, const FileFacts& facts = {}) {
-        const auto io = Ov::rnCreate<Ov::RnMemoryBuffer>();
-        Ov::RnStream stream(io.get(), Ov::RnStream::Form::text);
-        const bool well = writeFaithfully(immortal<PhotoWebBuilder<Format>>(), dist, stream, facts);
-        EXPECT_EQ(well, !io->bytes().empty());
-        return io->bytes();
+        return fileOf(immortal<PhotoWebBuilder<Format>>(), dist, facts);
     }
 
     static FileFacts describe(Ov::RnPhotoFormat& format, const std::string& text) {

@@ -52,21 +52,6 @@ TEST_F(IesConvert, AnglesChooseTheLayout) {
     }
 }
 
-TEST_F(IesConvert, HalfPlanes90To270LightWhatTheFullCircleLights) {
-    // The luminaire is mirrored at the plane through 90 and 270: plane 180 + a is as plane 180 - a.
-    const auto half =
-        import(IesText{.horizontal = {90, 135, 180, 225, 270}, .values = "1 1 1 1 2 1 1 7 1 1 3 1 1 4 1"}.text());
-    const auto full = import(IesText{.horizontal = {0, 45, 90, 135, 180, 225, 270, 315, 360},
-                                     .values = "1 7 1 1 2 1 1 1 1 1 2 1 1 7 1 1 3 1 1 4 1 1 3 1 1 7 1"}
-                                 .text());
-    ASSERT_TRUE(half && full) << log.take();
-    const auto a = distributionOf(*half);
-    const auto b = distributionOf(*full);
-    for (const double psi : {90.0, 100.0, 135.0, 170.0, 200.0, 225.0, 250.0, 270.0})
-        EXPECT_NEAR(a->intensityAtUnit(direction(80, psi)), b->intensityAtUnit(direction(80, psi)), 1e-4) << psi;
-    EXPECT_NEAR(a->intensityAtUnit(direction(90, 180)), 7, 1e-4);
-}
-
 TEST_F(IesConvert, LateralFilesAreLitWhereTheirAnglesSay) {
     IesText typeA = angles(3, {-90, 0, 90}, {-60, 0, 60}), typeB = angles(2, {-90, 0, 90}, {-80, 0, 80});
     typeA.values = "0 2 0 0 5 0 0 3 0";
