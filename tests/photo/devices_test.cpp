@@ -20,18 +20,14 @@ namespace {
 
 using Device = RnRef<Ov::RnBufferedIO>;
 
-struct DeviceKind {
-    const char* name;
-    Device (*make)(std::string_view bytes);
-};
-
-void PrintTo(const DeviceKind& kind, std::ostream* out) { *out << kind.name; }
-
 Device memory(std::string_view bytes) { return Ov::rnCreate<Ov::RnMemoryBuffer>(bytes); }
 
-class Devices : public Photo, public testing::WithParamInterface<DeviceKind> {
+template <class Tested>
+class Devices : public Photo {
 protected:
     using MakeDevice = Device (*)(std::string_view bytes);
+
+    static Device tested(std::string_view bytes) { return Ov::rnCreate<Tested>(std::string(bytes)); }
 
     Devices() {
         const auto web = import(IesText{.horizontal = {0, 45, 90, 135, 180}}.text());
@@ -87,8 +83,8 @@ protected:
     void readsAsMemory(const std::string& bytes) {
         const auto same = [&](const char* what, const auto& read) {
             const std::string expected = outcome(memory, bytes, [&](auto& io) { return read(io, memory); });
-            const auto actual = [&](auto& io) { return read(io, GetParam().make); };
-            EXPECT_EQ(outcome(GetParam().make, bytes, actual), expected) << what << ": " << bytes.substr(0, 200);
+            const auto actual = [&](auto& io) { return read(io, tested); };
+            EXPECT_EQ(outcome(tested, bytes, actual), expected) << what << ": " << bytes.substr(0, 200);
         };
         for (const auto& [id, builder] : builderTable()) {
             const auto importer = Ov::rnQuery<Ov::RnPhotoFormat>(builder);
@@ -127,23 +123,26 @@ protected:
     std::vector<RnRef<Ov::RnCastable>> sources;
 };
 
-TEST_P(Devices, AreReadAndWrittenAsMemoryIs) {
-    for (const auto& object : sources) {
-        const std::string saved = savedIn(memory, *object);
-        EXPECT_EQ(savedIn(GetParam().make, *object), saved);
-        for (const Form form : {Form::text, Form::binary}) {
+using Kinds = testing::Types<PlainDevice, DripDevice>;
+TYPED_TEST_SUITE(Devices, Kinds);
+
+TYPED_TEST(Devices, AreReadAndWrittenAsMemoryIs) {
+    for (const auto& object : this->sources) {
+        const std::string saved = this->savedIn(memory, *object);
+        EXPECT_EQ(this->savedIn(this->tested, *object), saved);
+        for (const auto form : {Ov::RnStream::Form::text, Ov::RnStream::Form::binary}) {
             const Device device = memory({});
             Ov::RnStream(device.get(), form) << 7 << object.get() << std::wstring(L"end");
-            const std::string bytes = all(device);
+            const std::string bytes = this->all(device);
             int before = 0;
             device->seek(0, 0);
             Ov::RnStream again(device.get(), form);
             again >> before;
             const auto same = again.readObject(nullptr);
             const bool isWeb = !!Ov::rnQuery<Ov::RnPhotoWebData>(same.get());  // which keeps no candela
-            EXPECT_TRUE(isWeb || savedIn(memory, *same) == saved);
+            EXPECT_TRUE(isWeb || this->savedIn(memory, *same) == saved);
             for (std::size_t size = bytes.size(); size > 0; size -= 1 + size / 20)
-                readsAsMemory(bytes.substr(0, size));
+                this->readsAsMemory(bytes.substr(0, size));
         }
     }
     for (const char* folder : {"/tests/data", "/examples"})
@@ -151,23 +150,11 @@ TEST_P(Devices, AreReadAndWrittenAsMemoryIs) {
             if (!entry.is_regular_file()) continue;
             std::ifstream file(entry.path(), std::ios::binary);
             const std::string bytes{std::istreambuf_iterator<char>(file), {}};
-            readsAsMemory(bytes);
-            readsAsMemory(withLineEnds(bytes, "\r"));
-            readsAsMemory(withLineEnds(bytes, "\r\n"));
-            readsAsMemory(bytes.substr(0, bytes.size() / 2));
+            for (const std::string& each : {bytes, withLineEnds(bytes, "\r"), withLineEnds(bytes, "\r\n"),
+                                            bytes.substr(0, bytes.size() / 2)})
+                this->readsAsMemory(each);
         }
 }
-
-INSTANTIATE_TEST_SUITE_P(Kinds, Devices,
-                         testing::Values(DeviceKind{"plain",
-                                                    [](std::string_view bytes) -> Device {
-                                                        return Ov::rnCreate<PlainDevice>(bytes);
-                                                    }},
-                                         DeviceKind{"drip",
-                                                    [](std::string_view bytes) -> Device {
-                                                        return Ov::rnCreate<DripDevice>(std::string(bytes));
-                                                    }}),
-                         [](const auto& each) { return each.param.name; });
 
 }  // namespace
 }  // namespace OvPhotometrics

@@ -148,10 +148,12 @@ protected:
         return spared([&] { return std::make_unique<Ov::RnStream>(&io, Form::text); });
     }
 
+    /// Whether there is a clone, which saves the same.
     template <class Interface>
     static bool clones(Ov::RnCastable& object) {
         const auto original = Ov::rnQuery<Interface>(&object);
-        return original && original->clone();
+        const auto clone = original ? original->clone() : RnRef<Interface>();
+        return clone && spared([&] { return saved(*clone) == saved(object); });
     }
 
     RnRef<Ov::RnCastable> lamp(auto lamp, int number) {

@@ -164,10 +164,7 @@ TEST(PlotPicture, HasTheSizeAndTheFormatThatWereAskedFor) {
     // A ring of 50 candela: all points as far from their middle.
     const Path circle = longestPath(svg);
     ASSERT_GT(circle.size(), 30U);
-    Box box{900, 750, 0, 0};
-    for (const Point& p : circle)
-        box = {std::min(box.left, p.x), std::min(box.top, p.y), std::max(box.right, p.x),
-               std::max(box.bottom, p.y)};
+    const Box box = extentOf(circle);
     for (const Point& p : circle) EXPECT_NEAR(distance(p, box.centre()), box.width() / 2, 0.1);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <regex>
 #include <string>
 
@@ -16,4 +17,13 @@ inline OvPlot::Path longestPath(const std::string& svg) {
     for (std::sregex_iterator match(longest.begin(), longest.end(), point), end; match != end; ++match)
         points.push_back({std::stod((*match)[1]), std::stod((*match)[2])});
     return points;
+}
+
+/// What holds all points of a path.
+inline OvPlot::Box extentOf(const OvPlot::Path& path) {
+    OvPlot::Box box{1e9, 1e9, 0, 0};
+    for (const OvPlot::Point& p : path)
+        box = {std::min(box.left, p.x), std::min(box.top, p.y), std::max(box.right, p.x),
+               std::max(box.bottom, p.y)};
+    return box;
 }

@@ -58,19 +58,6 @@ TEST(ToolInfo, TellsTheWebInJson) {
               R"("unit":"cd","fileUnit":"cd"})");
 }
 
-TEST(ToolInfo, ARefusedFileStopsNothingAndHasItsLine) {
-    TempFolder folder;
-    folder.write("bad.ies", IesFile{.horizontals = {0, 45}}.text());
-    const ToolResult result =
-        runTool("info --json bad.ies none.ies " + sourceFolder() + "/examples/downlight.ies", folder);
-    EXPECT_EQ(result.status, 1);
-    const auto objects = result.json();
-    EXPECT_NE(objects.at(0)["error"].get<std::string>().find("45"), std::string::npos);
-    EXPECT_EQ(objects.at(1)["file"], "none.ies");
-    EXPECT_EQ(objects.at(2)["symmetry"], "Axial");
-    EXPECT_EQ(result.err.find("bad.ies: "), 0U);
-}
-
 /// The two angles that `info` prints for a plane.
 std::pair<double, double> printedAngles(const ToolResult& result, const std::string& plane) {
     std::smatch found;

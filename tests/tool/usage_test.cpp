@@ -75,11 +75,15 @@ TEST_F(ToolUsage, WhatCannotBeReadIsToldByEveryCommand) {
           "letter.txt: not a photometric file of a known format", "cut.ies: "}) {
         if (windowsTool() && text.starts_with("/dev")) continue;
         for (std::string command :
-             {"info @", "info --json @", "intensity @ 0,0", "convert --as-saved @ out.ies"}) {
+             {"info @", "info --json @ good.ies", "intensity @ 0,0", "convert --as-saved @ out.ies"}) {
             command.replace(command.find('@'), 1, text, 0, text.find(':'));
             const ToolResult result = runTool(command, folder);
             EXPECT_EQ(result.status, 1) << command;
             EXPECT_NE(result.err.find(text), std::string::npos) << command << result.err;
+            if (command.find("good") == command.npos) continue;
+            EXPECT_EQ(result.json().at(0)["file"].get<std::string>(), text.substr(0, text.find(':')));
+            EXPECT_NE(result.json().at(0)["error"].get<std::string>(), "");
+            EXPECT_EQ(result.json().at(1)["symmetry"], "Axial");  // what is refused stops nothing
         }
     }
     EXPECT_FALSE(std::filesystem::exists(folder.path() / "out.ies"));

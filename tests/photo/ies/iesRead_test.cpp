@@ -64,6 +64,8 @@ TEST_F(IesRead, EachFaultHasItsMessage) {
         {IesText{.tilt = " lost.tlt\n"}.text(), "12957  lost.tlt", "no tilt file"},
     };
     refuses(IesText{}.text(), cases);
+    contentTestIs(true, {"IESNA91", "a\nb\nTILT=NONE", "iesna91\r\nTILT="});
+    contentTestIs(false, {"IESNA9", "", "a TILT=", "a\rTILT=NONE\r", "\n\nTILT"});
 }
 
 TEST_F(IesRead, AcceptsWhatMakersWrite) {
@@ -127,11 +129,6 @@ TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
     EXPECT_EQ(tiltPath("bad.tlt"), L"refused");
     EXPECT_EQ(tiltPath("folder"), L"refused");
     Ov::setPathList(L"WebPathList", {});
-}
-
-TEST_F(IesRead, ContentTestKeepsThePosition) {
-    contentTestIs(true, {"IESNA91", "a\nb\nTILT=NONE", "iesna91\r\nTILT="});
-    contentTestIs(false, {"IESNA9", "", "a TILT=", "a\rTILT=NONE\r", "\n\nTILT"});
 }
 
 }  // namespace

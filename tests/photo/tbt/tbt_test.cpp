@@ -81,6 +81,8 @@ TEST_F(Tbt, EachFaultHasItsMessage) {
         {"t\n3\n1 1 1\n1e-6 1000 1 1 5 0\n1 2 1\n3e38 Z0\n-1", "12935", "the candela for its flux overflows"},
     };
     refuses(TbtText{}.text(), cases);
+    contentTestIs(true, {"Spot\n3", "/**/\na b\r6.5 x"});
+    contentTestIs(false, {"a\n7", "a\nZ0", "3", "", "a\n4294967299"});
 }
 
 TEST_F(Tbt, AcceptsWhatTheGrammarAllows) {
@@ -144,6 +146,9 @@ TEST_F(Tbt, SymmetryCodesAreWebsOfEvenAngles) {
         EXPECT_EQ(web->getCandela(0, 1), 0.5f);
         EXPECT_EQ(web->getMaxCandela(), 4);
         EXPECT_EQ(web->getLumens(), 1200);
+        const std::string again = saved(*web);
+        EXPECT_TRUE(again.starts_with("QRT photometric web\n3\n1.0000 1.0000 1.0000\n1200.00 1000.00 1.2000"));
+        EXPECT_EQ(imported(again)->getLumens(), 1200);
     }
 }
 
@@ -166,19 +171,6 @@ TEST_F(Tbt, SavesSampleTheWebOnItsOwnSteps) {
         EXPECT_EQ(rec.values, std::vector<float>(90, flux > 0 ? lamp->candela * (1 / 3.0f) : 0));
     }
     EXPECT_THROW(tbtRecordFromDistribution(*Ov::rnCreate<Web>(), rec), Ov::ExBadCast);
-}
-
-TEST_F(Tbt, ASavedWebReadsBack) {
-    const std::string first = saved(*imported(TbtText{.kind = "4 7"}.text()));
-    EXPECT_TRUE(first.starts_with("QRT photometric web\n3\n1.0000 1.0000 1.0000\n1200.00 1000.00 1.2000"));
-    const auto again = imported(first);
-    ASSERT_TRUE(again) << log.take();
-    EXPECT_EQ(again->getLumens(), 1200);
-}
-
-TEST_F(Tbt, ContentTestKeepsThePosition) {
-    contentTestIs(true, {"Spot\n3", "/**/\na b\r6.5 x"});
-    contentTestIs(false, {"a\n7", "a\nZ0", "3", "", "a\n4294967299"});
 }
 
 TEST_F(Tbt, FactsAreCarriedWhereTheReaderAcceptsThem) {
