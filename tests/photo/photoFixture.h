@@ -151,6 +151,14 @@ inline std::size_t longestLine(const std::string& text) {
     return longest;
 }
 
+/// Candela i + 10 j + 1 for vertical index i and horizontal index j.
+inline std::string plainValues(std::size_t verticals, std::size_t horizontals) {
+    std::string all;
+    for (std::size_t j = 0; j < horizontals; ++j)
+        for (std::size_t i = 0; i < verticals; ++i) all += std::to_string(i + 10 * j + 1) + " ";
+    return all;
+}
+
 /// The text of an IES file; a test sets what is odd about it and nothing else.
 struct IesText {
     std::string header = "IESNA91\n[TEST] 1\n";
@@ -159,19 +167,25 @@ struct IesText {
     double lumens = 1000;
     std::vector<double> vertical = {0, 90, 180};
     std::vector<double> horizontal = {0};
-    std::string values = {};  // empty: i + 10 j + 1 for vertical index i and horizontal index j
+    std::string values = {};  // empty: plain values
 
     std::string text() const {
         std::string all = header + "TILT=" + tilt + "1 " + joined({lumens}) + "1 " +
                           std::to_string(vertical.size()) + " " + std::to_string(horizontal.size()) + " " +
                           std::to_string(type) + " 2 0 0 0\n1 1 60\n" + joined(vertical) + "\n" +
                           joined(horizontal) + "\n";
-        if (!values.empty()) return all + values;
-        for (std::size_t j = 0; j < horizontal.size(); ++j)
-            for (std::size_t i = 0; i < vertical.size(); ++i) all += std::to_string(i + 10 * j + 1) + " ";
-        return all;
+        return all + (values.empty() ? plainValues(vertical.size(), horizontal.size()) : values);
     }
 };
+
+/// The text of a CIBSE file whose candela are twice the values.
+inline std::string cibseText(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal,
+                             const std::string& values = "") {
+    const std::string counts = std::to_string(vertical.size()) + "," + std::to_string(horizontal.size());
+    return "CIBSE/1 and more\nMaker\n\n\n\n\n\n\n1 " + std::to_string(type) + " 0 0 0\n2 0 0\n0\n" + counts +
+           "\r\n" + joined(vertical) + joined(horizontal) +
+           (values.empty() ? plainValues(vertical.size(), horizontal.size()) : values) + "99 0 0 0";
+}
 
 /// A direction by angles in degrees.
 inline GeVector3<float> direction(double theta, double psi) {

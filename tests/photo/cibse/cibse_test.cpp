@@ -10,16 +10,6 @@ using Cibse = FormatTest<CibseFormat>;
 
 const std::string head = "CIBSE/1 and more\nMaker\n\n\n\n\n\n\n";
 
-/// A file with values i + 10 j + 1.
-std::string file(int type, const std::vector<double>& vertical, const std::vector<double>& horizontal) {
-    std::string text = head + "1 " + std::to_string(type) + " 0 0 0\n2 0 0\n0\n" +
-                       std::to_string(vertical.size()) + "," + std::to_string(horizontal.size()) + "\r\n" +
-                       joined(vertical) + joined(horizontal);
-    for (std::size_t j = 0; j < horizontal.size(); ++j)
-        for (std::size_t i = 0; i < vertical.size(); ++i) text += std::to_string(i + 10 * j + 1) + " ";
-    return text + "99 0 0 0";
-}
-
 TEST_F(Cibse, EachFaultHasItsMessage) {
     const Refusal cases[] = {
         {"cibse/1\n", "12945 12989"},
@@ -31,18 +21,18 @@ TEST_F(Cibse, EachFaultHasItsMessage) {
         {head + "1 1 0 0 0 1 0 0 0 1", "12945 12960 1"},
         {head + "1 1 0 0 0 1 0 0 0 40000 40000 0 1", "12945 12948  ; 12945 12966"},
         {head + "1 1 0 0 0 1 0 0 0 2 1 0 90 0 1 1 99 x 0 1e99", "12945 12948 x; 12945 12946; 12945 12991"},
-        {file(1, {0, 90}, {0, 90, 45}), "12944"},
-        {file(2, {0, 90}, {270, 0, 90}), "12944"},
-        {file(1, {0, 120}, {0}), "12985"},
-        {file(1, {0, 90}, {0, 90.06}), "12986 90.06"},
-        {file(1, {0, 90}, {90, 180}), "12987 90"},
-        {file(1, {0, 90}, {270}), "12935"},
-        {file(1, {0, 90}, {270, 0, 300, 90}), "12926; 12935"},
-        {file(2, {-91, 0}, {0, 90}), "12982"},
-        {file(2, {-90, 90}, {0}), "12983"},
-        {file(2, {-90, 90}, {0, 91}), "12984"},
+        {cibseText(1, {0, 90}, {0, 90, 45}), "12944"},
+        {cibseText(2, {0, 90}, {270, 0, 90}), "12944"},
+        {cibseText(1, {0, 120}, {0}), "12985"},
+        {cibseText(1, {0, 90}, {0, 90.06}), "12986 90.06"},
+        {cibseText(1, {0, 90}, {90, 180}), "12987 90"},
+        {cibseText(1, {0, 90}, {270}), "12935"},
+        {cibseText(1, {0, 90}, {270, 0, 300, 90}), "12926; 12935"},
+        {cibseText(2, {-91, 0}, {0, 90}), "12982"},
+        {cibseText(2, {-90, 90}, {0}), "12983"},
+        {cibseText(2, {-90, 90}, {0, 91}), "12984"},
     };
-    refuses(file(1, {0, 90}, {0}), cases);
+    refuses(cibseText(1, {0, 90}, {0}), cases);
     contentTestIs(true, {"CIBSE/1"});
     contentTestIs(false, {"", "CIBSE/", " CIBSE/1"});
 }
@@ -67,9 +57,9 @@ TEST_F(Cibse, PlanesAreLitWhereTheFileSays) {
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(joined(c.horizontal));
-        const auto web =
-            imported(file(c.type, c.type == 1 ? std::vector<double>{0, 90, 180} : std::vector<double>{-90, 0, 90},
-                          c.horizontal));
+        const auto web = imported(
+            cibseText(c.type, c.type == 1 ? std::vector<double>{0, 90, 180} : std::vector<double>{-90, 0, 90},
+                      c.horizontal));
         ASSERT_TRUE(web) << log.take();
         EXPECT_EQ(web->getSymmetry(), c.symmetry);
         EXPECT_EQ(web->getPsiCount(), c.psis);
@@ -82,13 +72,13 @@ TEST_F(Cibse, PlanesAreLitWhereTheFileSays) {
 TEST_F(Cibse, SavesGridsThatFitAndSamplesOthers) {
     const std::string first = "CIBSE/1\n \n \n \n \n \n \n \n1 ";
     const std::string factors = " 0 0 0\n1 0 0\n0.00\n";
-    const auto web = imported(file(1, {0, 180}, {0, 90}));
+    const auto web = imported(cibseText(1, {0, 180}, {0, 90}));
     const auto light = distributionOf(*web);
     light->setFlux(2000);
     ASSERT_TRUE(cibseRecordFromDistribution(*light, rec));
     EXPECT_EQ(rec.grid.candelas, (std::vector<float>{0.5f / 12, 1 / 12.0f, 5.5f / 12, 0.5f}));
     EXPECT_TRUE(saved(*web).starts_with(first + "1" + factors + "2 2\n 0.00 180.00\n 0.00 90.00\n "));
-    EXPECT_TRUE(saved(*imported(file(2, {-30, 30}, {-70, 50})))
+    EXPECT_TRUE(saved(*imported(cibseText(2, {-30, 30}, {-70, 50})))
                     .starts_with(first + "2" + factors + "2 2\n 60.00 120.00\n -60.00 60.00\n "));
     EXPECT_EQ(saved(*immortal<CIBSEBuilder>().create()),
               first + "2" + factors + "2 1\n 0.00 180.00\n 0.00\n 0.00 0.00\n99 0 0 0\n");

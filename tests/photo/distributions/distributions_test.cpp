@@ -359,20 +359,5 @@ TEST_F(Distributions, OnlyAWebIsLoadedAsTheWebOfOne) {
     EXPECT_THROW(stream.readObject(nullptr), Ov::ExBadCast);
 }
 
-TEST_F(Distributions, LoadingBringsDerivedValuesUpToDate) {
-    const auto light = makeWebDistribution(*import(IesText{.horizontal = {90, 180, 270}}.text()));
-    light->setPeakIntensity(7);
-    const auto loaded = Ov::rnCreate<Web>();
-    load(*loaded->getCastable(), saved(*light));
-    EXPECT_EQ(loaded->getPeakIntensity(), 7);
-    // The web's text holds relative values, so what stands for the saved web now has a peak of 1.
-    EXPECT_EQ(loaded->getWeb()->getMaxCandela(), 1);
-    EXPECT_GT(light->intensityAtUnit(direction(90, 100)), 0);
-    EXPECT_NEAR(loaded->localIntensity(1, 1), light->localIntensity(1, 1), 7 * 0.01);
-
-    EXPECT_ANY_THROW(load(*loaded->getCastable(), "5 1 2 3 4 1\nno object"));
-    EXPECT_EQ(loaded->getPeakIntensity(), 7);
-}
-
 }  // namespace
 }  // namespace OvPhotometrics

@@ -1,17 +1,18 @@
+#include "components/photo/distributions/isotropic.h"
 #include "tests/photo/photoFixture.h"
 
-// What the reader accepts and refuses, and with which messages.
+// What the reader accepts and refuses, and with which messages; from a file's angles to a web; what a save writes.
 
 namespace OvPhotometrics {
 namespace {
 
-using IesRead = FormatTest<IesFormat>;
+using Ies = FormatTest<IesFormat>;
 
 std::string numbers(const std::string& text) { return "TILT=NONE\n" + text; }
 std::string tilted(const std::string& block) { return IesText{.tilt = "INCLUDE\n" + block + "\n"}.text(); }
 std::string graded(const std::string& values) { return IesText{.values = values}.text(); }
 
-TEST_F(IesRead, EachFaultHasItsMessage) {
+TEST_F(Ies, EachFaultHasItsMessage) {
     const Refusal cases[] = {
         {"", "12945 12956", "empty file"},
         {"IESNA91\n[TEST] tilt\n", "12945 12956", "no TILT line"},
@@ -68,7 +69,7 @@ TEST_F(IesRead, EachFaultHasItsMessage) {
     contentTestIs(false, {"IESNA9", "", "a TILT=", "a\rTILT=NONE\r", "\n\nTILT"});
 }
 
-TEST_F(IesRead, AcceptsWhatMakersWrite) {
+TEST_F(Ies, AcceptsWhatMakersWrite) {
     const std::string plain = IesText{}.text();
     const std::string expected = saved(*imported(plain));
     std::string commas = plain;
@@ -97,14 +98,14 @@ TEST_F(IesRead, AcceptsWhatMakersWrite) {
     }
 }
 
-TEST_F(IesRead, HeaderLinesAreKeptInPieces) {
+TEST_F(Ies, HeaderLinesAreKeptInPieces) {
     ASSERT_TRUE(read(IesText{.header = "IESNA91\n\n" + std::string(200, 'x') + "\n"}.text()));
     const IesLines expected = {L"IESNA91", L"", std::wstring(80, L'x'), std::wstring(80, L'x'),
                                std::wstring(40, L'x')};
     EXPECT_EQ(rec.lines, expected);
 }
 
-TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
+TEST_F(Ies, TiltFilesAreFoundAndNamed) {
     TempFolder beside, listed;
     beside.write("a.tlt", "1 2 0 90 1 1");
     const std::wstring inList = listed.write("b.tlt", "1\n2\n0 90\n1 1\n");
@@ -129,6 +130,136 @@ TEST_F(IesRead, TiltFilesAreFoundAndNamed) {
     EXPECT_EQ(tiltPath("bad.tlt"), L"refused");
     EXPECT_EQ(tiltPath("folder"), L"refused");
     Ov::setPathList(L"WebPathList", {});
+}
+
+IesText angles(int type, std::vector<double> vertical, std::vector<double> horizontal) {
+    return {.type = type, .vertical = std::move(vertical), .horizontal = std::move(horizontal)};
+}
+
+TEST_F(Ies, AnglesChooseTheLayout) {
+    using enum PhotoWebSymmetry;
+    const struct {
+        const char* name;
+        IesText file;
+        PhotoWebSymmetry symmetry;
+        int psis;
+        double lastPsi, firstTheta;  // degrees
+        bool truncated, turned;
+    } cases[] = {
+        {"one plane", {.horizontal = {0}}, Axial, 1, 0, 0, false, false},
+        {"planes 0 and 360", {.horizontal = {0, 360}}, Axial, 1, 0, 0, false, false},
+        {"quarter", {.horizontal = {0, 45, 90}}, Quarter, 3, 90, 0, false, false},
+        {"half", {.horizontal = {0, 90, 180}}, Half, 3, 180, 0, false, false},
+        {"closed circle", {.horizontal = {0, 90, 180, 270, 360}}, Full, 4, 270, 0, false, false},
+        {"open circle", {.horizontal = {0, 90, 180, 270}}, Full, 4, 270, 0, false, false},
+        {"planes 90 to 270", {.horizontal = {90, 180, 270}}, Half, 3, 180, 0, false, true},
+        {"within the tolerance", angles(1, {90.2, 179.8}, {0.2, 89.8}), Quarter, 2, 89.8, 90.2, false, false},
+        {"at the tolerance", angles(1, {0, 89.75}, {0, 89.75}), Quarter, 2, 89.75, 0, false, false},
+        {"closed at the tolerance", {.horizontal = {0, 90, 180, 270, 360.25}}, Full, 4, 270, 0, false, false},
+        {"type A, at the tolerance", angles(3, {-90, 90}, {-90.25, 0, 90}), Full, 3, 180.25, 0, true, true},
+        {"type B, one side", angles(2, {-90, 0, 90}, {0, 45, 90}), Half, 3, 90, 0, true, false},
+        {"type B, both sides", angles(2, {-90, 0, 90}, {-90, 0, 90}), Full, 3, 180, 0, true, true},
+        {"type A, 0 to 180", angles(3, {0, 90, 180}, {-60, 0, 60}), Full, 3, 120, 0, true, true},
+        {"type A, part", angles(3, {-40, 50}, {-30, 10}), Full, 2, 40, 50, true, true},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        const auto web = import(c.file.text());
+        ASSERT_TRUE(web) << log.take();
+        EXPECT_EQ(web->getSymmetry(), c.symmetry);
+        EXPECT_EQ(web->getPsiCount(), c.psis);
+        EXPECT_FLOAT_EQ(web->getPsiRange().last, toRadians(c.lastPsi));
+        EXPECT_FLOAT_EQ(web->getThetaRange().first, toRadians(c.firstTheta));
+        EXPECT_EQ(web->isPsiTruncated(), c.truncated);
+        EXPECT_EQ(web->hasIdentityOrientation(), !c.turned);
+    }
+}
+
+TEST_F(Ies, LateralFilesAreLitWhereTheirAnglesSay) {
+    IesText typeA = angles(3, {-90, 0, 90}, {-60, 0, 60}), typeB = angles(2, {-90, 0, 90}, {-80, 0, 80});
+    typeA.values = "0 2 0 0 5 0 0 3 0";
+    typeB.values = "0 1 0 0 9 0 0 1 0";  // its axis lies at -Y
+    const auto a = distributionOf(*import(typeA.text())), b = distributionOf(*import(typeB.text()));
+    EXPECT_NEAR(b->intensityAtUnit({0, -1, 0}), 9, 1e-4);
+    for (const auto& [psi, candela] : {std::pair(0.0, 5), {-59.999, 2}, {59.999, 3}, {-61, 0}, {61, 0}, {180, 0}})
+        EXPECT_NEAR(a->intensityAtUnit(direction(90, psi)), candela, 1e-4) << psi;
+}
+
+TEST_F(Ies, FactorsMultiplyAndZeroIsDark) {
+    const std::string tail = " 0 90 0 10 20";
+    const auto factors = import("TILT=NONE\n2 500 3 2 1 1 2 0 0 0 0.5 2 60" + tail);
+    ASSERT_TRUE(factors);
+    EXPECT_EQ(factors->getMaxCandela(), 60);
+    EXPECT_EQ(factors->getLumens(), 1000);
+    const auto dark = import("TILT=NONE\n2 500 3 2 1 1 2 0 0 0 1 0 60" + tail);
+    ASSERT_TRUE(dark);
+    EXPECT_EQ(dark->getMaxCandela(), 0);
+    EXPECT_EQ(dark->getLumens(), 0);
+    EXPECT_EQ(dark->getIntensity(0.5f, 0), 0);
+}
+
+const char* const head = "IESNA91\n[TEST]     Test unknown\n[MANUFAC]  Manufacturing company unknown\nTILT=NONE\n";
+
+TEST_F(Ies, CopiesAGridWithRelativeValues) {
+    const auto web =
+        import(IesText{.vertical = {0, 45, 90}, .horizontal = {0, 180}, .values = "8 4 1 8 0.1 -1"}.text());
+    EXPECT_EQ(saved(*web), std::string(head) +
+                               "1 1000.00 1\n3 2\n1\n2\n0 0 0\n1 1 0\n 0.00 45.00 90.00\n 0.00 180.00\n"
+                               " 1.00 0.50 0.12\n 1.00 0.01 -0.12\n");
+}
+
+TEST_F(Ies, CentresALateralGrid) {
+    const std::string text =
+        saved(*import(IesText{.type = 3, .vertical = {-30, 0, 30}, .horizontal = {-70, -10, 50}}.text()));
+    EXPECT_NE(text.find("\n3\n2\n0 0 0\n1 1 0\n 60.00 90.00 120.00\n -60.00 0.00 60.00\n"), std::string::npos)
+        << text;
+    const auto oneSide = import(IesText{.type = 2, .vertical = {-30, 0, 30}, .horizontal = {0, 90}}.text());
+    EXPECT_NE(saved(*oneSide).find("3 2\n3\n"), std::string::npos);
+}
+
+TEST_F(Ies, SamplesWhatDoesNotFit) {
+    const auto lamp = Ov::rnCreate<Isotropic>();
+    lamp->setFlux(1000);
+    ASSERT_TRUE(iesRecordFromDistribution(*lamp, rec));
+    EXPECT_EQ(rec.grid.verticalCount, 19);
+    EXPECT_EQ(rec.grid.horizontalCount, 1);
+    EXPECT_EQ(rec.lumensPerLamp, lamp->getFlux());
+    for (const float candela : rec.grid.candelas) EXPECT_EQ(candela, lamp->candela);
+    const auto web = import(written(rec));
+    ASSERT_TRUE(web) << log.take();
+    EXPECT_EQ(web->getSymmetry(), PhotoWebSymmetry::Axial);
+}
+
+TEST_F(Ies, ASavedGridSavesTheSameAgain) {
+    for (const IesText& file :
+         {IesText{.vertical = {0, 22.125, 90}, .horizontal = {0, 30.5, 90}}, IesText{.horizontal = {90, 180, 270}},
+          IesText{.lumens = -1, .horizontal = {0, 90, 180, 270, 360}}}) {
+        const std::string first = saved(*import(file.text()));
+        const auto again = import(first);
+        ASSERT_TRUE(again) << log.take();
+        EXPECT_EQ(saved(*again), first);
+    }
+}
+
+TEST_F(Ies, BreaksListsBeforeTheirLimit) {
+    ASSERT_TRUE(candelaGridAlloc(rec.grid, 100, 3));
+    const std::string text = written(rec);
+    EXPECT_EQ(longestLine(text), 132u);
+    const std::string lists = text.substr(text.find("\n 0.00"));
+    EXPECT_EQ(std::count(lists.begin(), lists.end(), ' '), 100 + 3 + 300);
+}
+
+TEST_F(Ies, TiltAndEmptyRecords) {
+    rec.tiltKind = IesTiltKind::include;
+    rec.tilt = {2, {0, 90}, {1, 0.5f}};
+    EXPECT_EQ(written(rec),
+              "TILT=INCLUDE\n 2\n 2\n 0.00 90.00\n 1.00 0.50\n1 -1.00 1\n2 1\n1\n2\n0 0 0\n1 1 0\n0.0 "
+              "180.0\n0.0\n0.0 0.0\n");
+    rec.tiltKind = IesTiltKind::file;
+    rec.tiltFile = L"a.tlt";
+    EXPECT_TRUE(written(rec).starts_with("TILT=" + std::string(70, ' ') + "a.tlt\n"));
+    const auto empty = immortal<IESBuilder>().create();
+    EXPECT_NE(saved(*empty).find("2 1\n"), std::string::npos);
 }
 
 }  // namespace
