@@ -33,6 +33,11 @@ std::string readFrom(RnRef<RnBufferedIO> device, const wchar_t* format, T value 
     return outcome(count, value, readRest(*device));
 }
 
+/// Memory, and devices that show a byte at a time or none.
+std::vector<RnRef<RnBufferedIO>> devicesOf(const std::string& bytes) {
+    return {rnCreate<RnMemoryBuffer>(bytes), rnCreate<DripDevice>(bytes), rnCreate<PlainDevice>(bytes)};
+}
+
 /// Reads the input of each row "input|value|rest" as a whole, byte by byte, and with white space and more around
 /// it. What has no value does not convert.
 template <class T>
@@ -43,9 +48,7 @@ void expectRows(const wchar_t* format, std::initializer_list<const char*> rows) 
         for (const char* more : {"", "\n;"}) {
             const std::string input = (*more ? " \t\r\n\v\f" : "") + row3[0] + more;
             const std::string expected = outcome(!row3[1].empty(), value, row3[2] + more);
-            EXPECT_EQ(readFrom<T>(rnCreate<RnMemoryBuffer>(input), format), expected) << row;
-            EXPECT_EQ(readFrom<T>(rnCreate<DripDevice>(input), format), expected) << row;
-            EXPECT_EQ(readFrom<T>(rnCreate<PlainDevice>(input), format), expected) << row;
+            for (const auto& device : devicesOf(input)) EXPECT_EQ(readFrom<T>(device, format), expected) << row;
         }
     }
 }
@@ -77,8 +80,7 @@ TEST(FormattedRead, Numbers) {
 void expectAsTheLibraryReads(const std::string& text) {
     const float single = std::strtof(text.c_str(), nullptr);
     const auto expected = std::isfinite(single) ? outcome(1, single, " .") : outcome(0, 77, " .");
-    EXPECT_EQ(readFrom<float>(rnCreate<RnMemoryBuffer>(text + " ."), L"%f"), expected) << text;
-    EXPECT_EQ(readFrom<float>(rnCreate<PlainDevice>(text + " ."), L"%f"), expected) << text;
+    for (const auto& device : devicesOf(text + " .")) EXPECT_EQ(readFrom<float>(device, L"%f"), expected) << text;
     EXPECT_EQ(readFrom<double>(rnCreate<RnMemoryBuffer>(text + " ."), L"%lf"),
               outcome(1, std::strtod(text.c_str(), nullptr), " ."));
 }
@@ -112,9 +114,7 @@ TEST(FormattedRead, Texts) {
           "%*s %s|one two|1|two|", "%*2d%s|12345|1|345|", "In: %s\n|In:Out \n\n x|1|Out|x",
           "  50%% %s|50 \t% y|1|y|", "In: %s|Im: y|0|?|m: y", "In: %s|In|-1|?|"}) {
         const auto c = cells(row);
-        for (const RnRef<RnBufferedIO>& device :
-             {RnRef<RnBufferedIO>(rnCreate<RnMemoryBuffer>(c[1])), RnRef<RnBufferedIO>(rnCreate<DripDevice>(c[1])),
-              RnRef<RnBufferedIO>(rnCreate<PlainDevice>(c[1]))}) {
+        for (const auto& device : devicesOf(c[1])) {
             wchar_t text[90] = L"?";
             RnStream stream(device.get(), RnStream::Form::binary);
             const std::string count = std::to_string(stream.formattedRead(fromUtf8(c[0]).c_str(), text));

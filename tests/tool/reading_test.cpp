@@ -101,7 +101,9 @@ TEST(ToolIntensity, AnglesAreThoseOfTheFileEverywhere) {
             for (const double angle : *list) text += std::to_string(angle) + "\n";
         for (std::size_t j = 0; j < horizontals.size(); ++j)
             for (std::size_t i = 0; i < verticals.size(); ++i)
-                text += std::to_string(horizontals[j] == horizontals[0] + 360 ? 10 + i : 10 + i + 5 * j) + "\n";
+                text += std::to_string(std::fmod(horizontals[j] - horizontals[0], 360) == 0 ? 10 + i
+                                                                                            : 10 + i + 5 * j) +
+                        "\n";
         return text;
     };
     using Angles = std::vector<double>;
@@ -110,10 +112,18 @@ TEST(ToolIntensity, AnglesAreThoseOfTheFileEverywhere) {
         int type;
         Angles verticals, horizontals;
     } cases[] = {
-        {0, 1, {0, 30, 90}, {90, 135.5, 180, 270}}, {0, 1, {90, 120, 180}, {0, 90, 180, 270, 360}},
-        {0, 3, {-70.3, 0, 70}, {-40.7, 0, 20.1}},   {0, 3, {-90, 0, 90}, {0, 30, 60}},
-        {0, 2, {-45, 0, 60}, {-30, 0, 80}},         {0, 2, {-45, 0, 60}, {0, 30, 80}},
-        {1, 1, {0, 45, 90}, {270, 300, 0, 90}},     {1, 2, {-90, 0, 90}, {-30, 0, 60.5}},
+        {0, 1, {0, 30, 90}, {90, 135.5, 180, 270}},
+        {0, 1, {90, 120, 180}, {0, 90, 180, 270, 360}},
+        {0, 3, {-70.3, 0, 70}, {-40.7, 0, 20.1}},
+        {0, 3, {-90, 0, 90}, {0, 30, 60}},
+        {0, 2, {-45, 0, 60}, {-30, 0, 80}},
+        {0, 2, {-45, 0, 60}, {0, 30, 80}},
+        {1, 1, {0, 45, 90}, {270, 300, 0, 90}},
+        {1, 1, {0, 90, 180}, {270, 0, 90, 180, 270}},
+        {1, 1, {0, 90, 180}, {90, 180, 270}},
+        {1, 1, {0, 90, 180}, {270, 330, 0, 30, 90}},
+        {1, 1, {0, 90, 180}, {270, 0, 90, 180, 269}},
+        {1, 2, {-90, 0, 90}, {-30, 0, 60.5}},
         {1, 2, {-90, 0, 90}, {0, 45, 90}},
     };
     TempFolder folder;

@@ -37,38 +37,6 @@ TEST_F(Cibse, EachFaultHasItsMessage) {
     contentTestIs(false, {"", "CIBSE/", " CIBSE/1"});
 }
 
-TEST_F(Cibse, PlanesAreLitWhereTheFileSays) {
-    using enum PhotoWebSymmetry;
-    const struct {
-        int type;
-        std::vector<double> horizontal;
-        PhotoWebSymmetry symmetry;
-        int psis;
-        std::vector<double> directions;  // horizontal angles of the values at the middle vertical angle
-    } cases[] = {
-        {1, {0, 45, 90.04}, Quarter, 3, {0, 45, 90}},
-        {1, {0, 90, 180, 270, 360}, Full, 4, {0, 90, 180, 270}},
-        {1, {90, 180, 270}, Half, 3, {90, 180, 270}},
-        {1, {270, 330, 0, 30, 90}, Half, 5, {270, 330, 0, 30, 90}},
-        {1, {270, 0, 90, 180, 270}, Full, 4, {270, 0, 90, 180}},
-        {1, {270, 0, 90, 180, 269}, Full, 5, {270, 0, 90, 180, 269}},
-        {1, {270, 360, 90, 225}, Full, 4, {270, 0, 90, 225}},
-        {2, {-70, 0, 80}, Full, 3, {-1, -90}},  // turned: the axis lies at -Y
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(joined(c.horizontal));
-        const auto web = imported(
-            cibseText(c.type, c.type == 1 ? std::vector<double>{0, 90, 180} : std::vector<double>{-90, 0, 90},
-                      c.horizontal));
-        ASSERT_TRUE(web) << log.take();
-        EXPECT_EQ(web->getSymmetry(), c.symmetry);
-        EXPECT_EQ(web->getPsiCount(), c.psis);
-        const auto light = distributionOf(*web);
-        for (std::size_t j = c.type == 1 ? 0 : 1; j < c.directions.size(); ++j)
-            EXPECT_NEAR(light->intensityAtUnit(direction(90, c.directions[j])), 2 * (10.0 * double(j) + 2), 0.05);
-    }
-}
-
 TEST_F(Cibse, SavesGridsThatFitAndSamplesOthers) {
     const std::string first = "CIBSE/1\n \n \n \n \n \n \n \n1 ";
     const std::string factors = " 0 0 0\n1 0 0\n0.00\n";
