@@ -31,9 +31,6 @@ struct Diagram {
     std::optional<double> height;       // of the luminaire over the plane that it lights, or the farthest one, m
 };
 
-/// How many luminaires one diagram tells apart.
-inline constexpr std::size_t mostSubjects = 8;
-
 /// @{
 /// Intensities in planes through the axis, of one luminaire or several.
 void drawPolar(Canvas& canvas, const Diagram& diagram);

@@ -7,7 +7,7 @@
 #include "components/support/path.h"
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/fileAngles.h"
-#include "tools/ovphoto/lightFile.h"
+#include "tools/ovphoto/luminaireFile.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
 #include "tools/ovphoto/webTexts.h"
@@ -27,9 +27,9 @@ InputFiles inputsOf(const ReadResult& source) {
 }
 
 /// Writes what was read as another file in memory.
-std::optional<LightFile> writeAnew(const Conversion& conversion, const HostSession& session,
-                                   const ReadResult& source, const std::vector<Fact>& facts, const WebLight& light,
-                                   std::vector<std::string>& messages) {
+std::optional<LuminaireFile> writeAnew(const Conversion& conversion, const HostSession& session,
+                                       const ReadResult& source, const std::vector<Fact>& facts,
+                                       const WebLight& light, std::vector<std::string>& messages) {
     if (!conversion.asSaved)
         return makeFile(session, conversion.out, *conversion.target, *light, FileForm::faithful, facts, messages);
     const auto asRead = session.distribute(*source.web, source.web->getLumens());
@@ -41,7 +41,7 @@ void append(std::vector<std::string>& all, std::vector<std::string> texts) {
 }
 
 void reportLoss(ConversionReport& report, const Conversion& conversion, RnWebIntensityDist& light,
-                const LightFile& made) {
+                const LuminaireFile& made) {
     const ConversionLoss loss = measureLoss(light, *made.light);
     report.loss = {static_cast<float>(loss.candela), static_cast<float>(loss.candelaPercent),
                    static_cast<float>(loss.fluxPercent)};
@@ -50,7 +50,7 @@ void reportLoss(ConversionReport& report, const Conversion& conversion, RnWebInt
 
 /// What the output does not hold of the source, the flux of its lamps included.
 std::vector<ConversionReport::Dropped> droppedOf(const ReadResult& source, const Format& target,
-                                                 const LightFile& made) {
+                                                 const LuminaireFile& made) {
     std::vector<ConversionReport::Dropped> dropped;
     for (const Fact& fact : droppedFacts(source.facts, made.facts))
         dropped.push_back({toUtf8(fact.key), toUtf8(fact.text)});

@@ -8,8 +8,8 @@
 #include "ovphoto/classIds.h"
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/messageCollector.h"
+#include "tools/ovphoto/placeAndTime.h"
 
 namespace OvTool {
 
@@ -36,10 +36,10 @@ bool isForeign(const std::string& start) {
     return formOf(start) == RnStream::Form::binary && start.substr(0, 2) != std::string("\1\0", 2);
 }
 
-bool loadFrom(RnNaturalLight& light, RnBufferedIO& io, std::vector<std::string>& reasons) {
+bool loadFrom(RnNaturalLight& naturalLight, RnBufferedIO& io, std::vector<std::string>& reasons) {
     const std::string start = peek(io);
     RnStream stream(&io, formOf(start));
-    if (!rnCast<RnPersistant>(&light)->load(stream, 0, nullptr, nullptr)) return false;
+    if (!rnCast<RnPersistant>(&naturalLight)->load(stream, 0, nullptr, nullptr)) return false;
     if (isForeign(start))
         reasons.push_back(inLanguage("of an unknown version; the defaults are taken",
                                      "von unbekannter Version; es gelten die Vorgaben"));
@@ -54,18 +54,18 @@ std::string rangeNote(const char* what, float value, const char* unit, float tak
 
 }  // namespace
 
-RnRef<RnNaturalLight> createLight(const HostSession& session) {
+RnRef<RnNaturalLight> createDaylight(const HostSession& session) {
     const auto object = session.manager().createObject(OvPhotometrics::classIds::naturalLight);
     if (!object) throw ExModule("the module builds no natural light");
     return rnCast<RnNaturalLight>(object.get());
 }
 
-bool loadLight(RnNaturalLight& light, const std::string& file, std::vector<std::string>& reasons) {
+bool loadDaylight(RnNaturalLight& naturalLight, const std::string& file, std::vector<std::string>& reasons) {
     std::string error;
     try {
         const MessageCollector collector(reasons);
         const RnRef<RnBufferedIO> io = openFile(file, error);
-        if (io && loadFrom(light, *io, reasons)) return true;
+        if (io && loadFrom(naturalLight, *io, reasons)) return true;
     } catch (...) {
         error = inLanguage("cannot be read: ", "nicht lesbar: ") + currentExceptionText();
     }
@@ -74,16 +74,16 @@ bool loadLight(RnNaturalLight& light, const std::string& file, std::vector<std::
     return false;
 }
 
-std::string savedLight(RnNaturalLight& light, RnStream::Form form) {
+std::string savedDaylight(RnNaturalLight& naturalLight, RnStream::Form form) {
     const auto buffer = rnCreate<RnMemoryBuffer>();
     RnStream stream(buffer.get(), form);
-    rnCast<RnPersistant>(&light)->save(stream);
+    rnCast<RnPersistant>(&naturalLight)->save(stream);
     return buffer->bytes();
 }
 
-std::vector<std::string> outOfRange(const RnNaturalLight& light) {
+std::vector<std::string> outOfRange(const RnNaturalLight& naturalLight) {
     NaturalLightSettings settings;
-    light.getSettings(settings);
+    naturalLight.getSettings(settings);
     std::vector<std::string> notes;
     const auto check = [&](const char* what, float value, const char* unit, float low, float high, float below,
                            float above) {
@@ -92,16 +92,16 @@ std::vector<std::string> outOfRange(const RnNaturalLight& light) {
     };
     const char* degrees = inLanguage(" deg", " Grad");
     check(inLanguage("day", "Tag"), settings.day, "", 1, 365, 1, 365);
-    check(inLanguage("latitude", "Breite"), light.getLatitude(), degrees, -90, 90, -90, 90);
-    check(inLanguage("longitude", "Länge"), light.getLongitude(), degrees, -180, 180, -180, -180);
-    check(inLanguage("time zone", "Zeitzone"), light.getTimeZone(), degrees, -180, 180, -180, -180);
+    check(inLanguage("latitude", "Breite"), naturalLight.getLatitude(), degrees, -90, 90, -90, 90);
+    check(inLanguage("longitude", "Länge"), naturalLight.getLongitude(), degrees, -180, 180, -180, -180);
+    check(inLanguage("time zone", "Zeitzone"), naturalLight.getTimeZone(), degrees, -180, 180, -180, -180);
     check(inLanguage("sky cover", "Bedeckung"), settings.skyCover, "", 0, 1, 0, 1);
     return notes;
 }
 
-std::string siteText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
-    return latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude()) + ", " +
-           utcText(functions, light.getTimeZoneHours());
+std::string siteText(const RnNaturalLight& naturalLight, const OvPhotometrics::NumberedFunctions& functions) {
+    return latitudeText(naturalLight.getLatitude()) + ", " + longitudeText(naturalLight.getLongitude()) + ", " +
+           utcText(functions, naturalLight.getTimeZoneHours());
 }
 
 const char* skyText(float cover) {
@@ -110,12 +110,12 @@ const char* skyText(float cover) {
                             : inLanguage("overcast", "bedeckt");
 }
 
-std::string dateText(const RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+std::string dateText(const RnNaturalLight& naturalLight, const OvPhotometrics::NumberedFunctions& functions) {
     const std::string day =
-        inLanguage("day ", "Tag ") + std::to_string(static_cast<std::int16_t>(light.getDayOfYear()));
-    if (light.getMonth() == 0) return day;
-    const std::string month = toUtf8(functions.getMonthName(light.getMonth()));
-    return std::to_string(light.getDayOfMonth()) + inLanguage(" ", ". ") + month + ", " + day;
+        inLanguage("day ", "Tag ") + std::to_string(static_cast<std::int16_t>(naturalLight.getDayOfYear()));
+    if (naturalLight.getMonth() == 0) return day;
+    const std::string month = toUtf8(functions.getMonthName(naturalLight.getMonth()));
+    return std::to_string(naturalLight.getDayOfMonth()) + inLanguage(" ", ". ") + month + ", " + day;
 }
 
 }  // namespace OvTool

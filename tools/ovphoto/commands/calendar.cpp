@@ -5,8 +5,8 @@
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/naturalLight.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/table.h"
 
 namespace OvTool {

@@ -6,7 +6,7 @@
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/commands.h"
 #include "tools/ovphoto/commands/parsedOption.h"
-#include "tools/ovphoto/lightFile.h"
+#include "tools/ovphoto/luminaireFile.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/terminal.h"
 
@@ -55,8 +55,9 @@ RnRef<RnIntensityDist> makeLight(const MakeOptions& options, const HostSession& 
 }
 
 /// Writes the light; none, with the reasons, when there is no file then.
-std::optional<LightFile> writeLight(RnIntensityDist& light, const MakeOptions& options, const HostSession& session,
-                                    const Format& target, std::vector<std::string>& reasons) {
+std::optional<LuminaireFile> writeLight(RnIntensityDist& light, const MakeOptions& options,
+                                        const HostSession& session, const Format& target,
+                                        std::vector<std::string>& reasons) {
     auto made = makeFile(session, options.out, target, light, FileForm::faithful, {}, reasons);
     if (!made) return {};
     const std::string error = made->light ? writeFile(options.out, made->bytes) : made->refusal;

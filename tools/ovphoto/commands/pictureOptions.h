@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/daylightOptions.h"
 
 namespace OvTool {
 
@@ -21,7 +21,7 @@ struct PlotOptions {
     int width = 600;               // pixels
     int rows = 600;
     bool dark = false;
-    LightOptions light;
+    DaylightOptions daylight;
 };
 
 struct ReportOptions {

@@ -71,7 +71,7 @@ bool showsOneFile(PictureKind kind) { return kind != PictureKind::polar && kind 
 
 /// What depends on more than one argument.
 void checkArguments(const PlotOptions& options) {
-    const bool hasSite = !options.light.from.empty() || !options.light.changes.empty();
+    const bool hasSite = !options.daylight.from.empty() || !options.daylight.changes.empty();
     if (isOfSky(options.kind)) {
         if (!options.files.empty()) throw CLI::ValidationError("FILE", "none is wanted with --sky and --sun-path");
         return;
@@ -126,7 +126,7 @@ Action declarePlot(CLI::App& app) {
                "The sun's paths over the site instead, on the 21st of each month",
                {kind, planes, height, app.get_option("--sky")});
     addAsOption(app, options.as);
-    addLightOptions(app, options.light);
+    addDaylightOptions(app, options.daylight);
     app.final_callback([shared] { checkArguments(*shared); });
     return [shared](const HostSession& session) {
         shared->as = sourceFormat(session, shared->as);

@@ -1,11 +1,11 @@
 #include <CLI/CLI.hpp>
 #include <memory>
 
-#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/daylightOptions.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/table.h"
 #include "tools/ovphoto/terminal.h"
 
@@ -17,7 +17,7 @@ namespace {
 
 struct SettingsOptions {
     std::string file;
-    LightOptions light;
+    DaylightOptions naturalLight;
     bool binary = false;
     bool json = false;
 };
@@ -44,19 +44,19 @@ std::string positionText(const NaturalLightSettings& s) {
            angleText(s.solarAzimuth) + " (" + azimuthRule() + ")";
 }
 
-void printText(const RnNaturalLight& light, const NaturalLightSettings& s,
+void printText(const RnNaturalLight& naturalLight, const NaturalLightSettings& s,
                const OvPhotometrics::NumberedFunctions& functions) {
     Table table;
     table.add({inLanguage("Natural light", "Tageslicht"),
                inLanguage(s.enabled ? "on" : "off", s.enabled ? "ein" : "aus") + std::string(", ") +
                    inLanguage(s.outside ? "out" : "in", s.outside ? "außen" : "innen")});
-    table.add({inLanguage("Latitude", "Breite"), latitudeText(light.getLatitude())});
-    table.add({inLanguage("Longitude", "Länge"), longitudeText(light.getLongitude())});
+    table.add({inLanguage("Latitude", "Breite"), latitudeText(naturalLight.getLatitude())});
+    table.add({inLanguage("Longitude", "Länge"), longitudeText(naturalLight.getLongitude())});
     table.add({inLanguage("North", "Norden"),
                angleText(s.north) + inLanguage(" added to azimuths", " zu Azimuten addiert")});
-    table.add({inLanguage("Date", "Datum"), dateText(light, functions)});
+    table.add({inLanguage("Date", "Datum"), dateText(naturalLight, functions)});
     table.add({inLanguage("Clock", "Uhrzeit"), clockText(functions, s.localTime)});
-    table.add({inLanguage("Time zone", "Zeitzone"), utcText(functions, light.getTimeZoneHours())});
+    table.add({inLanguage("Time zone", "Zeitzone"), utcText(functions, naturalLight.getTimeZoneHours())});
     table.add({inLanguage("Daylight saving", "Sommerzeit"), yesNo(s.daylightSaving)});
     table.add({inLanguage("Sky cover", "Bedeckung"), shortNumber(s.skyCover)});
     table.add({inLanguage("Sun position", "Sonnenstand"), positionText(s)});
@@ -101,27 +101,27 @@ Json recordJson(const NaturalLightSettings& s) {
 }
 
 int runShow(const SettingsOptions& options, const HostSession& session) {
-    const auto light = makeLight(session, {options.file, {}, {}}, options.json);
-    if (!light) return exitFailed;
+    const auto naturalLight = makeDaylight(session, {options.file, {}, {}}, options.json);
+    if (!naturalLight) return exitFailed;
     NaturalLightSettings settings;
-    light->getSettings(settings);
+    naturalLight->getSettings(settings);
     if (options.json) {
         printLine(recordJson(settings));
     } else {
         say(options.file);
-        printText(*light, settings, session.functions());
+        printText(*naturalLight, settings, session.functions());
     }
     return exitWell;
 }
 
 int runWrite(const SettingsOptions& options, const HostSession& session) {
-    std::string error = InputFiles({options.light.from}).refusal(options.file);
+    std::string error = InputFiles({options.naturalLight.from}).refusal(options.file);
     if (error.empty()) {
-        const auto light = makeLight(session, options.light, false);
-        if (!light) return exitFailed;
-        light->getSolarTime();  // a solar time that was given becomes a local time, which is what is saved
+        const auto naturalLight = makeDaylight(session, options.naturalLight, false);
+        if (!naturalLight) return exitFailed;
+        naturalLight->getSolarTime();  // a solar time that was given becomes a local time, which is what is saved
         const auto form = options.binary ? RnStream::Form::binary : RnStream::Form::text;
-        error = writeFile(options.file, savedLight(*light, form));
+        error = writeFile(options.file, savedDaylight(*naturalLight, form));
     }
     if (error.empty()) return exitWell;
     complain(options.file + ": " + error);
@@ -139,7 +139,7 @@ Action declareSettings(CLI::App& app) {
     CLI::App* write = app.add_subcommand("write", "Write a file of settings");
     write->add_option("FILE", options->file, "File to write")->required();
     write->add_flag("--binary", options->binary, "Write the binary form instead of text");
-    addLightOptions(*write, options->light);
+    addDaylightOptions(*write, options->naturalLight);
     return [options, show](const HostSession& session) {
         return show->parsed() ? runShow(*options, session) : runWrite(*options, session);
     };

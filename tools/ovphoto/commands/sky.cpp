@@ -2,11 +2,11 @@
 #include <memory>
 #include <optional>
 
-#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/daylightOptions.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
@@ -18,7 +18,7 @@ namespace {
 using Vector = std::array<float, 3>;
 
 struct SkyOptions {
-    LightOptions light;
+    DaylightOptions naturalLight;
     std::optional<float> zenith;  // degrees, with the azimuth
     std::optional<float> azimuth;
     std::optional<Vector> normal;
@@ -43,8 +43,8 @@ std::optional<Vector> parseNormal(std::string_view text) {
     return vector == Vector{} ? std::nullopt : vector;
 }
 
-void printLuminance(RnNaturalLight& light, const SkyOptions& options) {
-    const float luminance = light.getSkyLuminanceAt(*options.zenith, *options.azimuth);
+void printLuminance(RnNaturalLight& naturalLight, const SkyOptions& options) {
+    const float luminance = naturalLight.getSkyLuminanceAt(*options.zenith, *options.azimuth);
     if (options.json) return printLine(Json{{"luminance", luminance}});
     say(shortNumber(luminance) + inLanguage(" cd/m2 at zenith angle ", " cd/m2 im Winkel zum Zenit von ") +
         degreesText(shortNumber(*options.zenith)) + inLanguage(", azimuth ", ", Azimut ") +
@@ -52,8 +52,8 @@ void printLuminance(RnNaturalLight& light, const SkyOptions& options) {
     say(azimuthSentence());
 }
 
-void printIlluminance(RnNaturalLight& light, const SkyOptions& options) {
-    const float illuminance = light.getSkyIlluminance(normalised(*options.normal).data());
+void printIlluminance(RnNaturalLight& naturalLight, const SkyOptions& options) {
+    const float illuminance = naturalLight.getSkyIlluminance(normalised(*options.normal).data());
     if (options.json) return printLine(Json{{"illuminance", illuminance}});
     say(shortNumber(illuminance) +
         inLanguage(" lux from the sky on a surface that faces ", " Lux vom Himmel auf eine Fläche in Richtung ") +
@@ -64,10 +64,10 @@ void printIlluminance(RnNaturalLight& light, const SkyOptions& options) {
 }
 
 int runSky(const SkyOptions& options, const HostSession& session) {
-    const auto light = makeLight(session, options.light, options.json);
-    if (!light) return exitFailed;
-    showOutOfRange(*light);
-    options.normal ? printIlluminance(*light, options) : printLuminance(*light, options);
+    const auto naturalLight = makeDaylight(session, options.naturalLight, options.json);
+    if (!naturalLight) return exitFailed;
+    showOutOfRange(*naturalLight);
+    options.normal ? printIlluminance(*naturalLight, options) : printLuminance(*naturalLight, options);
     return exitWell;
 }
 
@@ -88,7 +88,7 @@ Action declareSky(CLI::App& app) {
     app.final_callback([options = options.get()] {
         if (!options->zenith && !options->normal) throw CLI::RequiredError("--zenith and --azimuth, or --normal");
     });
-    addLightOptions(app, options->light);
+    addDaylightOptions(app, options->naturalLight);
     addJsonFlag(app, options->json);
     return [options](const HostSession& session) { return runSky(*options, session); };
 }

@@ -3,10 +3,10 @@
 #include <numbers>
 
 #include "components/support/path.h"
-#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/daylightOptions.h"
 #include "tools/ovphoto/json.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/table.h"
 #include "tools/ovphoto/terminal.h"
 
@@ -18,7 +18,7 @@ using OvPhotometrics::NumberedFunctions;
 namespace {
 
 struct SunOptions {
-    LightOptions light;
+    DaylightOptions naturalLight;
     bool dayTable = false;
     bool yearTable = false;
     bool json = false;
@@ -39,40 +39,41 @@ void addAngle(Json& object, const std::string& key, float radians) {
 }
 
 /// The place and its clock.
-Json siteJson(const RnNaturalLight& light) {
+Json siteJson(const RnNaturalLight& naturalLight) {
     NaturalLightSettings settings;
-    light.getSettings(settings);
+    naturalLight.getSettings(settings);
     Json site;
-    addAngle(site, "latitude", settings.latitude, light.getLatitude());
-    addAngle(site, "longitude", settings.longitude, light.getLongitude());
-    addAngle(site, "north", settings.north, light.getNorth());
-    site["timeZoneHours"] = light.getTimeZoneHours();
-    site["daylightSaving"] = light.getDaylightSaving();
+    addAngle(site, "latitude", settings.latitude, naturalLight.getLatitude());
+    addAngle(site, "longitude", settings.longitude, naturalLight.getLongitude());
+    addAngle(site, "north", settings.north, naturalLight.getNorth());
+    site["timeZoneHours"] = naturalLight.getTimeZoneHours();
+    site["daylightSaving"] = naturalLight.getDaylightSaving();
     return site;
 }
 
 /// The site, and every derived value as the interface gives it.
-Json sunJson(RnNaturalLight& light) {
-    const float solarTime = light.getSolarTime();  // first: where it was given, the local time follows from it
-    Json sun{{"site", siteJson(light)},
-             {"day", light.getDayOfYear()},
-             {"localTime", light.getLocalTime()},
+Json sunJson(RnNaturalLight& naturalLight) {
+    const float solarTime =
+        naturalLight.getSolarTime();  // first: where it was given, the local time follows from it
+    Json sun{{"site", siteJson(naturalLight)},
+             {"day", naturalLight.getDayOfYear()},
+             {"localTime", naturalLight.getLocalTime()},
              {"solarTime", solarTime},
-             {"equationOfTime", light.getEquationOfTime()},
-             {"sunrise", light.getSunrise()},
-             {"sunset", light.getSunset()},
-             {"solarNoon", light.getSolarNoon()},
-             {"sunriseSolarTime", light.getSunriseSolarTime()},
-             {"sunsetSolarTime", light.getSunsetSolarTime()}};
-    addAngle(sun, "solarAltitude", light.getSolarAltitude());
-    addAngle(sun, "solarAzimuth", light.getSolarAzimuth());
-    addAngle(sun, "solarZenith", light.getSolarZenith());
-    sun.update(Json{{"sunDirection", light.getSunDirection()},
-                    {"directNormalIlluminance", light.getDirectNormalIlluminance()},
-                    {"directHorizontalIlluminance", light.getDirectHorizontalIlluminance()},
-                    {"skyHorizontalIlluminance", light.getSkyHorizontalIlluminance()},
-                    {"zenithLuminance", light.getZenithLuminance()},
-                    {"maxDirectNormalIlluminance", light.getMaxDirectNormalIlluminance()}});
+             {"equationOfTime", naturalLight.getEquationOfTime()},
+             {"sunrise", naturalLight.getSunrise()},
+             {"sunset", naturalLight.getSunset()},
+             {"solarNoon", naturalLight.getSolarNoon()},
+             {"sunriseSolarTime", naturalLight.getSunriseSolarTime()},
+             {"sunsetSolarTime", naturalLight.getSunsetSolarTime()}};
+    addAngle(sun, "solarAltitude", naturalLight.getSolarAltitude());
+    addAngle(sun, "solarAzimuth", naturalLight.getSolarAzimuth());
+    addAngle(sun, "solarZenith", naturalLight.getSolarZenith());
+    sun.update(Json{{"sunDirection", naturalLight.getSunDirection()},
+                    {"directNormalIlluminance", naturalLight.getDirectNormalIlluminance()},
+                    {"directHorizontalIlluminance", naturalLight.getDirectHorizontalIlluminance()},
+                    {"skyHorizontalIlluminance", naturalLight.getSkyHorizontalIlluminance()},
+                    {"zenithLuminance", naturalLight.getZenithLuminance()},
+                    {"maxDirectNormalIlluminance", naturalLight.getMaxDirectNormalIlluminance()}});
     return sun;
 }
 
@@ -84,77 +85,80 @@ std::string vectorText(const RnNaturalLight::Triple& v) {
 }
 
 /// Why there is neither sunrise nor sunset; null when there are.
-const char* polarText(RnNaturalLight& light) {
+const char* polarText(RnNaturalLight& naturalLight) {
     constexpr float noise = 1e-4F;  // of clock times, in hours
-    const float daylight = light.getSunset() - light.getSunrise();
+    const float daylight = naturalLight.getSunset() - naturalLight.getSunrise();
     return daylight < noise ? inLanguage("the sun stays down", "die Sonne bleibt unter dem Horizont")
            : daylight > hoursInDay - noise ? inLanguage("the sun stays up", "die Sonne bleibt über dem Horizont")
                                            : nullptr;
 }
 
-void addPlaceAndTime(Table& table, RnNaturalLight& light, const NumberedFunctions& functions) {
-    const std::string equation = fixedNumber(60 * light.getEquationOfTime(), 1) + " min";
-    const char* saving = light.getDaylightSaving() ? inLanguage(", daylight saving time", ", Sommerzeit") : "";
+void addPlaceAndTime(Table& table, RnNaturalLight& naturalLight, const NumberedFunctions& functions) {
+    const std::string equation = fixedNumber(60 * naturalLight.getEquationOfTime(), 1) + " min";
+    const char* saving =
+        naturalLight.getDaylightSaving() ? inLanguage(", daylight saving time", ", Sommerzeit") : "";
     table.add({inLanguage("Place", "Ort"),
-               latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude())});
-    table.add({inLanguage("Date", "Datum"), dateText(light, functions)});
-    table.add({inLanguage("Clock", "Uhrzeit"), clockText(functions, light.getLocalTime()) + ", " +
-                                                   utcText(functions, light.getTimeZoneHours()) + saving});
-    table.add({inLanguage("Solar time", "Sonnenzeit"), clockText(functions, light.getSolarTime()) +
+               latitudeText(naturalLight.getLatitude()) + ", " + longitudeText(naturalLight.getLongitude())});
+    table.add({inLanguage("Date", "Datum"), dateText(naturalLight, functions)});
+    table.add({inLanguage("Clock", "Uhrzeit"), clockText(functions, naturalLight.getLocalTime()) + ", " +
+                                                   utcText(functions, naturalLight.getTimeZoneHours()) + saving});
+    table.add({inLanguage("Solar time", "Sonnenzeit"), clockText(functions, naturalLight.getSolarTime()) +
                                                            inLanguage(", equation of time ", ", Zeitgleichung ") +
                                                            equation});
 }
 
-void addRiseAndSet(Table& table, RnNaturalLight& light, const NumberedFunctions& functions) {
+void addRiseAndSet(Table& table, RnNaturalLight& naturalLight, const NumberedFunctions& functions) {
     const std::string byClock = inLanguage(" by the clock", " nach der Uhr");
     const auto both = [&](float local, float solar) {
         return clockText(functions, local) + byClock + ", " + clockText(functions, solar) +
                inLanguage(" solar time", " Sonnenzeit");
     };
-    const char* polar = polarText(light);
+    const char* polar = polarText(naturalLight);
     table.add({inLanguage("Sunrise", "Sonnenaufgang"),
-               polar ? polar : both(light.getSunrise(), light.getSunriseSolarTime())});
-    table.add({inLanguage("Solar noon", "Höchststand"), clockText(functions, light.getSolarNoon()) + byClock});
+               polar ? polar : both(naturalLight.getSunrise(), naturalLight.getSunriseSolarTime())});
+    table.add(
+        {inLanguage("Solar noon", "Höchststand"), clockText(functions, naturalLight.getSolarNoon()) + byClock});
     table.add({inLanguage("Sunset", "Sonnenuntergang"),
-               polar ? polar : both(light.getSunset(), light.getSunsetSolarTime())});
+               polar ? polar : both(naturalLight.getSunset(), naturalLight.getSunsetSolarTime())});
 }
 
-void addLight(Table& table, RnNaturalLight& light) {
+void addLight(Table& table, RnNaturalLight& naturalLight) {
     const auto degrees = [](float radians) { return degreesText(degreesNumber(radians)); };
     const auto lux = [](float value, const char* english, const char* german) {
         return luxNumber(value) + inLanguage(" lux ", " Lux ") + inLanguage(english, german);
     };
-    table.add({inLanguage("Altitude", "Höhe"), degrees(light.getSolarAltitude()) + ", " +
-                                                   degrees(light.getSolarZenith()) +
+    table.add({inLanguage("Altitude", "Höhe"), degrees(naturalLight.getSolarAltitude()) + ", " +
+                                                   degrees(naturalLight.getSolarZenith()) +
                                                    inLanguage(" from the zenith", " vom Zenit")});
-    table.add({inLanguage("Azimuth", "Azimut"), degrees(light.getSolarAzimuth()) + "; " + azimuthRule()});
+    table.add({inLanguage("Azimuth", "Azimut"), degrees(naturalLight.getSolarAzimuth()) + "; " + azimuthRule()});
     table.add(
-        {inLanguage("Direction", "Richtung"), vectorText(light.getSunDirection()) +
+        {inLanguage("Direction", "Richtung"), vectorText(naturalLight.getSunDirection()) +
                                                   inLanguage("; x east, y north, z up, north turned by ",
                                                              "; x Osten, y Norden, z oben, Norden gedreht um ") +
-                                                  degreesText(shortNumber(light.getNorth()))});
-    table.add({inLanguage("Sky", "Himmel"), std::string(skyText(light.getSkyCover())) +
+                                                  degreesText(shortNumber(naturalLight.getNorth()))});
+    table.add({inLanguage("Sky", "Himmel"), std::string(skyText(naturalLight.getSkyCover())) +
                                                 inLanguage(", cover ", ", Bedeckung ") +
-                                                shortNumber(light.getSkyCover())});
+                                                shortNumber(naturalLight.getSkyCover())});
     table.add({inLanguage("Sunlight", "Sonnenlicht"),
-               lux(light.getDirectNormalIlluminance(), "facing the sun, ", "zur Sonne hin, ") +
-                   lux(light.getDirectHorizontalIlluminance(), "on the ground; at most ", "am Boden; höchstens ") +
-                   luxNumber(light.getMaxDirectNormalIlluminance()) + inLanguage(" lux", " Lux")});
+               lux(naturalLight.getDirectNormalIlluminance(), "facing the sun, ", "zur Sonne hin, ") +
+                   lux(naturalLight.getDirectHorizontalIlluminance(), "on the ground; at most ",
+                       "am Boden; höchstens ") +
+                   luxNumber(naturalLight.getMaxDirectNormalIlluminance()) + inLanguage(" lux", " Lux")});
     table.add({inLanguage("Skylight", "Himmelslicht"),
-               lux(light.getSkyHorizontalIlluminance(), "on the ground; zenith ", "am Boden; Zenit ") +
-                   luxNumber(light.getZenithLuminance()) + " cd/m2"});
+               lux(naturalLight.getSkyHorizontalIlluminance(), "on the ground; zenith ", "am Boden; Zenit ") +
+                   luxNumber(naturalLight.getZenithLuminance()) + " cd/m2"});
 }
 
-void printText(RnNaturalLight& light, const NumberedFunctions& functions) {
-    light.getSolarTime();  // where it was given, the local time follows from it
+void printText(RnNaturalLight& naturalLight, const NumberedFunctions& functions) {
+    naturalLight.getSolarTime();  // where it was given, the local time follows from it
     Table table;
-    addPlaceAndTime(table, light, functions);
-    addRiseAndSet(table, light, functions);
-    addLight(table, light);
+    addPlaceAndTime(table, naturalLight, functions);
+    addRiseAndSet(table, naturalLight, functions);
+    addLight(table, naturalLight);
     table.print();
 }
 
-void printDayTable(RnNaturalLight& light, const NumberedFunctions& functions, bool json) {
+void printDayTable(RnNaturalLight& naturalLight, const NumberedFunctions& functions, bool json) {
     const std::string headings[] = {inLanguage("clock", "Uhrzeit"),
                                     inLanguage("solar time", "Sonnenzeit"),
                                     inLanguage("altitude, deg", "Höhe, Grad"),
@@ -165,21 +169,23 @@ void printDayTable(RnNaturalLight& light, const NumberedFunctions& functions, bo
     Table table;
     table.add({std::begin(headings), std::end(headings)});
     for (int hour = 0; hour < hoursInDay; ++hour) {
-        light.setLocalTime(static_cast<float>(hour));
+        naturalLight.setLocalTime(static_cast<float>(hour));
         if (json) {
-            printLine(sunJson(light));
+            printLine(sunJson(naturalLight));
             continue;
         }
-        std::vector<std::string> row{
-            clockText(functions, light.getLocalTime()),    clockText(functions, light.getSolarTime()),
-            degreesNumber(light.getSolarAltitude()),       degreesNumber(light.getSolarAzimuth()),
-            luxNumber(light.getDirectNormalIlluminance()), luxNumber(light.getDirectHorizontalIlluminance()),
-            luxNumber(light.getSkyHorizontalIlluminance())};
+        std::vector<std::string> row{clockText(functions, naturalLight.getLocalTime()),
+                                     clockText(functions, naturalLight.getSolarTime()),
+                                     degreesNumber(naturalLight.getSolarAltitude()),
+                                     degreesNumber(naturalLight.getSolarAzimuth()),
+                                     luxNumber(naturalLight.getDirectNormalIlluminance()),
+                                     luxNumber(naturalLight.getDirectHorizontalIlluminance()),
+                                     luxNumber(naturalLight.getSkyHorizontalIlluminance())};
         for (std::size_t i = 0; i < row.size(); ++i) row[i] = padLeft(row[i], characterCount(headings[i]));
         table.add(std::move(row));
     }
     if (json) return;
-    say(dateText(light, functions));
+    say(dateText(naturalLight, functions));
     table.print();
     say(azimuthSentence());
 }
@@ -189,16 +195,17 @@ std::string timeCell(const NumberedFunctions& functions, float hours, bool shown
     return padLeft(shown ? clockText(functions, hours) : "-", 7);
 }
 
-void printYearTable(RnNaturalLight& light, const NumberedFunctions& functions, bool json) {
+void printYearTable(RnNaturalLight& naturalLight, const NumberedFunctions& functions, bool json) {
     Table table;
     table.add({inLanguage("date", "Datum"), inLanguage("sunrise", "Aufgang"), inLanguage("noon", "höchste"),
                inLanguage("sunset", "Untergang")});
     for (int month = 1; month <= monthsInYear; ++month) {
-        light.setDate(month, yearTableDay);
-        const float sunrise = light.getSunrise(), noon = light.getSolarNoon(), sunset = light.getSunset();
-        const char* polar = polarText(light);
+        naturalLight.setDate(month, yearTableDay);
+        const float sunrise = naturalLight.getSunrise(), noon = naturalLight.getSolarNoon(),
+                    sunset = naturalLight.getSunset();
+        const char* polar = polarText(naturalLight);
         if (json) {
-            printLine(Json{{"site", siteJson(light)},
+            printLine(Json{{"site", siteJson(naturalLight)},
                            {"month", month},
                            {"day", yearTableDay},
                            {"sunrise", sunrise},
@@ -215,24 +222,25 @@ void printYearTable(RnNaturalLight& light, const NumberedFunctions& functions, b
     if (json) return;
     table.print();
     say(std::string(inLanguage("Clock times", "Uhrzeiten")) +
-        (light.getDaylightSaving() ? inLanguage(" with daylight saving all year", " mit Sommerzeit das ganze Jahr")
-                                   : "") +
-        ", " + utcText(functions, light.getTimeZoneHours()) + ".");
+        (naturalLight.getDaylightSaving()
+             ? inLanguage(" with daylight saving all year", " mit Sommerzeit das ganze Jahr")
+             : "") +
+        ", " + utcText(functions, naturalLight.getTimeZoneHours()) + ".");
 }
 
 int runSun(const SunOptions& options, const HostSession& session) {
-    const auto light = makeLight(session, options.light, options.json);
-    if (!light) return exitFailed;
-    showOutOfRange(*light);
+    const auto naturalLight = makeDaylight(session, options.naturalLight, options.json);
+    if (!naturalLight) return exitFailed;
+    showOutOfRange(*naturalLight);
     const NumberedFunctions functions = session.functions();
     if (options.dayTable) {
-        printDayTable(*light, functions, options.json);
+        printDayTable(*naturalLight, functions, options.json);
     } else if (options.yearTable) {
-        printYearTable(*light, functions, options.json);
+        printYearTable(*naturalLight, functions, options.json);
     } else if (options.json) {
-        printLine(sunJson(*light));
+        printLine(sunJson(*naturalLight));
     } else {
-        printText(*light, functions);
+        printText(*naturalLight, functions);
     }
     return exitWell;
 }
@@ -241,7 +249,7 @@ int runSun(const SunOptions& options, const HostSession& session) {
 
 Action declareSun(CLI::App& app) {
     auto options = std::make_shared<SunOptions>();
-    addLightOptions(app, options->light);
+    addDaylightOptions(app, options->naturalLight);
     auto* day = app.add_flag("--day-table", options->dayTable, "The day, hour by hour of the clock");
     auto* year =
         app.add_flag("--year-table", options->yearTable, "Sunrise, noon and sunset on the 21st of each month");

@@ -4,7 +4,7 @@
 
 #include "plot/diagram.h"
 #include "tools/ovphoto/beamAngles.h"
-#include "tools/ovphoto/lightFile.h"
+#include "tools/ovphoto/luminaireFile.h"
 
 namespace OvTool {
 

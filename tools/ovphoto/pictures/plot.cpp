@@ -7,9 +7,9 @@
 #include "plot/skyDiagram.h"
 #include "tools/ovphoto/commands/pictureOptions.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
 #include "tools/ovphoto/outputFile.h"
 #include "tools/ovphoto/pictures/drawnFile.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/standardStreams.h"
 #include "tools/ovphoto/terminal.h"
 
@@ -79,17 +79,19 @@ int plotLights(const PlotOptions& options, PictureFormat format, const HostSessi
 
 std::string angleText(float radians) { return fixedNumber(radians * 180 / std::numbers::pi, 1) + "\u00b0"; }
 
-OvPlot::SkyCaption captionOf(Ov::RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
-    light.getSolarTime();  // where it was given, the local time follows from it
+OvPlot::SkyCaption captionOf(Ov::RnNaturalLight& naturalLight,
+                             const OvPhotometrics::NumberedFunctions& functions) {
+    naturalLight.getSolarTime();  // where it was given, the local time follows from it
     OvPlot::SkyCaption caption;
-    caption.subtitle = latitudeText(light.getLatitude()) + ", " + longitudeText(light.getLongitude()) + "; " +
-                       dateText(light, functions) + "; " + clockText(functions, light.getLocalTime()) + ", " +
-                       utcText(functions, light.getTimeZoneHours()) +
-                       (light.getDaylightSaving() ? inLanguage(", daylight saving", ", Sommerzeit") : "");
-    const float altitude = light.getSolarAltitude();
+    caption.subtitle = latitudeText(naturalLight.getLatitude()) + ", " +
+                       longitudeText(naturalLight.getLongitude()) + "; " + dateText(naturalLight, functions) +
+                       "; " + clockText(functions, naturalLight.getLocalTime()) + ", " +
+                       utcText(functions, naturalLight.getTimeZoneHours()) +
+                       (naturalLight.getDaylightSaving() ? inLanguage(", daylight saving", ", Sommerzeit") : "");
+    const float altitude = naturalLight.getSolarAltitude();
     caption.notes = {altitude > 0 ? inLanguage("Sun ", "Sonne ") + angleText(altitude) +
                                         inLanguage(" high, azimuth ", " hoch, Azimut ") +
-                                        angleText(light.getSolarAzimuth()) +
+                                        angleText(naturalLight.getSolarAzimuth()) +
                                         inLanguage(" from south to west", " von Süden nach Westen")
                                   : inLanguage("The sun is ", "Die Sonne steht ") + angleText(-altitude) +
                                         inLanguage(" below the horizon", " unter dem Horizont")};
@@ -102,35 +104,36 @@ OvPlot::SkyCaption captionOf(Ov::RnNaturalLight& light, const OvPhotometrics::Nu
     return caption;
 }
 
-int plotSky(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
+int plotSky(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& naturalLight,
             const OvPhotometrics::NumberedFunctions& functions) {
-    OvPlot::SkyCaption caption = captionOf(light, functions);
+    OvPlot::SkyCaption caption = captionOf(naturalLight, functions);
     caption.title = inLanguage("Luminance of the ", "Leuchtdichte des Himmels, ") +
-                    std::string(skyText(light.getSkyCover())) + inLanguage(" sky", "");
+                    std::string(skyText(naturalLight.getSkyCover())) + inLanguage(" sky", "");
     caption.subtitle += inLanguage("; looking up", "; Blick nach oben");
-    caption.notes.push_back(inLanguage("Zenith ", "Zenit ") + shortNumber(light.getZenithLuminance()) +
+    caption.notes.push_back(inLanguage("Zenith ", "Zenit ") + shortNumber(naturalLight.getZenithLuminance()) +
                             " cd/m\u00b2");
     caption.notes.push_back(inLanguage("Skylight on the ground ", "Himmelslicht am Boden ") +
-                            fixedNumber(light.getSkyHorizontalIlluminance(), 0) + " lx");
-    return write(options, format, caption.title, [&](Canvas& canvas) { OvPlot::drawSky(canvas, light, caption); });
+                            fixedNumber(naturalLight.getSkyHorizontalIlluminance(), 0) + " lx");
+    return write(options, format, caption.title,
+                 [&](Canvas& canvas) { OvPlot::drawSky(canvas, naturalLight, caption); });
 }
 
-int plotSunPath(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& light,
+int plotSunPath(const PlotOptions& options, PictureFormat format, Ov::RnNaturalLight& naturalLight,
                 const OvPhotometrics::NumberedFunctions& functions) {
-    OvPlot::SkyCaption caption = captionOf(light, functions);
+    OvPlot::SkyCaption caption = captionOf(naturalLight, functions);
     caption.title = inLanguage("Paths of the sun", "Wege der Sonne");
     std::array<std::string, 12> months;
     for (std::size_t i = 0; i < months.size(); ++i)
         months[i] = Ov::toUtf8(functions.getMonthShortName(static_cast<int>(i) + 1));
     return write(options, format, caption.title,
-                 [&](Canvas& canvas) { OvPlot::drawSunPath(canvas, light, caption, months); });
+                 [&](Canvas& canvas) { OvPlot::drawSunPath(canvas, naturalLight, caption, months); });
 }
 
 int plotNaturalLight(const PlotOptions& options, PictureFormat format, const HostSession& session) {
-    const auto light = makeLight(session, options.light, false);
-    if (!light) return exitFailed;
-    showOutOfRange(*light);
-    return (options.kind == PictureKind::sky ? plotSky : plotSunPath)(options, format, *light,
+    const auto naturalLight = makeDaylight(session, options.daylight, false);
+    if (!naturalLight) return exitFailed;
+    showOutOfRange(*naturalLight);
+    return (options.kind == PictureKind::sky ? plotSky : plotSunPath)(options, format, *naturalLight,
                                                                       session.functions());
 }
 
@@ -143,7 +146,7 @@ int runPlot(const PlotOptions& options, const HostSession& session) {
         return exitUsage;
     }
     InputFiles inputs(options.files);
-    inputs.add(options.light.from);
+    inputs.add(options.daylight.from);
     const std::string refusal = inputs.refusal(options.out);
     if (!refusal.empty()) {
         complain(options.out + ": " + refusal);

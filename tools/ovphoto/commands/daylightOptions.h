@@ -10,7 +10,7 @@
 namespace OvTool {
 
 /// Site, date, time and sky as the user gave them: a saved form to start from, and what to change in it.
-struct LightOptions {
+struct DaylightOptions {
     using Change = std::function<void(Ov::RnNaturalLight&, const OvPhotometrics::NumberedFunctions&)>;
 
     std::string from;
@@ -19,13 +19,13 @@ struct LightOptions {
 };
 
 /// Declares the options. `options` must outlive the parsing.
-void addLightOptions(CLI::App& app, LightOptions& options);
+void addDaylightOptions(CLI::App& app, DaylightOptions& options);
 
 /// An object with the options applied. Null when the saved form is refused; its reasons have been shown then. Half a
 /// site and an unknown time zone raise CLI::ValidationError. Where no site is given, standard error tells which it is.
-Ov::RnRef<Ov::RnNaturalLight> makeLight(const HostSession& session, const LightOptions& options, bool json);
+Ov::RnRef<Ov::RnNaturalLight> makeDaylight(const HostSession& session, const DaylightOptions& options, bool json);
 
 /// Tells on standard error which settings are out of range, for commands that compute with them.
-void showOutOfRange(const Ov::RnNaturalLight& light);
+void showOutOfRange(const Ov::RnNaturalLight& naturalLight);
 
 }  // namespace OvTool

@@ -1,4 +1,4 @@
-#include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/placeAndTime.h"
 
 #include <algorithm>
 #include <charconv>

@@ -1,11 +1,11 @@
-#include "tools/ovphoto/commands/lightOptions.h"
+#include "tools/ovphoto/commands/daylightOptions.h"
 
 #include <algorithm>
 
 #include "tools/numbers/numbers.h"
 #include "tools/ovphoto/commands/parsedOption.h"
 #include "tools/ovphoto/language.h"
-#include "tools/ovphoto/lightText.h"
+#include "tools/ovphoto/placeAndTime.h"
 #include "tools/ovphoto/terminal.h"
 
 namespace OvTool {
@@ -16,9 +16,10 @@ namespace {
 
 /// Declares an option whose value `apply` sets on the object.
 template <class Parse, class Apply>
-CLI::Option* addChange(CLI::App& app, LightOptions& options, const OptionText& text, Parse parse, Apply apply) {
+CLI::Option* addChange(CLI::App& app, DaylightOptions& options, const OptionText& text, Parse parse, Apply apply) {
     return addParsed(app, text, parse, [&options, apply](const auto& value) {
-        options.changes.push_back([apply, value](RnNaturalLight& light, const auto&) { apply(light, value); });
+        options.changes.push_back(
+            [apply, value](RnNaturalLight& naturalLight, const auto&) { apply(naturalLight, value); });
     });
 }
 
@@ -50,7 +51,7 @@ std::optional<Zone> parseZone(const std::string& text) {
                                    "Berlin), UTC-5 or UTC+1, or a name that `zones` prints");
 }
 
-CLI::Option* addZone(CLI::App& app, LightOptions& options) {
+CLI::Option* addZone(CLI::App& app, DaylightOptions& options) {
     static constexpr OptionText text{
         "--time-zone", "HOURS|UTC+H|NAME",
         "Hours behind Greenwich, west positive (5 in New York, -1 in Berlin); or behind "
@@ -58,66 +59,67 @@ CLI::Option* addZone(CLI::App& app, LightOptions& options) {
         "it"};
     return addParsed(app, text, parseZone, [&options](const Zone& zone) {
         options.changes.push_back(
-            [zone](RnNaturalLight& light, const OvPhotometrics::NumberedFunctions& functions) {
+            [zone](RnNaturalLight& naturalLight, const OvPhotometrics::NumberedFunctions& functions) {
                 const auto hours = zone.hours ? zone.hours : findZoneHours(zone.name, functions);
                 if (!hours) throw CLI::ValidationError(text.name, "`zones` lists no '" + zone.name + "'");
-                light.setTimeZoneHours(*hours);
+                naturalLight.setTimeZoneHours(*hours);
             });
     });
 }
 
-void addSite(CLI::App& app, LightOptions& options) {
+void addSite(CLI::App& app, DaylightOptions& options) {
     auto* latitude = addChange(
         app, options, {"--latitude", "DEG|DEG[N|S]", "Latitude, north positive"},
         [](const std::string& text) { return parseSide(text, northSouth); },
-        [](RnNaturalLight& light, float degrees) { light.setLatitude(degrees); });
+        [](RnNaturalLight& naturalLight, float degrees) { naturalLight.setLatitude(degrees); });
     auto* longitude = addChange(
         app, options, {"--longitude", "DEG|DEG[W|E]", "Longitude, west positive"},
         [](const std::string& text) { return parseSide(text, westEast); },
-        [](RnNaturalLight& light, float degrees) { light.setLongitude(degrees); });
+        [](RnNaturalLight& naturalLight, float degrees) { naturalLight.setLongitude(degrees); });
     options.site = {latitude, longitude, addZone(app, options)};
     addChange(app, options, {"--north", "DEG", "Added to azimuths to turn them into the scene"}, parseFloat,
-              [](RnNaturalLight& light, float degrees) { light.setNorth(degrees); });
+              [](RnNaturalLight& naturalLight, float degrees) { naturalLight.setNorth(degrees); });
 }
 
-void addTime(CLI::App& app, LightOptions& options) {
+void addTime(CLI::App& app, DaylightOptions& options) {
     auto* date = addChange(
         app, options, {"--date", "[YYYY-]MM-DD", "Date, in a year of 365 days; which year plays no part"},
-        parseDate, [](RnNaturalLight& light, Date value) { light.setDate(value.month, value.day); });
-    auto* day =
-        addChange(app, options, {"--day", "N", "Day of the year, 1 to 365"}, parseDay,
-                  [](RnNaturalLight& light, int value) { light.setDayOfYear(static_cast<std::uint16_t>(value)); });
+        parseDate, [](RnNaturalLight& naturalLight, Date value) { naturalLight.setDate(value.month, value.day); });
+    auto* day = addChange(app, options, {"--day", "N", "Day of the year, 1 to 365"}, parseDay,
+                          [](RnNaturalLight& naturalLight, int value) {
+                              naturalLight.setDayOfYear(static_cast<std::uint16_t>(value));
+                          });
     date->excludes(day);
     auto* local = addChange(app, options, {"--time", "H|H:MM", "Time that the clock shows"}, parseHours,
-                            [](RnNaturalLight& light, float hours) { light.setLocalTime(hours); });
+                            [](RnNaturalLight& naturalLight, float hours) { naturalLight.setLocalTime(hours); });
     auto* solar =
         addChange(app, options, {"--solar-time", "H|H:MM", "Time by the sun, instead; at 12 the sun is highest"},
-                  parseHours, [](RnNaturalLight& light, float hours) { light.setSolarTime(hours); });
+                  parseHours, [](RnNaturalLight& naturalLight, float hours) { naturalLight.setSolarTime(hours); });
     local->excludes(solar);
     addChange(app, options, {"--daylight-saving", "yes|no", "Whether the clock is an hour ahead"}, parseYesNo,
-              [](RnNaturalLight& light, bool on) { light.setDaylightSaving(on); });
+              [](RnNaturalLight& naturalLight, bool on) { naturalLight.setDaylightSaving(on); });
 }
 
-void addSky(CLI::App& app, LightOptions& options) {
+void addSky(CLI::App& app, DaylightOptions& options) {
     addChange(app, options, {"--sky-cover", "C", "Cloud cover, 0 (clear) to 1 (overcast)"}, parseFloat,
-              [](RnNaturalLight& light, float cover) { light.setSkyCover(cover); });
+              [](RnNaturalLight& naturalLight, float cover) { naturalLight.setSkyCover(cover); });
     addChange(app, options,
               {"--sun-position", "ALT,AZ",
                "Altitude and azimuth of the sun (degrees; azimuth 0 south, west positive), not computed"},
-              parseList<2>, [](RnNaturalLight& light, const std::array<float, 2>& degrees) {
-                  light.setOverrideSolarPosition(true);
-                  light.setSolarPosition(toRadians(degrees[0]), toRadians(degrees[1]));
+              parseList<2>, [](RnNaturalLight& naturalLight, const std::array<float, 2>& degrees) {
+                  naturalLight.setOverrideSolarPosition(true);
+                  naturalLight.setSolarPosition(toRadians(degrees[0]), toRadians(degrees[1]));
               });
     addChange(app, options,
               {"--illuminance", "LUX", "The sun's illuminance facing it, instead of the computed one"},
-              parseIlluminance, [](RnNaturalLight& light, float lux) {
-                  light.setOverrideSolarIlluminance(true);
-                  light.setDirectNormalIlluminance(lux);
+              parseIlluminance, [](RnNaturalLight& naturalLight, float lux) {
+                  naturalLight.setOverrideSolarIlluminance(true);
+                  naturalLight.setDirectNormalIlluminance(lux);
               });
 }
 
 /// Whether the options name a site.
-bool namesSite(const LightOptions& options) {
+bool namesSite(const DaylightOptions& options) {
     const auto given = std::count_if(options.site.begin(), options.site.end(),
                                      [](const CLI::Option* option) { return option->count() > 0; });
     if (given > 0 && given < std::ssize(options.site) && options.from.empty())
@@ -127,33 +129,33 @@ bool namesSite(const LightOptions& options) {
 
 }  // namespace
 
-void addLightOptions(CLI::App& app, LightOptions& options) {
+void addDaylightOptions(CLI::App& app, DaylightOptions& options) {
     app.add_option("--from", options.from, "Saved settings to start from, of either form")->type_name("FILE");
     addSite(app, options);
     addTime(app, options);
     addSky(app, options);
 }
 
-RnRef<RnNaturalLight> makeLight(const HostSession& session, const LightOptions& options, bool json) {
+RnRef<RnNaturalLight> makeDaylight(const HostSession& session, const DaylightOptions& options, bool json) {
     const bool sited = namesSite(options);
-    RnRef<RnNaturalLight> light = createLight(session);
+    RnRef<RnNaturalLight> naturalLight = createDaylight(session);
     if (!options.from.empty()) {
         std::vector<std::string> reasons;
-        const bool loaded = loadLight(*light, options.from, reasons);
+        const bool loaded = loadDaylight(*naturalLight, options.from, reasons);
         showReasons(options.from, reasons);
         if (!loaded && json) printRefusal(options.from, reasons);
         if (!loaded) return {};
     }
     const auto functions = session.functions();
-    for (const auto& change : options.changes) change(*light, functions);
+    for (const auto& change : options.changes) change(*naturalLight, functions);
     if (!sited)
         complain(inLanguage("note: no site is given; taken is ", "Hinweis: Kein Ort ist angegeben; es gilt ") +
-                 siteText(*light, functions));
-    return light;
+                 siteText(*naturalLight, functions));
+    return naturalLight;
 }
 
-void showOutOfRange(const RnNaturalLight& light) {
-    for (const std::string& note : outOfRange(light)) complain(inLanguage("note: ", "Hinweis: ") + note);
+void showOutOfRange(const RnNaturalLight& naturalLight) {
+    for (const std::string& note : outOfRange(naturalLight)) complain(inLanguage("note: ", "Hinweis: ") + note);
 }
 
 }  // namespace OvTool

@@ -1,4 +1,4 @@
-#include "tools/ovphoto/lightFile.h"
+#include "tools/ovphoto/luminaireFile.h"
 
 #include <cmath>
 
@@ -31,12 +31,12 @@ std::optional<std::string> fileBytes(const Format& target, RnIntensityDist& ligh
 
 }  // namespace
 
-std::optional<LightFile> makeFile(const HostSession& session, const std::string& file, const Format& target,
-                                  RnIntensityDist& light, FileForm form, const std::vector<Fact>& facts,
-                                  std::vector<std::string>& messages) {
+std::optional<LuminaireFile> makeFile(const HostSession& session, const std::string& file, const Format& target,
+                                      RnIntensityDist& light, FileForm form, const std::vector<Fact>& facts,
+                                      std::vector<std::string>& messages) {
     auto bytes = fileBytes(target, light, form, facts, messages);
     if (!bytes) return {};
-    LightFile made{std::move(*bytes), {}, 0, {}, {}};
+    LuminaireFile made{std::move(*bytes), {}, 0, {}, {}};
     ReadResult again = session.readBytes(made.bytes, file, target.name);
     if (again.web) {
         made.light = session.lightOf(*again.web);
@@ -50,7 +50,7 @@ std::optional<LightFile> makeFile(const HostSession& session, const std::string&
 }
 
 std::vector<std::string> lossWarnings(const ConversionLoss& loss, const Format& target,
-                                      const RnIntensityDist& light, const LightFile& made) {
+                                      const RnIntensityDist& light, const LuminaireFile& made) {
     std::vector<std::string> warnings;
     const double lamps = light.getFlux();
     if (!target.traits.holdsLampLumens && made.lampLumens > 0 &&
