@@ -125,10 +125,6 @@ TEST_F(ToolPlot, AReportIsOnePageOrAnIndexWithPages) {
     EXPECT_TRUE(many.status == 0 && many.says("all.HTML: 2 files, 0 refused")) << many.out << many.err;
     EXPECT_THAT(bytes("all.HTML"), testing::HasSubstr("href=\"all-pages/0001-i-.html\">lamps/deep/&lt;i&gt;.ies"));
     EXPECT_THAT(bytes("all-pages/0002-good.html"), testing::HasSubstr("href=\"../all.HTML\""));
-    // A file that is refused has its row, and stops nothing.
-    folder.write("lamps/bad.ies", "IESNA91\nTILT=NONE\nx\n");
-    EXPECT_EQ(runTool("report lamps -o all.html", folder).status, 1);
-    EXPECT_THAT(bytes("all.html"), testing::HasSubstr("class=\"refused\""));
 }
 
 TEST_F(ToolPlot, APageIsBoundedAndAnIndexShowsPathsFromItself) {
