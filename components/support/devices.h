@@ -13,7 +13,7 @@ namespace Ov {
 // Devices are counted objects: make them with rnCreate.
 
 /// Device over bytes in memory: reads and writes at one position, and grows as it is written.
-class OVHOST_API RnMemoryBuffer : public RnCastHeap<RnCastImpl2<RnBufferedIO, RnInputWindow, RnBufferedIO>> {
+class RnMemoryBuffer : public RnCastHeap<RnCastImpl2<RnBufferedIO, RnInputWindow, RnBufferedIO>> {
 public:
     /// @{
     /// Empty, or holding a copy of `bytes`, at the first of them.
@@ -55,7 +55,7 @@ private:
 
 /// Input device over a standard stream, which must outlive it. It reads ahead in blocks, and keeps what it has
 /// read so that `seek` works on any stream. Writing raises ExWriteError.
-class OVHOST_API RnInBuffer : public RnMemoryBuffer {
+class RnInBuffer : public RnMemoryBuffer {
 public:
     /// Reads from `source`.
     explicit RnInBuffer(std::istream* source);
@@ -69,7 +69,7 @@ private:
 };
 
 /// Output device over a standard stream, which must outlive it. Writes at once; at the end of its input always.
-class OVHOST_API RnOutBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
+class RnOutBuffer : public RnCastHeap<RnCastImpl<RnBufferedIO, RnBufferedIO>> {
 public:
     /// Writes to `sink`.
     explicit RnOutBuffer(std::ostream* sink) : _sink(sink) {}

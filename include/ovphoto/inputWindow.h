@@ -6,10 +6,10 @@ namespace Ov {
 
 /// Bytes of a device that lie ready in memory. A device may answer this interface beside RnBufferedIO, for speed: a
 /// reader walks them directly, and gets what it does not find there through the device.
-class OVHOST_API RnInputWindow : public RnCastable {
+class RnInputWindow : public RnCastable {
 public:
     /// Id of the interface.
-    [[gnu::used]] static constexpr RnUid iid{0x9d2f6b40, 0xc81311f0, 0xb05c7a1e, 0x42e6d938};
+    static constexpr RnUid iid{0x9d2f6b40, 0xc81311f0, 0xb05c7a1e, 0x42e6d938};
 
     /// @{
     /// The unread bytes from the device's position on, possibly none. `advanceTo` moves the position to one of them
