@@ -16,21 +16,21 @@ namespace {
 struct Piece {
     std::wstring_view text;
     std::size_t number = 0;  // the marker's, from 1; 0: no marker
-    Directive spec;
+    Directive directive;
 };
 
 bool isOneOf(wchar_t c, std::wstring_view set) { return set.find(c) != set.npos; }
 bool isDigit(wchar_t c) { return c >= L'0' && c <= L'9'; }
-bool isInteger(const Directive& spec) { return isOneOf(spec.letter, L"CXcdioux"); }
-bool isDouble(const Directive& spec) { return isOneOf(spec.letter, L"EGefg"); }
+bool isInteger(const Directive& directive) { return isOneOf(directive.letter, L"CXcdioux"); }
+bool isDouble(const Directive& directive) { return isOneOf(directive.letter, L"EGefg"); }
 
 /// Reads the conversion between two exclamation marks.
-bool readConversion(std::wstring_view text, Directive& spec) {
+bool readConversion(std::wstring_view text, Directive& directive) {
     const wchar_t* const end = text.data() + text.size();
-    if (parseDirective(text.data(), end, spec) != end) return false;
-    if (spec.widthIsArgument || spec.precisionIsArgument) return false;
-    if (isInteger(spec)) return isOneOf(spec.modifier, std::wstring_view(L"\0hl", 3));
-    return spec.modifier == 0 && (isDouble(spec) || spec.letter == L's');
+    if (parseDirective(text.data(), end, directive) != end) return false;
+    if (directive.widthIsArgument || directive.precisionIsArgument) return false;
+    if (isInteger(directive)) return isOneOf(directive.modifier, std::wstring_view(L"\0hl", 3));
+    return directive.modifier == 0 && (isDouble(directive) || directive.letter == L's');
 }
 
 /// Reads the marker whose number starts at the front of `text` and removes it there.
@@ -39,13 +39,13 @@ bool readMarker(std::wstring_view& text, Piece& piece) {
     for (std::size_t i = 0; i < digits; ++i)
         piece.number = piece.number * 10 + static_cast<std::size_t>(text[i] - L'0');
     text.remove_prefix(digits);
-    piece.spec.letter = L's';
+    piece.directive.letter = L's';
     if (!text.starts_with(L'!')) return true;
     const std::size_t closing = text.find(L'!', 1);
     if (closing == text.npos) return true;  // the mark is text
     const std::wstring_view conversion = text.substr(1, closing - 1);
     text.remove_prefix(closing + 1);
-    return readConversion(conversion, piece.spec);
+    return readConversion(conversion, piece.directive);
 }
 
 /// Cuts a message at its markers and escapes; nothing when it is malformed.
@@ -76,7 +76,7 @@ std::optional<std::vector<const Directive*>> orderMarkers(const std::vector<Piec
     for (const Piece& piece : pieces) {
         if (piece.number == 0) continue;
         if (piece.number > order.size() || order[piece.number - 1]) return std::nullopt;
-        order[piece.number - 1] = &piece.spec;
+        order[piece.number - 1] = &piece.directive;
         ++count;
     }
     order.resize(count);
@@ -88,18 +88,18 @@ std::optional<std::vector<const Directive*>> orderMarkers(const std::vector<Piec
 bool fit(const std::vector<const Directive*>& markers, std::initializer_list<MessageArgument> arguments) {
     if (markers.size() > arguments.size()) return false;
     return std::equal(markers.begin(), markers.end(), arguments.begin(),
-                      [](const auto* spec, const auto& argument) {
-                          if (isInteger(*spec)) return std::holds_alternative<std::int32_t>(argument);
-                          if (isDouble(*spec)) return std::holds_alternative<double>(argument);
+                      [](const auto* directive, const auto& argument) {
+                          if (isInteger(*directive)) return std::holds_alternative<std::int32_t>(argument);
+                          if (isDouble(*directive)) return std::holds_alternative<double>(argument);
                           return std::holds_alternative<const wchar_t*>(argument);
                       });
 }
 
-void appendArgument(std::wstring& out, const Directive& spec, const MessageArgument& argument) {
+void appendArgument(std::wstring& out, const Directive& directive, const MessageArgument& argument) {
     if (const auto* integer = std::get_if<std::int32_t>(&argument))
-        appendInteger(out, spec, *integer);
+        appendInteger(out, directive, *integer);
     else if (const auto* number = std::get_if<double>(&argument))
-        appendDouble(out, spec, *number);
+        appendDouble(out, directive, *number);
     else if (const wchar_t* text = std::get<const wchar_t*>(argument))
         out += text;
 }
@@ -115,7 +115,7 @@ std::wstring formatMessageV(const wchar_t* text, std::initializer_list<MessageAr
     std::wstring result;
     for (const Piece& piece : *pieces) {
         result += piece.text;
-        if (piece.number > 0) appendArgument(result, piece.spec, arguments.begin()[piece.number - 1]);
+        if (piece.number > 0) appendArgument(result, piece.directive, arguments.begin()[piece.number - 1]);
     }
     return result;
 }

@@ -14,18 +14,18 @@ namespace {
 // The longest number: 309 digits before the point, or as many zeros behind it as the precision asks for.
 constexpr std::size_t maxNumberLength = maxFormatWidth + 400;
 
-bool isFlag(wchar_t c, Directive& spec) {
+bool isFlag(wchar_t c, Directive& directive) {
     switch (c) {
         case L'-':
-            return spec.left = true;
+            return directive.left = true;
         case L'+':
-            return spec.plus = true;
+            return directive.plus = true;
         case L' ':
-            return spec.blank = true;
+            return directive.blank = true;
         case L'#':
-            return spec.alternate = true;
+            return directive.alternate = true;
         case L'0':
-            return spec.zeros = true;
+            return directive.zeros = true;
         default:
             return false;
     }
@@ -52,32 +52,32 @@ void appendAscii(std::wstring& out, std::string_view text) {
                    [](char c) { return static_cast<wchar_t>(c); });
 }
 
-std::size_t padding(const Directive& spec, std::size_t used) {
-    const auto width = static_cast<std::size_t>(std::max(spec.width, 0));
+std::size_t padding(const Directive& directive, std::size_t used) {
+    const auto width = static_cast<std::size_t>(std::max(directive.width, 0));
     return width > used ? width - used : 0;
 }
 
 /// Appends sign or prefix, zeros and digits as one field. `fillWithZeros`: the field is filled behind the prefix.
-void appendNumber(std::wstring& out, const Directive& spec, std::string_view prefix, std::size_t zeros,
+void appendNumber(std::wstring& out, const Directive& directive, std::string_view prefix, std::size_t zeros,
                   std::string_view digits, bool fillWithZeros) {
-    std::size_t pad = padding(spec, prefix.size() + zeros + digits.size());
-    if (fillWithZeros && !spec.left) zeros += std::exchange(pad, 0);
-    if (!spec.left) out.append(pad, L' ');
+    std::size_t pad = padding(directive, prefix.size() + zeros + digits.size());
+    if (fillWithZeros && !directive.left) zeros += std::exchange(pad, 0);
+    if (!directive.left) out.append(pad, L' ');
     appendAscii(out, prefix);
     out.append(zeros, L'0');
     appendAscii(out, digits);
-    if (spec.left) out.append(pad, L' ');
+    if (directive.left) out.append(pad, L' ');
 }
 
-void appendCharacter(std::wstring& out, const Directive& spec, wchar_t c) {
-    const std::size_t pad = padding(spec, 1);
-    if (!spec.left) out.append(pad, L' ');
+void appendCharacter(std::wstring& out, const Directive& directive, wchar_t c) {
+    const std::size_t pad = padding(directive, 1);
+    if (!directive.left) out.append(pad, L' ');
     out.push_back(c);
-    if (spec.left) out.append(pad, L' ');
+    if (directive.left) out.append(pad, L' ');
 }
 
-std::string_view signOf(const Directive& spec, bool negative) {
-    return negative ? "-" : spec.plus ? "+" : spec.blank ? " " : "";
+std::string_view signOf(const Directive& directive, bool negative) {
+    return negative ? "-" : directive.plus ? "+" : directive.blank ? " " : "";
 }
 
 void makeUpper(char* text, char* end) {
@@ -146,11 +146,11 @@ char* convertFixedFloat(char* buffer, double value, int precision) {
 }
 
 /// Writes the digits of a finite value that is not negative; returns their end.
-char* convertMagnitude(char* buffer, const Directive& spec, double value) {
+char* convertMagnitude(char* buffer, const Directive& directive, double value) {
     char* const limit = buffer + maxNumberLength;
-    int precision = spec.precision < 0 ? 6 : spec.precision;
+    int precision = directive.precision < 0 ? 6 : directive.precision;
     auto format = std::chars_format::general;
-    switch (spec.letter) {
+    switch (directive.letter) {
         case L'f':
         case L'F':
             format = std::chars_format::fixed;
@@ -163,7 +163,7 @@ char* convertMagnitude(char* buffer, const Directive& spec, double value) {
             precision = std::max(precision, 1);
     }
     // The alternate %g keeps its zeros, so it is the %e or %f with as many digits.
-    if (format == std::chars_format::general && spec.alternate) {
+    if (format == std::chars_format::general && directive.alternate) {
         const int exponent = decimalExponent(value, precision - 1, buffer);
         const bool isFixed = exponent >= -4 && exponent < precision;
         format = isFixed ? std::chars_format::fixed : std::chars_format::scientific;
@@ -174,30 +174,30 @@ char* convertMagnitude(char* buffer, const Directive& spec, double value) {
         if (char* end = convertFixedFloat(buffer, value, precision)) return end;
     }
     char* end = std::to_chars(buffer, limit, value, format, precision).ptr;
-    return spec.alternate ? ensurePoint(buffer, end) : end;
+    return directive.alternate ? ensurePoint(buffer, end) : end;
 }
 
 }  // namespace
 
-const wchar_t* parseDirective(const wchar_t* text, const wchar_t* end, Directive& spec) {
-    spec = {};
-    while (text != end && isFlag(*text, spec)) ++text;
-    text = parseCount(text, end, spec.width, spec.widthIsArgument);
+const wchar_t* parseDirective(const wchar_t* text, const wchar_t* end, Directive& directive) {
+    directive = {};
+    while (text != end && isFlag(*text, directive)) ++text;
+    text = parseCount(text, end, directive.width, directive.widthIsArgument);
     if (text && text != end && *text == L'.') {
-        text = parseCount(text + 1, end, spec.precision, spec.precisionIsArgument);
+        text = parseCount(text + 1, end, directive.precision, directive.precisionIsArgument);
     }
-    if (text && text != end && (*text == L'h' || *text == L'l' || *text == L'L')) spec.modifier = *text++;
+    if (text && text != end && (*text == L'h' || *text == L'l' || *text == L'L')) directive.modifier = *text++;
     if (!text || text == end) return nullptr;
-    spec.letter = *text;
+    directive.letter = *text;
     return text + 1;
 }
 
-void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value) {
+void appendInteger(std::wstring& out, const Directive& directive, std::int32_t value) {
     // 16 bits of the value, or 32, as sign and magnitude.
-    const bool isShort = spec.modifier == L'h';
-    if (spec.letter == L'c' || spec.letter == L'C')
-        return appendCharacter(out, spec, static_cast<wchar_t>(isShort ? value & 0xFFFF : value));
-    const bool isSigned = isSignedLetter(spec.letter);
+    const bool isShort = directive.modifier == L'h';
+    if (directive.letter == L'c' || directive.letter == L'C')
+        return appendCharacter(out, directive, static_cast<wchar_t>(isShort ? value & 0xFFFF : value));
+    const bool isSigned = isSignedLetter(directive.letter);
     if (isShort && isSigned) value = static_cast<std::int16_t>(value);
     const bool negative = isSigned && value < 0;
     auto magnitude = static_cast<std::uint32_t>(value);
@@ -206,45 +206,45 @@ void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value)
 
     // The digits. A precision of 0 shows no digit for 0.
     char buffer[16];
-    const int base = baseOf(spec.letter);
+    const int base = baseOf(directive.letter);
     char* end = std::to_chars(buffer, buffer + sizeof buffer, magnitude, base).ptr;
-    if (spec.letter == L'X') makeUpper(buffer, end);
-    if (magnitude == 0 && spec.precision == 0) end = buffer;
+    if (directive.letter == L'X') makeUpper(buffer, end);
+    if (magnitude == 0 && directive.precision == 0) end = buffer;
     std::string_view digits(buffer, static_cast<std::size_t>(end - buffer));
 
     // Zeros up to the precision; in front of them the sign, or what tells the base.
-    const auto wanted = static_cast<std::size_t>(std::max(spec.precision, 0));
+    const auto wanted = static_cast<std::size_t>(std::max(directive.precision, 0));
     std::size_t zeros = wanted > digits.size() ? wanted - digits.size() : 0;
-    if (spec.alternate && base == 8 && zeros == 0 && !digits.starts_with('0')) zeros = 1;
-    std::string_view prefix = isSigned ? signOf(spec, negative) : "";
-    if (spec.alternate && base == 16 && magnitude != 0) prefix = spec.letter == L'X' ? "0X" : "0x";
-    appendNumber(out, spec, prefix, zeros, digits, spec.zeros && spec.precision < 0);
+    if (directive.alternate && base == 8 && zeros == 0 && !digits.starts_with('0')) zeros = 1;
+    std::string_view prefix = isSigned ? signOf(directive, negative) : "";
+    if (directive.alternate && base == 16 && magnitude != 0) prefix = directive.letter == L'X' ? "0X" : "0x";
+    appendNumber(out, directive, prefix, zeros, digits, directive.zeros && directive.precision < 0);
 }
 
-void appendDouble(std::wstring& out, const Directive& spec, double value) {
+void appendDouble(std::wstring& out, const Directive& directive, double value) {
     char buffer[maxNumberLength];
     const bool isFinite = std::isfinite(value);
     char* end = buffer + 3;
     if (isFinite) {
-        end = convertMagnitude(buffer, spec, std::fabs(value));
+        end = convertMagnitude(buffer, directive, std::fabs(value));
     } else {
         std::copy_n(std::isnan(value) ? "nan" : "inf", 3, buffer);
     }
-    if (spec.letter >= L'A' && spec.letter <= L'Z') makeUpper(buffer, end);
+    if (directive.letter >= L'A' && directive.letter <= L'Z') makeUpper(buffer, end);
     const std::string_view digits(buffer, static_cast<std::size_t>(end - buffer));
-    appendNumber(out, spec, signOf(spec, std::signbit(value)), 0, digits, spec.zeros && isFinite);
+    appendNumber(out, directive, signOf(directive, std::signbit(value)), 0, digits, directive.zeros && isFinite);
 }
 
-void appendText(std::wstring& out, const Directive& spec, const wchar_t* text) {
+void appendText(std::wstring& out, const Directive& directive, const wchar_t* text) {
     if (!text) text = L"";
     // With a precision the text need not be terminated.
     std::size_t length = 0;
-    const auto most = spec.precision < 0 ? std::wstring::npos : static_cast<std::size_t>(spec.precision);
+    const auto most = directive.precision < 0 ? std::wstring::npos : static_cast<std::size_t>(directive.precision);
     while (length < most && text[length] != 0) ++length;
-    const std::size_t pad = padding(spec, length);
-    if (!spec.left) out.append(pad, L' ');
+    const std::size_t pad = padding(directive, length);
+    if (!directive.left) out.append(pad, L' ');
     out.append(text, length);
-    if (spec.left) out.append(pad, L' ');
+    if (directive.left) out.append(pad, L' ');
 }
 
 }  // namespace Ov

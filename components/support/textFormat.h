@@ -25,14 +25,14 @@ struct Directive {
 /// Reads flags, width, precision, modifier and letter from `text`, which starts behind the percent sign and ends
 /// at `end`. The position behind the letter, or null when the text ends first or a width or precision exceeds
 /// maxFormatWidth.
-const wchar_t* parseDirective(const wchar_t* text, const wchar_t* end, Directive& spec);
+const wchar_t* parseDirective(const wchar_t* text, const wchar_t* end, Directive& directive);
 
 inline constexpr int maxFormatWidth = 4096;
 
 /// Append one converted value. Letters: d i u x X o c C (integers, 32 bits, or 16 with modifier h), e E f F g G
 /// (correctly rounded), s.
-void appendInteger(std::wstring& out, const Directive& spec, std::int32_t value);
-void appendDouble(std::wstring& out, const Directive& spec, double value);
-void appendText(std::wstring& out, const Directive& spec, const wchar_t* text);
+void appendInteger(std::wstring& out, const Directive& directive, std::int32_t value);
+void appendDouble(std::wstring& out, const Directive& directive, double value);
+void appendText(std::wstring& out, const Directive& directive, const wchar_t* text);
 
 }  // namespace Ov

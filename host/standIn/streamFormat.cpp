@@ -9,20 +9,20 @@ namespace Ov {
 
 namespace {
 
-void fetchWidth(Directive& spec, Arguments& arguments) {
-    if (spec.widthIsArgument) {
+void fetchWidth(Directive& directive, Arguments& arguments) {
+    if (directive.widthIsArgument) {
         const int width = std::clamp(arguments.next<int>(), -maxFormatWidth, maxFormatWidth);
-        spec.left |= width < 0;
-        spec.width = width < 0 ? -width : width;
+        directive.left |= width < 0;
+        directive.width = width < 0 ? -width : width;
     }
-    if (spec.precisionIsArgument) spec.precision = std::clamp(arguments.next<int>(), -1, maxFormatWidth);
+    if (directive.precisionIsArgument) directive.precision = std::clamp(arguments.next<int>(), -1, maxFormatWidth);
 }
 
 /// Appends the next argument as its directive says; false for a letter that stands for no conversion.
-bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
-    if (spec.modifier == L'L') return false;
-    fetchWidth(spec, arguments);
-    switch (spec.letter) {
+bool appendArgument(std::wstring& out, Directive& directive, Arguments& arguments) {
+    if (directive.modifier == L'L') return false;
+    fetchWidth(directive, arguments);
+    switch (directive.letter) {
         // Integers and characters.
         case L'd':
         case L'i':
@@ -32,7 +32,7 @@ bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
         case L'o':
         case L'c':
         case L'C':
-            appendInteger(out, spec, arguments.next<int>());
+            appendInteger(out, directive, arguments.next<int>());
             return true;
         // Numbers with a fraction.
         case L'e':
@@ -41,10 +41,10 @@ bool appendArgument(std::wstring& out, Directive& spec, Arguments& arguments) {
         case L'F':
         case L'g':
         case L'G':
-            appendDouble(out, spec, arguments.next<double>());
+            appendDouble(out, directive, arguments.next<double>());
             return true;
         case L's':
-            appendText(out, spec, arguments.next<const wchar_t*>());
+            appendText(out, directive, arguments.next<const wchar_t*>());
             return true;
         // The characters written so far, told to the caller.
         case L'n':
@@ -67,9 +67,9 @@ void appendFormatted(std::wstring& out, const wchar_t* format, Arguments& argume
             out.push_back(*format++);
             continue;
         }
-        Directive spec;
-        format = parseDirective(format, end, spec);
-        if (!format || !appendArgument(out, spec, arguments)) return;
+        Directive directive;
+        format = parseDirective(format, end, directive);
+        if (!format || !appendArgument(out, directive, arguments)) return;
     }
 }
 

@@ -147,13 +147,13 @@ std::string written(const std::string& format, Args... args) {
     return device->bytes();
 }
 
-std::string randomSpec(std::mt19937& random, const std::string& letters) {
-    std::string spec = "%";
-    for (const char flag : {'-', '+', ' ', '#', '0'}) spec.append(random() % 3 == 0, flag);
-    if (random() % 2) spec += std::to_string(1 + random() % 30);
-    if (random() % 2) spec += random() % 5 ? "." + std::to_string(random() % 30) : ".";
-    spec.append(letters[0] == 'd' && random() % 4 == 0, 'h');
-    return spec + letters[random() % letters.size()];
+std::string randomDirective(std::mt19937& random, const std::string& letters) {
+    std::string directive = "%";
+    for (const char flag : {'-', '+', ' ', '#', '0'}) directive.append(random() % 3 == 0, flag);
+    if (random() % 2) directive += std::to_string(1 + random() % 30);
+    if (random() % 2) directive += random() % 5 ? "." + std::to_string(random() % 30) : ".";
+    directive.append(letters[0] == 'd' && random() % 4 == 0, 'h');
+    return directive + letters[random() % letters.size()];
 }
 
 TEST(FormattedWrite, NumbersAreWhatPrintfWrites) {
@@ -161,10 +161,10 @@ TEST(FormattedWrite, NumbersAreWhatPrintfWrites) {
     const double odd[] = {0.0, -0.0, INFINITY, -INFINITY, NAN, 9.9999995, 0.0001, 0.00009999995, 1e21, 1.7e308};
     const int edges[] = {0, -1, 1, std::numeric_limits<int>::min(), std::numeric_limits<int>::max(), 40000};
     std::uint64_t digest = 0;
-    const auto expectPrinted = [&](const std::string& spec, auto value) {
-        const std::string text = written(spec, value);
+    const auto expectPrinted = [&](const std::string& directive, auto value) {
+        const std::string text = written(directive, value);
         if (printfIsExact) {
-            ASSERT_EQ(text, printed(spec, value)) << spec;
+            ASSERT_EQ(text, printed(directive, value)) << directive;
         }
         for (const char c : text) digest = (digest ^ static_cast<unsigned char>(c)) * 0x100000001B3;
     };
@@ -175,11 +175,11 @@ TEST(FormattedWrite, NumbersAreWhatPrintfWrites) {
              {static_cast<double>(std::bit_cast<float>(bits)), (bits % 100000) / 64.0,
               static_cast<double>(static_cast<float>(bits % 1000000) / 100),
               std::ldexp(bits % 100000, static_cast<int>(random() % 60) - 40), odd[bits % std::size(odd)]}) {
-            expectPrinted(randomSpec(random, "feEFgG"), value);
+            expectPrinted(randomDirective(random, "feEFgG"), value);
             expectPrinted("%." + std::to_string(bits % 6) + "f", value);
         }
         for (const int value : {edges[bits % 6], static_cast<int>(bits % 1000) - 500})
-            expectPrinted(randomSpec(random, "diuxXo"), value);
+            expectPrinted(randomDirective(random, "diuxXo"), value);
     }
     EXPECT_EQ(digest, 16363591895736590482U);  // the same texts on every platform
 }

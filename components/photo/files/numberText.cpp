@@ -134,10 +134,10 @@ void appendNumber(std::wstring& out, float value, FileForm form, int decimals) {
         out.append(text, end.ptr);
         return;
     }
-    Ov::Directive spec;
-    spec.precision = decimals < 0 ? 16 : decimals;
-    spec.letter = decimals < 0 ? L'g' : L'f';
-    Ov::appendDouble(out, spec, value);
+    Ov::Directive directive;
+    directive.precision = decimals < 0 ? 16 : decimals;
+    directive.letter = decimals < 0 ? L'g' : L'f';
+    Ov::appendDouble(out, directive, value);
 }
 
 std::wstring numbersText(std::initializer_list<float> values, FileForm form, int decimals) {
