@@ -49,9 +49,6 @@ public:
     virtual RnRef<RnComponentBuilder> findBuilder(const RnUid& classId) = 0;
     /// All builders, or those of one category, by category and name.
     virtual std::vector<RnRef<RnComponentBuilder>> builders(const wchar_t* category = nullptr) = 0;
-    /// The builders of a category that import files and accept this input, in order of their names: the first is
-    /// the one to take.
-    virtual std::vector<RnRef<RnComponentBuilder>> importersFor(const wchar_t* category, RnBufferedIO* io) = 0;
 };
 
 /// The host's component manager, as an object to be cast to RnComponentManager.

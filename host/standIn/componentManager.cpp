@@ -40,7 +40,6 @@ public:
     void removeRegistry(RnComponentRegistry& registry) override;
     Builder findBuilder(const RnUid& classId) override;
     std::vector<Builder> builders(const wchar_t* category) override;
-    std::vector<Builder> importersFor(const wchar_t* category, RnBufferedIO* io) override;
 
 private:
     using Modules = std::vector<std::unique_ptr<Module>>;
@@ -104,15 +103,6 @@ std::vector<Builder> ComponentManager::builders(const wchar_t* category) {
     });
     for (RnComponentRegistry* registry : _registries) registry->enumerateBuilders(visitor);
     std::sort(found.begin(), found.end(), byCategoryAndName);
-    return found;
-}
-
-std::vector<Builder> ComponentManager::importersFor(const wchar_t* category, RnBufferedIO* io) {
-    std::vector<Builder> found = builders(category);
-    std::erase_if(found, [&](const Builder& builder) {
-        const auto importer = rnQuery<RnImportBuilder>(builder.get());
-        return !importer || !importer->canImport(io);
-    });
     return found;
 }
 

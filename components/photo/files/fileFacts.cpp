@@ -38,7 +38,7 @@ constexpr std::wstring_view encodingKey = L"encoding";
 constexpr std::wstring_view windows1252Name = L"Windows-1252";
 
 /// Where the part of a text starts that says something: at its end where none does.
-std::size_t ownPart(const std::wstring& text, FactKind kind, std::wstring_view usual, std::size_t from = 0) {
+std::size_t ownPart(const std::wstring& text, FactKind kind, std::wstring_view usual, std::size_t from) {
     if (kind == FactKind::label || kind == FactKind::keyword) return 0;
     const bool saysNothing = text == usual || text.find_first_not_of(L"0 ", from) == std::wstring::npos;
     return kind == FactKind::value && !saysNothing ? from : text.size();
@@ -51,8 +51,7 @@ FileFacts::FileFacts(const FileFact* facts, std::int32_t count) {
 }
 
 void FileFacts::add(std::wstring key, std::wstring text, FactKind kind, std::wstring_view usual) {
-    const std::size_t ownFrom = ownPart(text, kind, usual);
-    _facts.push_back({std::move(key), std::move(text), kind, ownFrom});
+    append(std::move(key), std::move(text), kind, usual, 0);
 }
 
 void FileFacts::add(std::wstring key, std::int32_t value, FactKind kind, std::wstring_view usual) {
@@ -71,8 +70,13 @@ void FileFacts::add(std::wstring key, std::span<const float> values, std::wstrin
         if (i == ofLight) from = text.size();
         text += (text.empty() ? L"" : L" ") + numberText(values[i]);
     }
-    const std::size_t ownFrom = ownPart(text, FactKind::value, usual, from);
-    _facts.push_back({std::move(key), std::move(text), FactKind::value, ownFrom});
+    append(std::move(key), std::move(text), FactKind::value, usual, from);
+}
+
+void FileFacts::append(std::wstring key, std::wstring text, FactKind kind, std::wstring_view usual,
+                       std::size_t from) {
+    const std::size_t ownFrom = ownPart(text, kind, usual, from);
+    _facts.push_back({std::move(key), std::move(text), kind, ownFrom});
 }
 
 void FileFacts::disown(std::wstring_view key) {

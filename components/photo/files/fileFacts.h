@@ -74,6 +74,9 @@ public:
     auto end() const { return _facts.end(); }
 
 private:
+    /// Adds a fact whose text says something of its own from `from` on, if at all.
+    void append(std::wstring key, std::wstring text, FactKind kind, std::wstring_view usual, std::size_t from);
+
     std::vector<Fact> _facts;
     std::optional<LabelEncoding> _encoding;  // of what has been decoded
 };

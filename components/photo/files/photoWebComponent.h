@@ -65,6 +65,13 @@ constexpr bool isWritten = requires {
     Format::write;
 };
 
+/// False, after the message that files of the format are not written.
+template <class Format>
+bool reportOnlyRead() {
+    reportMessage(messages::formatOnlyRead, Format::traits.name);
+    return false;
+}
+
 template <class Format>
 bool readRecord(typename Format::Record& record, Ov::RnStream& in, const wchar_t* basePath) {
     if constexpr (requires { Format::read(record, in, basePath); })
@@ -169,8 +176,7 @@ private:
                                : Format::fromDistribution(*distribution, record)) &&
                    writeRecord<Format>(record, out, isFaithful ? FileForm::faithful : FileForm::asSaved);
         } else {
-            reportMessage(messages::formatOnlyRead, Format::traits.name);
-            return false;
+            return reportOnlyRead<Format>();
         }
     }
 
@@ -249,8 +255,7 @@ public:
                 return !!text;
             });
         } else {
-            reportMessage(messages::formatOnlyRead, Format::traits.name);
-            return false;
+            return reportOnlyRead<Format>();
         }
     }
 
