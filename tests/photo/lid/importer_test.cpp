@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "components/photo/distributions/diffuse.h"
+#include "components/photo/nimb/photoWebNIMB.h"
 #include "support/paths.h"
 #include "tests/photo/photoFixture.h"
 
@@ -76,6 +77,41 @@ TEST_F(Importer, OffersThePhotometricWebs) {
     EXPECT_FALSE(importer->getInterface(Ov::RnImportBuilder::iid));
     EXPECT_STREQ(importer->getDefaultSearch(), L"*.cib;*.ies;*.nmb;*.tbt");
     EXPECT_TRUE(std::wstring(importer->getFileTypes()).starts_with(L"All (*.cib;*.ies;*.nmb;*.tbt)|*.cib;"));
+}
+
+class PhotoWebReadOnly;
+
+/// NIMB files of a format that writes none and tells no facts.
+struct ReadOnlyFormat {
+    using Web = PhotoWebReadOnly;
+    using Record = NimbRecord;
+    static constexpr BuilderInfo info{classIds::make(0x7070f200), photometricWebCategory, L"READ Web",
+                                      L"Read only"};
+    static constexpr Ov::PhotoFormatTraits traits{.name = L"READ"};
+    static constexpr const wchar_t* extension = L"read";
+    static constexpr const char* source = "importer_test";
+    static constexpr int saveLine = 1;
+    static constexpr int loadLine = 2;
+    static constexpr const char* streamName = "READ stream";
+    static constexpr auto canImport = nimbCanRead;
+    static constexpr auto read = nimbRead;
+    static constexpr auto toWeb = nimbToWeb;
+};
+
+class PhotoWebReadOnly final : public PhotoWebOf<PhotoWebReadOnly, ReadOnlyFormat> {};
+
+TEST_F(Importer, AFormatMayBeReadAlone) {
+    const auto lamp = Ov::rnCreate<Diffuse>();
+    lamp->setFlux(1000);
+    const auto web = import <ReadOnlyFormat>(fileOf(immortal<NIMBBuilder>(), *lamp));
+    ASSERT_TRUE(web);
+
+    auto& format = immortal<PhotoWebBuilder<ReadOnlyFormat>>();
+    EXPECT_FALSE(format.getTraits().writes || format.getTraits().readsFacts);
+    EXPECT_EQ(fileOf(format, *distributionOf(*web)), "");
+    EXPECT_EQ(log.take(), "13084 READ");
+    EXPECT_THROW(saved(*web), Ov::RnStreamEx::ExWriteError);
+    EXPECT_EQ(log.take(), "13084 READ");
 }
 
 }  // namespace
